@@ -1,0 +1,37 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+/// \file
+/// The handle of an attribute that holds a map.
+#pragma once
+#include "tarnkiln/Export.h"
+#include "tarnkiln/meta/Attribute.h"
+#include "tarnkiln/meta/Fwd.h"
+
+namespace tarn::kiln::meta {
+
+/// An `Attribute` whose value is another `AttributeMap`, which it owns.
+///
+/// The handle is shared: copies refer to the same attribute map attribute; it is false when empty
+/// or when the attribute map attribute was destroyed.
+///
+/// Threads: handles may be copied and dropped anywhere. What belongs to the registry may be read on
+/// any thread; all else happens on the thread that uses the model.
+class TARNKILN_EXPORT AttributeMapAttribute : public Attribute
+{
+public:
+    class Impl;           // AttributeMapAttributeImpl.h
+    class Builder;        // AttributeMapAttributeBuilder.h
+    class Constrainables; // AttributeMapAttributeConstrainables.h
+
+    AttributeMapAttribute() = default;
+    explicit AttributeMapAttribute(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+
+    /// The attribute map attribute behind `element`; empty if that is empty or something else.
+    static AttributeMapAttribute cast(ModelElement const& element);
+    static meta::Class const& metaClass();
+    /// A new one in `model`; the nil UUID stands for a fresh one.
+    static AttributeMapAttribute create(Model const& model, UUID const& id = {});
+
+    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+};
+} // namespace tarn::kiln::meta

@@ -1,0 +1,28 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+/// \file
+/// The handles of all metamodel classes.
+#pragma once
+#include "tarnkiln/meta/Argument.h"
+#include "tarnkiln/meta/Attribute.h"
+#include "tarnkiln/meta/AttributeMap.h"
+#include "tarnkiln/meta/AttributeMapAttribute.h"
+#include "tarnkiln/meta/BooleanAttribute.h"
+#include "tarnkiln/meta/Class.h"
+#include "tarnkiln/meta/DataType.h"
+#include "tarnkiln/meta/DateTimeAttribute.h"
+#include "tarnkiln/meta/DynamicExtensions.h"
+#include "tarnkiln/meta/Enum.h"
+#include "tarnkiln/meta/EnumLiteral.h"
+#include "tarnkiln/meta/Extension.h"
+#include "tarnkiln/meta/IntegerAttribute.h"
+#include "tarnkiln/meta/NamedElement.h"
+#include "tarnkiln/meta/Operation.h"
+#include "tarnkiln/meta/Package.h"
+#include "tarnkiln/meta/PrimitiveType.h"
+#include "tarnkiln/meta/Property.h"
+#include "tarnkiln/meta/RealAttribute.h"
+#include "tarnkiln/meta/StringAttribute.h"
+#include "tarnkiln/meta/StructuredType.h"
+#include "tarnkiln/meta/Type.h"
+#include "tarnkiln/meta/TypedElement.h"
+#include "tarnkiln/meta/UUIDAttribute.h"
