@@ -1,0 +1,72 @@
+/// \file
+/// What all handles have in common.
+#pragma once
+#include "tarnkiln/kernel/ElementImpl.h"
+
+#include <functional>
+#include <utility>
+
+namespace tarn::kiln {
+
+/// A counted pointer to an implementation object, with reference semantics.
+///
+/// True while the object is there and not destroyed; equal to another handle of the same object.
+/// Not for use by itself: `Model`, `ModelConstellation`, `ModelElement` and the classes derived
+/// from it are the handles.
+///
+/// Threads: handles may be copied and dropped on any thread.
+class TARNKILN_EXPORT ElementHandle
+{
+public:
+    ElementHandle() = default;
+    ElementHandle(ElementHandle const& other) noexcept
+        : m_impl(other.m_impl)
+    {
+        if (m_impl)
+            m_impl->addRef();
+    }
+    ElementHandle(ElementHandle&& other) noexcept
+        : m_impl(std::exchange(other.m_impl, nullptr))
+    {
+    }
+    ~ElementHandle()
+    {
+        if (m_impl)
+            m_impl->removeRef();
+    }
+    ElementHandle& operator=(ElementHandle const& other)
+    {
+        if (this != &other) {
+            if (other.m_impl)
+                other.m_impl->addRef();
+            if (ElementImpl* const old = std::exchange(m_impl, other.m_impl))
+                old->removeRef();
+        }
+        return *this;
+    }
+    /// Swaps: the other handle keeps this one's former target until it dies.
+    ElementHandle& operator=(ElementHandle&& other) noexcept
+    {
+        if (this != &other)
+            std::swap(m_impl, other.m_impl);
+        return *this;
+    }
+
+    /// Whether there is an object and it is not destroyed.
+    explicit operator bool() const noexcept { return m_impl && m_impl->isLive(); }
+    bool operator==(ElementHandle const& other) const noexcept { return m_impl == other.m_impl; }
+
+    /// The object, alive or dead; null for the empty handle.
+    ElementImpl* getElementImpl() const noexcept { return m_impl; }
+
+protected:
+    explicit ElementHandle(ElementImpl* impl) noexcept
+        : m_impl(impl)
+    {
+        if (m_impl)
+            m_impl->addRef();
+    }
+
+    ElementImpl* m_impl = nullptr;
+};
+} // namespace tarn::kiln

@@ -1,0 +1,46 @@
+/// \file
+/// The handle of an element of a model.
+#pragma once
+#include "tarnkiln/kernel/ElementHandle.h"
+
+namespace tarn::kiln {
+
+/// An element of any class.
+///
+/// The class is a handle: copies share the element; it is false when empty or when the element was
+/// destroyed. Operations are called through `operator->`.
+///
+/// Threads: handles may be copied and dropped anywhere; all else happens on the thread that uses
+/// the element's model.
+class TARNKILN_EXPORT ModelElement : public ElementHandle
+{
+public:
+    class Impl;    // ModelElementImpl.h
+    class Builder; // ModelElementBuilder.h
+
+    ModelElement() = default;
+    explicit ModelElement(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+
+    /// A stand-in of class `metaClass`, in `model`, for the element that `id` names.
+    ///
+    /// \throws tarnkiln::messages::NoSuchType  if no builder is registered for the class.
+    static ModelElement createProxy(Model const& model, meta::Class const& metaClass,
+                                    ProxyId const& id);
+
+    /// The class of all elements.
+    static meta::Class const& metaClass();
+    /// Creates that class; called once, when the registry starts.
+    static void initializeType(meta::MetaRegistry& registry);
+
+    static ModelElement cast(ModelElement const& element) { return element; }
+
+    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+};
+} // namespace tarn::kiln
+
+template <>
+struct std::hash<tarn::kiln::ModelElement>
+{
+    std::size_t operator()(tarn::kiln::ModelElement const& element) const noexcept;
+};

@@ -1,0 +1,256 @@
+/// \file
+/// What stands behind a `Model`.
+#pragma once
+#include "tarnkiln/kernel/FindElementBehavior.h"
+#include "tarnkiln/kernel/Model.h"
+#include "tarnkiln/kernel/ModelConstellation.h"
+#include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/kernel/internal/ElementRegistry.h"
+#include "tarnkiln/kernel/internal/TopLevelElements.h"
+#include "tarnkiln/meta/TransactionOrigin.h"
+
+#include <boost/optional.hpp>
+
+#include <atomic>
+#include <memory>
+#include <unordered_set>
+#include <vector>
+
+namespace tarn::kiln {
+class AbstractTransactionFactoryImpl;
+namespace datasource {
+class DataSource;
+}
+namespace internal {
+class LocalTransactionFactoryImpl;
+}
+
+/// The registry of a model's elements, its transaction, its listeners and its place in a
+/// constellation.
+///
+/// Threads: as `Model`.
+class TARNKILN_EXPORT Model::Impl : public ElementImpl
+{
+public:
+    /// Only factories can name it, so that only they can begin transactions.
+    class PrivateTag
+    {
+        PrivateTag() = default;
+        friend class internal::LocalTransactionFactoryImpl;
+    };
+
+    Impl(UUID const& id, ModelConstellation const& constellation);
+    ~Impl() override;
+
+    // ElementImpl
+    Model getModel() const override;
+    meta::Class const& getMetaClass() const override;
+    void removeRef() override;
+
+    /// \name Elements
+    /// @{
+    /// The element of that UUID; empty if there is none.
+    ModelElement findElement(UUID const& id,
+                             FindElementBehavior behavior = FindElementBehavior::InMemory) const;
+    /// The element of exactly that class that `id` names, by the resolvers of its type.
+    ModelElement findElement(meta::Class const& metaClass, ElementId const& id) const;
+    /// The element of that UUID in memory, or null; takes no reference.
+    ModelElement::Impl* findElementImpl(UUID const& id) const { return m_elements.find(id); }
+    /// A copy, in no promised order.
+    std::vector<ModelElement> getTopLevelElements() const;
+    std::size_t getElementCount() const { return m_elements.size(); }
+    /// Handles of all elements, in no promised order.
+    std::vector<ModelElement> getAllElements() const;
+    /// @}
+
+    /// \name Transactions
+    /// @{
+    /// Begins a transaction, or one nested in the open one, which then decides the depth.
+    ///
+    /// \param revertible  whether it must be possible to roll the changes back.
+    /// \throws tarnkiln::messages::ModelFrozen  if the model is dead.
+    Transaction beginTransaction(bool revertible);
+    Transaction innerBeginTransaction(PrivateTag const& tag, meta::TransactionOrigin const& origin,
+                                      bool deep);
+    void doBeginTransaction(internal::TransactionGroup* group,
+                            meta::TransactionOrigin const& origin);
+    /// Fails unless the model may be changed now.
+    ///
+    /// \throws tarnkiln::messages::ModelFrozen        if the model is frozen.
+    /// \throws tarnkiln::messages::NoOpenTransaction  if none is open and the model has a listener
+    ///     or shares its constellation with others.
+    void validateTransaction() const;
+    void transactionEnded();
+    internal::TransactionImpl* getCurrentTransaction() const { return m_currentTransaction; }
+    AbstractTransactionFactoryImpl& getDefaultTransactionFactory() const;
+    /// Lets another party begin this model's transactions; null restores the default.
+    void setTransactionFactory(std::unique_ptr<AbstractTransactionFactoryImpl> factory);
+    /// Makes the next default transaction ask the listeners again whether it must be deep.
+    void resetTransactionDepth() { m_transactionDepth = 0; }
+    /// @}
+
+    /// \name Notification, for elements
+    /// @{
+    void elementCreated(ModelElement::Impl* element, bool topLevel);
+    void elementDestroying(ModelElement::Impl* element);
+    void allElementsDestroying();
+    void elementModifying(ModelElement::Impl* element, unsigned long index);
+    void elementMadeTopLevel(ModelElement::Impl* element);
+    void elementNoLongerTopLevel(ModelElement::Impl* element);
+    void remove(ModelElement::Impl* element);
+    void resurrectElement(ModelElement::Impl* element);
+    /// @}
+
+    /// \name Listeners (ListenerHolder.h has the typed forms)
+    /// @{
+    /// Appends `holder`, unless its listener is on the list.
+    ///
+    /// A listener hears of transactions that begin after this call.
+    void addListenerHolder(std::unique_ptr<ListenerHolderBase> holder);
+    template <class L>
+    void addShallowListener(L* listener);
+    /// Adds a listener for what its methods show that it can hear: see ListenerHolder.h.
+    template <class L>
+    void addListener(L* listener);
+    template <class L>
+    void addOwnedListener(std::unique_ptr<L> listener);
+    /// Takes the listener off the list; it is told by `listenerRemoved`. Safe at any time, from
+    /// within a notification too.
+    void removeListener(Listener* listener);
+    void removeListenerFromTransaction(ListenerHolderBase* holder);
+    bool hasListeners() const { return !m_listeners.empty(); }
+    std::vector<std::unique_ptr<ListenerHolderBase>> const& getListeners() const
+    {
+        return m_listeners;
+    }
+    void addExtensionListener(ExtensionListener* listener);
+    void removeExtensionListener(ExtensionListener* listener);
+    /// @}
+
+    /// \name Identity
+    /// @{
+    ustring const& getModelURI() const { return m_modelURI; }
+    /// Renames the model; the stored URI is the normalised form of `uri`. Is no transaction.
+    ///
+    /// \throws tarnkiln::messages::InvalidValue  if the model has no constellation.
+    /// \throws tarnkiln::messages::UniquenessConstraint  if another model of it has that location.
+    void setModelURI(ustring const& uri);
+    ustring const& getLocationModelId() const { return m_locationModelId; }
+    ModelConstellation getModelConstellation() const;
+    ModelConstellation::Impl* getModelConstellationImpl() const { return m_constellation; }
+    void basicSetModelConstellation(ModelConstellation::Impl* constellation);
+    bool isRegistryModel() const { return !m_constellation && !m_modelURI.empty(); }
+    bool isTransientModel() const { return !m_constellation && m_modelURI.empty(); }
+    /// Whether other models change together with this one.
+    bool isMultiModel() const;
+    unsigned long getModelCounter() const { return m_modelCounter; }
+    /// @}
+
+    /// \name Packages in use
+    /// @{
+    std::vector<meta::Package> getUsedPackages() const;
+    std::vector<ustring> getUsedPackageUris() const;
+    /// The URIs of the used packages and of all that they import.
+    std::vector<ustring> getDescriptivePackageURIClosure() const;
+    static std::vector<ustring> getImportedPackageClosure(
+        std::vector<meta::Package> const& packages);
+    void setUsageProvider(std::unique_ptr<meta::DataModelUsageProvider> provider);
+    /// @}
+
+    /// \name Freezing and progress (Freezer.h, ProgressIndicators.h)
+    /// @{
+    /// Refuses changes for as long as the result lives.
+    Freezer freeze();
+    bool isFrozen() const { return m_freezeCount != 0; }
+    ParseInProgressIndicator startParse();
+    DataSourceLoadingInProgressIndicator startDataSourceLoading();
+    bool isParsing() const { return m_parseCount != 0; }
+    bool isDataSourceLoading() const { return m_dataSourceLoadCount != 0; }
+    /// Whether listeners that are told of a finished transaction find the model frozen.
+    void setFreezeOnNotify(bool freeze) { m_freezeOnNotify = freeze; }
+    bool isFrozenOnNotify() const { return m_freezeOnNotify; }
+    /// Whether reports leave out elements that were changed back.
+    void setRevertUnchangedOnReport(bool revert) { m_revertUnchangedOnReport = revert; }
+    bool isUnchangedRevertedOnReport() const { return m_revertUnchangedOnReport; }
+    /// @}
+
+    /// \name Proxies
+    /// @{
+    /// The element that `proxy` names, loading what is needed; the proxy itself if there is none.
+    ModelElement resolveProxy(ModelElement::Impl const* source, ModelElement const& proxy) const;
+    /// The same among what is in memory.
+    ModelElement peekResolveProxy(ModelElement::Impl const* source,
+                                  ModelElement const& proxy) const;
+    ProxyId getPersistentProxyId(ModelElement::Impl const* element, bool omitModel) const;
+    /// @}
+
+    /// \name Data source
+    /// @{
+    void setDataSource(std::unique_ptr<datasource::DataSource> source);
+    void resetDataSource();
+    datasource::DataSource* getDataSource() const { return m_dataSource.get(); }
+    /// @}
+
+    /// \name Destruction
+    /// @{
+    /// Destroys all elements, in one transaction; the model stays.
+    void destroyAllContents();
+    /// Destroys the model: listeners go first and are not told of the elements.
+    void destroy();
+    /// @}
+
+    /// Verifies registry, containment tree, top-level set, opposites, keys and side tables.
+    ///
+    /// Resolves, loads and makes nothing; does not depend on the size of the call stack.
+    /// \returns a sentence for each violation; empty if all is well.
+    std::vector<string> checkInvariants() const;
+    /// Runs `checkInvariants` and asserts on it, in checked builds: fully up to 2000 elements,
+    /// above that when the number of ended transactions is a power of two.
+    void checkInvariantsAtEnd();
+
+private:
+    friend class Model;
+    friend class Model::Freezer;
+    friend class Model::Thawer;
+    friend class Model::ParseInProgressIndicator;
+    friend class Model::DataSourceLoadingInProgressIndicator;
+    friend class ModelElement::Impl;
+    friend class internal::InvariantChecker;
+    friend class internal::TransactionImpl;
+
+    bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
+    ModelElement resolveLocally(ModelElement::Impl const& proxy) const;
+
+    internal::TopLevelElements m_topLevelElements; ///< Strong: keeps top-level elements alive.
+    internal::ElementRegistry m_elements;          ///< Everything the model holds, by UUID; weak.
+    std::unordered_set<ModelElement::Impl*> m_proxies; ///< Stand-ins that point to this model.
+    internal::TransactionImpl* m_currentTransaction = nullptr;
+    std::vector<internal::TransactionImpl*> m_notifying; ///< Transactions telling listeners now.
+    std::vector<std::unique_ptr<ListenerHolderBase>> m_listeners;
+    signed char m_transactionDepth = 1; ///< 0 ask the listeners, 1 shallow, 2 deep.
+    bool m_freezeOnNotify = false;
+    bool m_revertUnchangedOnReport = false;
+    unsigned long const m_modelCounter;
+    std::atomic<int> m_freezeCount{0};
+    unsigned int m_dataSourceLoadCount = 0;
+    unsigned int m_parseCount = 0;
+    unsigned long m_endedTransactions = 0;
+    std::unordered_set<ExtensionListener*> m_extensionListeners;
+    std::unique_ptr<meta::DataModelUsageProvider> m_usageProvider;
+    std::unique_ptr<AbstractTransactionFactoryImpl> m_transactionFactory;
+    ModelConstellation::Impl* m_constellation = nullptr;
+    ustring m_modelURI;
+    ustring m_locationModelId; ///< The form of the URI by which the constellation finds the model.
+    std::unique_ptr<datasource::DataSource> m_dataSource;
+};
+
+inline Model::Impl* Model::getImpl() const
+{
+    return static_cast<Impl*>(m_impl);
+}
+inline Model::Impl* Model::operator->() const
+{
+    return static_cast<Impl*>(m_impl);
+}
+} // namespace tarn::kiln
