@@ -1,0 +1,18 @@
+/// \file
+/// The texts and identifiers of the whole library.
+#pragma once
+#include <boost/uuid/uuid.hpp>
+
+#include <string>
+
+namespace tarn::kiln {
+
+/// UTF-16 text, as all names and text in a model are.
+using ustring = std::u16string;
+
+/// 8-bit text; UTF-8 unless said otherwise.
+using string = std::string;
+
+/// What tells the elements of a model apart.
+using UUID = boost::uuids::uuid;
+}  // namespace tarn::kiln
