@@ -72,7 +72,7 @@ private:
     Model::Impl* m_model;
     meta::Class m_metaClass;
     unsigned long m_count;
-    internal::SlotSet m_modified;
+    support::SlotSet m_modified;
     std::uint32_t m_holderCount = 0;
 
 protected:

@@ -16,6 +16,7 @@ struct Slot
     unsigned long index;                                ///< `propertyIndex`; from 1.
     bool composite = false;
     bool single = true;                                 ///< Upper bound 1.
+    bool keyed = false;                                 ///< A collection by a qualifying property.
     Slot const* opposite = nullptr;                     ///< The other end; null if there is none.
     meta::Property const& (*property)() = nullptr;      ///< Empty while its metamodel is not built.
 };
@@ -42,6 +43,7 @@ public:
     unsigned long index() const;
     bool isComposite() const;
     bool isSingle() const;                              ///< Upper bound 1.
+    bool isKeyed() const;                               ///< Has a live qualifying property.
     Feature opposite() const;                           ///< None, if it has no live opposite.
     /// The metamodel element; empty for a slot whose metamodel is not built.
     meta::Property property() const;

@@ -49,7 +49,7 @@ protected:
     /// The last step of `create` and `createProxy`.
     virtual ModelElement doCreate(bool proxy, UUID const& id) = 0;
 
-    internal::SlotSet m_setProperties;
+    support::SlotSet m_setProperties;
 
 private:
     friend class ModelElement::Impl;

@@ -16,10 +16,11 @@
 namespace tarn::kiln {
 
 namespace internal {
-class ElementRegistry;
 class InvariantChecker;
+}
+namespace support {
 class TopLevelElements;
-} // namespace internal
+}
 
 /// The implementation of an element; each class of a metamodel derives its own.
 ///
@@ -114,6 +115,8 @@ public:
     virtual bool inverseContainsProxyToSlot(ModelElement const& element, Slot const& slot) const;
     virtual void convertToProxySlot(Slot const& slot, ProxyId const& id,
                                     ModelElement const& element);
+    /// The target of the single reference `slot`, unresolved; null if empty or not this class's.
+    virtual Impl* basicGetReference(Slot const& slot) const;
     /// @}
 
     /// Calls `visit(reference, feature)` for each element that this one refers to, resolved or
@@ -141,6 +144,8 @@ public:
     /// \param index  the slot of this element that changes with it, or `NO_INDEX`.
     /// \throws tarnkiln::messages::CannotChangeModel  if the container lies in another model.
     void basicSetContainer(Impl* newContainer, Feature const& feature, unsigned long index);
+    /// Restores the link that `storage` kept. Announces and records nothing.
+    void basicSetContainer(Storage const* storage);
     /// Leaves the container, whose collection lets go, and becomes top-level.
     void makeUncontained();
     /// Fails with `CircularContainment` if `candidate`, the future container, is this element or
@@ -178,6 +183,8 @@ public:
     /// The id by which a proxy would name this element; a proxy's own id.
     ProxyId getPersistentProxyId(bool omitModel) const;
     ProxyId _getPersistentProxyId() const { return getPersistentProxyId(/*omitModel=*/false); }
+    /// Keeps the present link in `storage`, for the transaction.
+    void recordOldContainer(Storage& storage) const;
     /// Turns an element that its model does not know into a stand-in for the one that `id` names.
     void _becomeProxy(ProxyId const& id, ElementValidity validity);
     /// @}
@@ -216,21 +223,15 @@ protected:
     void collectionInvalidated(AbstractOwnedCollection* collection);
 
 private:
-    friend class internal::ElementRegistry;
     friend class internal::InvariantChecker;
-    friend class internal::TopLevelElements;
+    friend class support::TopLevelElements;
     friend class Model::Impl;
     friend class Storage;
 
-    struct DynamicEntry;
-
-    void recordOldContainer();
-    void restoreContainer(Storage const& storage);
+    void announceContainerChange();
     void storeLink(Impl* container, Feature const& feature);
     void pinContainer();
     void unpinContainer();
-    void resurrect();
-
     static constexpr std::uint32_t NOT_TOP_LEVEL = ~std::uint32_t{0};
 
     bool m_containerPinned = false; ///< A dead element keeps its container in memory.

@@ -104,21 +104,26 @@ public:
 
     /// \name Listeners (ListenerHolder.h has the typed forms)
     /// @{
-    /// Appends `holder`, unless its listener is on the list.
+    /// Appends `holder`, whose listener must not be on the list.
     ///
     /// A listener hears of transactions that begin after this call.
     void addListenerHolder(std::unique_ptr<ListenerHolderBase> holder);
+    /// Adds a listener that is told of commits, and needs no old values. Ignores one that is on
+    /// the list.
     template <class L>
     void addShallowListener(L* listener);
-    /// Adds a listener for what its methods show that it can hear: see ListenerHolder.h.
+    /// Adds a listener for what it has methods for; transactions become deep. Ignores one that is
+    /// on the list.
     template <class L>
     void addListener(L* listener);
+    /// The same, and deletes the listener when it is removed.
     template <class L>
     void addOwnedListener(std::unique_ptr<L> listener);
     /// Takes the listener off the list; it is told by `listenerRemoved`. Safe at any time, from
     /// within a notification too.
     void removeListener(Listener* listener);
     void removeListenerFromTransaction(ListenerHolderBase* holder);
+    bool isListening(Listener const* listener) const;
     bool hasListeners() const { return !m_listeners.empty(); }
     std::vector<std::unique_ptr<ListenerHolderBase>> const& getListeners() const
     {
@@ -142,6 +147,13 @@ public:
     void basicSetModelConstellation(ModelConstellation::Impl* constellation);
     bool isRegistryModel() const { return !m_constellation && !m_modelURI.empty(); }
     bool isTransientModel() const { return !m_constellation && m_modelURI.empty(); }
+    /// Moves the model into another constellation. Is no transaction.
+    ///
+    /// \throws tarnkiln::messages::CannotMigrateModel  if a transaction is open, if the model has
+    ///     no constellation or shares it, or if `target` is not live.
+    /// \throws tarnkiln::messages::CannotJoinShallowTransaction, UniquenessConstraint  as for a
+    ///     new model.
+    void migrateToConstellation(ModelConstellation const& target);
     /// Whether other models change together with this one.
     bool isMultiModel() const;
     unsigned long getModelCounter() const { return m_modelCounter; }
@@ -219,14 +231,16 @@ private:
     friend class internal::InvariantChecker;
     friend class internal::TransactionImpl;
 
+    void forgetListener(ListenerHolderBase* holder);
+    void removeAllListeners();
+    void destroyElements(bool multiModel);
     bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
-    ModelElement resolveLocally(ModelElement::Impl const& proxy) const;
 
-    internal::TopLevelElements m_topLevelElements; ///< Strong: keeps top-level elements alive.
-    internal::ElementRegistry m_elements;          ///< Everything the model holds, by UUID; weak.
+    support::TopLevelElements m_topLevelElements; ///< Strong: keeps top-level elements alive.
+    support::ElementRegistry m_elements;          ///< Everything the model holds, by UUID; weak.
     std::unordered_set<ModelElement::Impl*> m_proxies; ///< Stand-ins that point to this model.
     internal::TransactionImpl* m_currentTransaction = nullptr;
-    std::vector<internal::TransactionImpl*> m_notifying; ///< Transactions telling listeners now.
+    internal::TransactionImpl* m_notifying = nullptr; ///< The innermost that is telling listeners.
     std::vector<std::unique_ptr<ListenerHolderBase>> m_listeners;
     signed char m_transactionDepth = 1; ///< 0 ask the listeners, 1 shallow, 2 deep.
     bool m_freezeOnNotify = false;

@@ -5,7 +5,7 @@
 
 #include <vector>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 /// A set of handles; each element knows its place in it, so that none is searched.
 class TopLevelElements
@@ -49,4 +49,4 @@ public:
 private:
     std::vector<ModelElement> m_elements;
 };
-} // namespace tarn::kiln::internal
+} // namespace tarn::kiln::support

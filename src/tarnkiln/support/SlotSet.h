@@ -4,7 +4,7 @@
 #include <cstdint>
 #include <memory>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 /// Bits for a number of slots fixed at construction; up to 64 without an allocation.
 class SlotSet
@@ -48,4 +48,4 @@ private:
     std::uint64_t m_first = 0;
     std::unique_ptr<std::uint64_t[]> m_more;
 };
-} // namespace tarn::kiln::internal
+} // namespace tarn::kiln::support

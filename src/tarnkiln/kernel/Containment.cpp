@@ -1,0 +1,185 @@
+// The operations of elements on the containment tree, and their destruction.
+#include "tarnkiln/kernel/Changes.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/internal/TransactionImpl.h"
+#include "tarnkiln/services/datasource/DataSource.h"
+
+namespace tarn::kiln {
+
+ModelElement ModelElement::Impl::container() const
+{
+    return ModelElement(basicContainer());
+}
+
+meta::Property ModelElement::Impl::containerProperty() const
+{
+    return m_containmentFeature.opposite().property();
+}
+
+meta::Property ModelElement::Impl::containmentFeature() const
+{
+    return m_containmentFeature.property();
+}
+
+meta::Property::Impl* ModelElement::Impl::containmentFeatureImpl() const
+{
+    return m_containmentFeature.propertyImpl();
+}
+
+/// A dead element's container may lose its last handle before the dead element does.
+void ModelElement::Impl::pinContainer()
+{
+    if (m_container && !m_containerPinned) {
+        m_container->addRef();
+        m_containerPinned = true;
+    }
+}
+
+void ModelElement::Impl::unpinContainer()
+{
+    if (std::exchange(m_containerPinned, false))
+        m_container->removeRef();
+}
+
+void ModelElement::Impl::storeLink(Impl* container, Feature const& feature)
+{
+    unpinContainer();
+    m_container = container;
+    m_containmentFeature = feature;
+}
+
+void ModelElement::Impl::announceContainerChange()
+{
+    if (m_validity == ElementValidity::Valid && !isProxy() && m_model->isRecording())
+        m_model->m_currentTransaction->containerChanging(this);
+}
+
+void ModelElement::Impl::recordOldContainer(Storage& storage) const
+{
+    storage.setOldContainer(container(), m_containmentFeature);
+}
+
+void ModelElement::Impl::basicSetContainer(Impl* newContainer, Feature const& feature,
+                                           unsigned long index)
+{
+    notifyModifying(index);
+    if (!newContainer || !feature) {
+        if (isTopLevel())
+            return;
+        announceContainerChange();
+        if (m_validity == ElementValidity::Valid && !isProxy())
+            m_model->elementMadeTopLevel(this);
+        storeLink(nullptr, Feature());
+        return;
+    }
+    if (newContainer->m_model != m_model)
+        reportException(tarnkiln::messages::CannotChangeModel());
+    ModelElement const keep(this);
+    announceContainerChange();
+    if (isTopLevel())
+        m_model->elementNoLongerTopLevel(this);
+    storeLink(newContainer, feature);
+}
+
+void ModelElement::Impl::basicSetContainer(Storage const* storage)
+{
+    Feature const& feature = storage->getOldContainment();
+    if (!feature) {
+        m_model->elementMadeTopLevel(this);
+        storeLink(nullptr, Feature());
+        return;
+    }
+    ModelElement const keep(this);
+    m_model->elementNoLongerTopLevel(this);
+    storeLink(storage->getOldContainer().getImpl(), feature);
+}
+
+void ModelElement::Impl::makeUncontained()
+{
+    Impl* const oldContainer = basicContainer();
+    if (!oldContainer)
+        return;
+    ModelElement const keep(this);
+    Feature const feature = m_containmentFeature;
+    Feature const opposite = feature.opposite();
+    _inverseRemoveThis(oldContainer, feature);
+    basicSetContainer(nullptr, Feature(), opposite ? opposite.index() : NO_INDEX);
+}
+
+void ModelElement::Impl::_setContainedByThis(Impl* child, Feature const& feature)
+{
+    ModelElement const keep(child);
+    child->makeUncontained();
+    child->basicSetContainer(this, feature, NO_INDEX);
+}
+
+void ModelElement::Impl::_basicSetUncontained(Impl* child)
+{
+    child->basicSetContainer(nullptr, Feature(), NO_INDEX);
+}
+
+void ModelElement::Impl::checkCircularContainment(ModelElement const& candidate) const
+{
+    for (Impl const* above = candidate.getImpl(); above; above = above->basicContainer()) {
+        if (above == this)
+            reportException(tarnkiln::messages::CircularContainment());
+    }
+}
+
+void ModelElement::Impl::checkCompatibleModel(Impl* other, Feature const& feature) const
+{
+    if (!other || !other->isLive())
+        return;
+    bool const sameModel = other->m_model == m_model;
+    if (feature.isComposite()) {
+        bool const elsewhere = other->isProxy() ? other->m_proxyId->getModelId().has_value()
+                                                : !sameModel;
+        if (elsewhere)
+            reportException(tarnkiln::messages::CannotCreateCrossModelAssociation());
+        other->checkCircularContainment(ModelElement(const_cast<Impl*>(this)));
+    }
+    if (sameModel && !other->isProxy())
+        return;
+    bool const paired = static_cast<bool>(feature.opposite());
+    if (m_model->isRegistryModel())
+        reportException(tarnkiln::messages::CannotCreateCrossModelAssociation());
+    Model::Impl const* const target = other->m_model;
+    bool const oneSided = target && (target->isRegistryModel() || target->isTransientModel());
+    if (paired && (oneSided || m_model->isTransientModel()))
+        reportException(tarnkiln::messages::CannotCreateCrossModelAssociation());
+}
+
+void ModelElement::Impl::destroy()
+{
+    if (!isLive())
+        return;
+    ModelElement const keep(this);
+    Model const model = getModel();
+    bool const multiModel = model->isMultiModel();
+    Transaction const transaction = model->beginTransaction(/*revertible=*/false);
+    if (model->getDataSource())
+        model->getDataSource()->loadElementSubtree(keep);
+    destroyRecursively(/*keepIncoming=*/false, /*removeFromContainer=*/true, multiModel);
+    transaction.commit();
+}
+
+void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromContainer,
+                                            bool multiModel)
+{
+    if (!isLive())
+        return;
+    ModelElement const keep(this);
+    if (!isProxy()) {
+        aboutToDestroy();
+        notifyDestroying();
+        if (!keepIncoming)
+            disassociateIncoming();
+        if (removeFromContainer && !isTopLevel())
+            _callInverseRemove(*m_container, m_containmentFeature);
+        doDestroy(keepIncoming, multiModel);
+    }
+    invalidate();
+}
+} // namespace tarn::kiln

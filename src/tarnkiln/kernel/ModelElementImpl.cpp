@@ -1,0 +1,306 @@
+#include "tarnkiln/kernel/ModelElementImpl.h"
+
+#include "tarnkiln/collections/ReferenceCollection.h"
+#include "tarnkiln/kernel/Changes.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/qualifiedName.h"
+#include "tarnkiln/meta/Operation.h"
+#include "tarnkiln/meta/OperationImpl.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/services/datasource/DataSource.h"
+
+namespace tarn::kiln {
+
+ModelElement::Impl::ReflectionPrivateTag const ModelElement::Impl::PUBLIC_ACCESS;
+ModelElement::Impl::ReflectionPrivateTag const ModelElement::Impl::PRIVILEGED_ACCESS;
+ModelElement::Impl::ReflectionPrivateTag const ModelElement::Impl::NO_PROXY_RESOLVE;
+ModelElement::Impl::ReflectionPrivateTag const ModelElement::Impl::IN_MEMORY_ONLY;
+
+namespace {
+
+[[noreturn]] void reportNoSuchProperty(ModelElement::Impl const& element,
+                                       meta::Property const& property)
+{
+    reportException(tarnkiln::messages::NoSuchProperty(
+        property ? property->getName() : ustring(),
+        internal::qualifiedName(element.getMetaClass())));
+}
+
+} // namespace
+
+ModelElement::Impl::Impl(Model const& model, UUID const& id)
+    : ElementImpl(id, ElementValidity::Constructing)
+    , m_model(model.getImpl())
+{
+    if (!model)
+        reportException(tarnkiln::messages::CannotCreateWithoutModel());
+}
+
+ModelElement::Impl::~Impl()
+{
+    m_refCount = REFCOUNT_DELETING;
+    if (isProxy()) {
+        if (m_model)
+            m_model->m_proxies.erase(this);
+    }
+    else if (static_cast<signed char>(m_validity) > 0) {
+        m_model->remove(this);
+    }
+    unpinContainer();
+}
+
+Model ModelElement::Impl::getModel() const
+{
+    return Model(m_model);
+}
+
+void ModelElement::Impl::invalidate()
+{
+    pinContainer();
+    ElementImpl::invalidate();
+}
+
+void ModelElement::Impl::collectionInvalidated(AbstractOwnedCollection* collection)
+{
+    if (m_callback)
+        m_callback(this, collection);
+}
+
+// ---------------------------------------------------------------------------- steps of a class
+
+bool ModelElement::Impl::hasPropertyValue(meta::Property const& property,
+                                          ReflectionPrivateTag const&) const
+{
+    reportNoSuchProperty(*this, property);
+}
+
+Value ModelElement::Impl::getPropertyValue(meta::Property const& property,
+                                           ReflectionPrivateTag const&) const
+{
+    reportNoSuchProperty(*this, property);
+}
+
+void ModelElement::Impl::setPropertyValue(meta::Property const& property, Value const&,
+                                          ReflectionPrivateTag const&)
+{
+    reportNoSuchProperty(*this, property);
+}
+
+boost::optional<Value> ModelElement::Impl::invoke(meta::Operation const& operation,
+                                                  std::vector<Value> const&,
+                                                  ReflectionPrivateTag const&)
+{
+    reportException(tarnkiln::messages::NoSuchOperation(
+        operation ? operation->getName() : ustring(), internal::qualifiedName(getMetaClass())));
+}
+
+ustring ModelElement::Impl::identifier() const
+{
+    return ustring();
+}
+
+void ModelElement::Impl::inverseAdd(ModelElement const&, meta::Property const& property)
+{
+    reportNoSuchProperty(*this, property);
+}
+
+void ModelElement::Impl::inverseRemove(ModelElement const&, meta::Property const& property)
+{
+    reportNoSuchProperty(*this, property);
+}
+
+bool ModelElement::Impl::inverseContainsProxyTo(ModelElement const&,
+                                                meta::Property const& property) const
+{
+    if (Feature(property).opposite().isComposite())
+        return true;
+    reportNoSuchProperty(*this, property);
+}
+
+void ModelElement::Impl::notifyDestroying()
+{
+    m_model->elementDestroying(this);
+}
+
+void ModelElement::Impl::disassociateIncoming() {}
+void ModelElement::Impl::convertReferencesToProxies(bool, boost::optional<ProxyId>&) {}
+void ModelElement::Impl::aboutToDestroy() {}
+void ModelElement::Impl::didCreate() {}
+void ModelElement::Impl::basicDisassociateAll() {}
+void ModelElement::Impl::convertToProxy(meta::Property const&, ProxyId const&, ModelElement const&)
+{
+}
+void ModelElement::Impl::visitReferences(ReferenceVisitor const&) const {}
+
+void ModelElement::Impl::copyValue(Storage*, unsigned long index) const
+{
+    reportNoSuchProperty(*this, getPropertyByIndex(index));
+}
+
+void ModelElement::Impl::copyStateFromStorage(Storage* storage)
+{
+    if (storage->isContainerChanged())
+        basicSetContainer(storage);
+}
+
+meta::Property ModelElement::Impl::getPropertyByIndex(unsigned long) const
+{
+    return meta::Property();
+}
+
+void ModelElement::Impl::inverseAddSlot(ModelElement const& element, Slot const& slot)
+{
+    inverseAdd(element, getPropertyByIndex(slot.index));
+}
+
+void ModelElement::Impl::inverseRemoveSlot(ModelElement const& element, Slot const& slot)
+{
+    inverseRemove(element, getPropertyByIndex(slot.index));
+}
+
+bool ModelElement::Impl::inverseContainsProxyToSlot(ModelElement const& element,
+                                                    Slot const& slot) const
+{
+    return inverseContainsProxyTo(element, getPropertyByIndex(slot.index));
+}
+
+void ModelElement::Impl::convertToProxySlot(Slot const& slot, ProxyId const& id,
+                                            ModelElement const& element)
+{
+    convertToProxy(getPropertyByIndex(slot.index), id, element);
+}
+
+ModelElement::Impl* ModelElement::Impl::basicGetReference(Slot const&) const
+{
+    return nullptr;
+}
+
+// ---------------------------------------------------------------------------- change
+
+void ModelElement::Impl::notifyModifying(unsigned long index)
+{
+    if (index != NO_INDEX && m_validity == ElementValidity::Valid)
+        m_model->elementModifying(this, index);
+}
+
+void ModelElement::Impl::notifyCreated()
+{
+    m_validity = ElementValidity::Valid;
+    m_model->elementCreated(this, /*topLevel=*/true);
+    didCreate();
+}
+
+// ---------------------------------------------------------------------------- proxies
+
+boost::optional<ProxyId> ModelElement::Impl::getProxyId() const
+{
+    return m_proxyId ? boost::optional<ProxyId>(*m_proxyId) : boost::none;
+}
+
+ProxyId ModelElement::Impl::getPersistentProxyId(bool omitModel) const
+{
+    return m_proxyId ? *m_proxyId : m_model->getPersistentProxyId(this, omitModel);
+}
+
+void ModelElement::Impl::_becomeProxy(ProxyId const& id, ElementValidity validity)
+{
+    auto proxyId = std::make_unique<ProxyId>(id);
+    m_model->m_proxies.insert(this);
+    m_proxyId = std::move(proxyId);
+    m_validity = validity;
+}
+
+void ModelElement::Impl::_convertToProxy(Impl* target, Feature const& feature, ProxyId const& id)
+{
+    if (!target || target->isProxy())
+        return;
+    if (feature.slot())
+        target->convertToProxySlot(*feature.slot(), id, ModelElement(this));
+    else
+        target->convertToProxy(feature.property(), id, ModelElement(this));
+}
+
+// ---------------------------------------------------------------------------- other ends
+
+void ModelElement::Impl::_callInverseAdd(Impl& other, Feature const& feature)
+{
+    if (feature.slot())
+        other.inverseAddSlot(ModelElement(this), *feature.slot());
+    else
+        other.inverseAdd(ModelElement(this), feature.property());
+}
+
+void ModelElement::Impl::_callInverseRemove(Impl& other, Feature const& feature)
+{
+    if (feature.slot())
+        other.inverseRemoveSlot(ModelElement(this), *feature.slot());
+    else
+        other.inverseRemove(ModelElement(this), feature.property());
+}
+
+void ModelElement::Impl::_inverseAddThis(Impl* other, Feature const& feature, bool force)
+{
+    if (!other || other->isProxy())
+        return;
+    bool const listedByBothEnds = !feature.isSingle() && !feature.isComposite()
+                                  && !feature.opposite().isComposite();
+    if (!force && listedByBothEnds && m_model->isParsing())
+        return;
+    _callInverseAdd(*other, feature);
+}
+
+void ModelElement::Impl::_inverseRemoveThis(Impl* other, Feature const& feature)
+{
+    if (other && !other->isProxy())
+        _callInverseRemove(*other, feature);
+}
+
+bool ModelElement::Impl::_inverseContainsThis(Impl* other, Feature const& feature) const
+{
+    if (!other || other->isProxy())
+        return false;
+    ModelElement const self(const_cast<Impl*>(this));
+    return feature.slot() ? other->inverseContainsProxyToSlot(self, *feature.slot())
+                          : other->inverseContainsProxyTo(self, feature.property());
+}
+
+// ---------------------------------------------------------------------------- collections
+
+void ModelElement::Impl::_basicAdd(ReferenceCollection* collection, ModelElement const& element)
+{
+    collection->basicAdd(element);
+}
+
+void ModelElement::Impl::_basicRemove(ReferenceCollection* collection, ModelElement const& element)
+{
+    collection->basicRemove(element);
+}
+
+bool ModelElement::Impl::_basicContainsProxyTo(ReferenceCollection* collection,
+                                               ModelElement const& element)
+{
+    return collection->basicContainsProxyTo(element);
+}
+
+void ModelElement::Impl::_basicClear(ReferenceCollection* collection)
+{
+    collection->basicClear();
+}
+
+void ModelElement::Impl::_basicCopyValues(ReferenceCollection* target,
+                                          ReferenceCollection const* source)
+{
+    if (source)
+        target->basicCopyValues(*source);
+    else
+        target->basicClear();
+}
+
+void ModelElement::Impl::_loadCollectionContents(ReferenceCollection* collection) const
+{
+    if (m_model && m_model->getDataSource())
+        m_model->getDataSource()->loadCollectionContents(collection);
+}
+} // namespace tarn::kiln

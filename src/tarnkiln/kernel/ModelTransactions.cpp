@@ -1,0 +1,92 @@
+// How transactions of a model begin, and what may be done outside one.
+#include "tarnkiln/kernel/Listener.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/ModelConstellationImpl.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/internal/LocalTransactionFactoryImpl.h"
+#include "tarnkiln/kernel/internal/NestedTransaction.h"
+#include "tarnkiln/kernel/internal/TransactionGroup.h"
+#include "tarnkiln/kernel/internal/TransactionImpl.h"
+
+#include <algorithm>
+
+namespace tarn::kiln {
+
+AbstractTransactionFactoryImpl::~AbstractTransactionFactoryImpl() = default;
+
+AbstractTransactionFactoryImpl& Model::Impl::getDefaultTransactionFactory() const
+{
+    return *m_transactionFactory;
+}
+
+void Model::Impl::setTransactionFactory(std::unique_ptr<AbstractTransactionFactoryImpl> factory)
+{
+    if (!factory)
+        factory = std::make_unique<internal::LocalTransactionFactoryImpl>(*this);
+    m_transactionFactory = std::move(factory);
+}
+
+Transaction Model::Impl::beginTransaction(bool revertible)
+{
+    return revertible ? m_transactionFactory->beginRevertibleTransaction()
+                      : m_transactionFactory->beginTransaction();
+}
+
+Transaction Model::Impl::innerBeginTransaction(PrivateTag const&,
+                                               meta::TransactionOrigin const& origin, bool deep)
+{
+    if (m_validity == ElementValidity::Invalid)
+        reportException(tarnkiln::messages::ModelFrozen());
+    if (m_currentTransaction)
+        return Transaction(new internal::NestedTransaction(m_currentTransaction));
+    if (!deep) {
+        if (m_transactionDepth == 0) {
+            bool const anyDeep =
+                std::any_of(m_listeners.begin(), m_listeners.end(),
+                            [](auto const& holder) { return !holder->isShallow(); });
+            m_transactionDepth = anyDeep ? 2 : 1;
+        }
+        deep = m_transactionDepth == 2;
+    }
+    if (!m_constellation) {
+        Transaction const transaction(
+            new internal::TransactionImpl(getModel(), nullptr, origin, deep));
+        m_currentTransaction = static_cast<internal::TransactionImpl*>(transaction.getImpl());
+        return transaction;
+    }
+    m_constellation->createTransactionGroup(deep, origin);
+    try {
+        return Transaction(new internal::NestedTransaction(m_currentTransaction));
+    }
+    catch (...) {
+        m_constellation->getTransactionGroup()->rollBack();
+        throw;
+    }
+}
+
+void Model::Impl::doBeginTransaction(internal::TransactionGroup* group,
+                                     meta::TransactionOrigin const& origin)
+{
+    m_currentTransaction =
+        new internal::TransactionImpl(getModel(), group, origin, group->isDeep());
+}
+
+void Model::Impl::validateTransaction() const
+{
+    if (m_validity == ElementValidity::ModelDestroying)
+        return;
+    if (m_currentTransaction && m_currentTransaction->isRolledBack())
+        return; // what undo restores is no change
+    if (m_freezeCount != 0)
+        reportException(tarnkiln::messages::ModelFrozen());
+    if (!m_currentTransaction && (isMultiModel() || hasListeners()))
+        reportException(tarnkiln::messages::NoOpenTransaction());
+}
+
+void Model::Impl::transactionEnded()
+{
+    m_currentTransaction = nullptr;
+    ++m_endedTransactions;
+    m_elements.forgetReturns();
+}
+} // namespace tarn::kiln

@@ -1,0 +1,491 @@
+#include "tarnkiln/kernel/internal/TransactionImpl.h"
+
+#include "tarnkiln/kernel/Listener.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/internal/TransactionGroup.h"
+
+#include <algorithm>
+
+namespace tarn::kiln::internal {
+
+/// While it lives, listeners that are removed from the model are skipped, although the transaction
+/// is no longer the model's; the model is frozen, if it is to be.
+class TransactionImpl::Notifying
+{
+public:
+    explicit Notifying(TransactionImpl& transaction)
+        : m_model(*transaction.m_model.getImpl())
+        , m_freezes(transaction.has(FREEZE_ON_NOTIFY))
+    {
+        transaction.m_previousNotifying = m_model.m_notifying;
+        m_model.m_notifying = &transaction;
+        if (m_freezes)
+            ++m_model.m_freezeCount;
+    }
+    Notifying(Notifying const&) = delete;
+    Notifying& operator=(Notifying const&) = delete;
+    ~Notifying()
+    {
+        m_model.m_notifying = m_model.m_notifying->m_previousNotifying;
+        if (m_freezes)
+            --m_model.m_freezeCount;
+    }
+
+private:
+    Model::Impl& m_model;
+    bool m_freezes;
+};
+
+TransactionImpl::TransactionImpl(Model const& model, TransactionGroup* group,
+                                 meta::TransactionOrigin const& origin, bool deep)
+    : AbstractTransactionImpl(origin)
+    , m_model(model)
+    , m_group(group)
+    , m_changes(std::make_shared<ChangeRecords>())
+    , m_flags((model->isFrozenOnNotify() ? FREEZE_ON_NOTIFY : 0u) | (deep ? DEEP : 0u)
+              | (model->isUnchangedRevertedOnReport() ? REVERT_UNCHANGED : 0u))
+{
+    for (auto const& holder : model->getListeners())
+        m_listeners.push_back(holder.get());
+    if (m_group)
+        m_group->addMember(this);
+}
+
+TransactionImpl::~TransactionImpl() = default;
+
+// ---------------------------------------------------------------------------- recording
+
+bool TransactionImpl::startRecording()
+{
+    if (has(ROLLED_BACK) || (m_listeners.empty() && !m_firstChangeCallback && !has(DEEP)))
+        return false;
+    if (has(CHANGES_PROHIBITED))
+        reportException(tarnkiln::messages::ChangesProhibited());
+    return true;
+}
+
+void TransactionImpl::announceFirstChange()
+{
+    if (has(HAS_CHANGES) || !m_firstChangeCallback || m_inFirstChangeCallback)
+        return;
+    struct Guard
+    {
+        bool& flag;
+        ~Guard() { flag = false; }
+    } const guard{m_inFirstChangeCallback};
+    m_inFirstChangeCallback = true;
+    m_firstChangeCallback();
+}
+
+ChangesHolder TransactionImpl::makeRecord(ModelElement::Impl const& element) const
+{
+    return ChangesHolder(has(DEEP) ? element.createStorage() : element.createChanges());
+}
+
+/// Whether the record under the element's UUID is that of another element, which this transaction
+/// destroyed.
+bool TransactionImpl::isDestroyedPredecessor(ModelElement::Impl const* element) const
+{
+    if (!m_destroyedElements)
+        return false;
+    auto const found = m_destroyedElements->find(element->getUuid());
+    return found != m_destroyedElements->end() && found->second.getImpl() != element;
+}
+
+ModelElement::Impl::Changes* TransactionImpl::findRecord(ModelElement::Impl const* element) const
+{
+    if (isDestroyedPredecessor(element)) {
+        for (auto const& newcomer : m_changes->newcomers) {
+            if (newcomer.first.getImpl() == element)
+                return newcomer.second.get();
+        }
+        return nullptr;
+    }
+    auto const found = m_changes->byUuid.find(element->getUuid());
+    return found == m_changes->byUuid.end() ? nullptr : found->second.get();
+}
+
+ModelElement::Impl::Changes& TransactionImpl::addRecord(ModelElement::Impl* element)
+{
+    ChangesHolder record = makeRecord(*element);
+    ModelElement::Impl::Changes& result = *record;
+    if (has(DEEP) && m_pins.capacity() <= m_changes->byUuid.size())
+        m_pins.reserve(2 * m_changes->byUuid.size() + 8);
+    if (isDestroyedPredecessor(element))
+        m_changes->newcomers.emplace_back(ModelElement(element), std::move(record));
+    else
+        m_changes->byUuid.emplace(element->getUuid(), std::move(record));
+    return result;
+}
+
+ModelElement::Impl::Changes& TransactionImpl::recordOf(ModelElement::Impl* element)
+{
+    ModelElement::Impl::Changes* const found = findRecord(element);
+    return found ? *found : addRecord(element);
+}
+
+void TransactionImpl::elementCreated(ModelElement::Impl* element)
+{
+    if (!startRecording())
+        return;
+    if (has(DESTROY_ALL))
+        reportException(tarnkiln::messages::CreateWithDestroyAll());
+    announceFirstChange();
+    addRecord(element).setCreated();
+    finishRecording();
+}
+
+void TransactionImpl::elementDestroying(ModelElement::Impl* element)
+{
+    if (!startRecording())
+        return;
+    announceFirstChange();
+    if (!m_destroyedElements)
+        m_destroyedElements =
+            std::make_unique<std::unordered_map<UUID, ModelElement, UUIDHasher>>();
+    ModelElement::Impl::Changes& record = recordOf(element);
+    m_destroyedElements->emplace(element->getUuid(), ModelElement(element));
+    record.setDestroyed();
+    finishRecording();
+}
+
+void TransactionImpl::allElementsDestroying()
+{
+    if (!startRecording())
+        return;
+    announceFirstChange();
+    set(DESTROY_ALL);
+    finishRecording();
+}
+
+void TransactionImpl::elementModifying(ModelElement::Impl* element, unsigned long index)
+{
+    if (index == 0 || !startRecording())
+        return;
+    announceFirstChange();
+    ModelElement::Impl::Changes& record = recordOf(element);
+    if (!record.isCreated() && (has(DEEP) || !record.isDestroyed())
+        && !record.isSlotChanged(index)) {
+        if (has(DEEP))
+            element->copyValue(static_cast<ModelElement::Impl::Storage*>(&record), index);
+        record.setModified(index);
+    }
+    finishRecording();
+}
+
+void TransactionImpl::containerChanging(ModelElement::Impl* element)
+{
+    if (!has(DEEP) || !startRecording())
+        return;
+    announceFirstChange();
+    ModelElement::Impl::Changes& record = recordOf(element);
+    if (!record.isCreated())
+        element->recordOldContainer(static_cast<ModelElement::Impl::Storage&>(record));
+    finishRecording();
+}
+
+void TransactionImpl::addFirstChangeCallback(std::function<void()> const& callback)
+{
+    std::function<void()> replacement(callback);
+    m_firstChangeCallback.swap(replacement);
+}
+
+void TransactionImpl::eventEmitted(std::unique_ptr<meta::AbstractDeferredInvocation> invocation)
+{
+    if (has(ROLLED_BACK))
+        return;
+    if (has(CHANGES_PROHIBITED))
+        reportException(tarnkiln::messages::ChangesProhibited());
+    if (!m_deferredInvocations)
+        m_deferredInvocations = std::make_shared<ReportData::DeferredInvocations>();
+    m_deferredInvocations->push_back(std::move(invocation));
+}
+
+// ---------------------------------------------------------------------------- ending
+
+TransactionResult TransactionImpl::commit(boost::optional<Value> const& message)
+{
+    if (has(ROLLED_BACK) || has(ENDED))
+        return TransactionResult::NotCompleted;
+    ++m_commitCount;
+    if (!m_group) {
+        TransactionGroup alone(nullptr, /*deep=*/false, m_origin);
+        alone.addMember(this);
+        return alone.tryCommit(message);
+    }
+    TransactionResult const result = m_group->tryCommit(message);
+    if (result != TransactionResult::NotCompleted)
+        set(ENDED);
+    return result;
+}
+
+TransactionResult TransactionImpl::rollBack()
+{
+    if (has(ROLLED_BACK) || has(ENDED))
+        return TransactionResult::NotCompleted;
+    set(ROLL_BACK_ONLY);
+    if (m_group)
+        return m_group->rollBack();
+    TransactionGroup alone(nullptr, /*deep=*/false, m_origin);
+    alone.addMember(this);
+    return alone.rollBack();
+}
+
+TransactionResult TransactionImpl::nestedFailed()
+{
+    if (has(ENDED))
+        return TransactionResult::NotCompleted;
+    ++m_commitCount;
+    set(ROLL_BACK_ONLY);
+    if (!m_group) {
+        TransactionGroup alone(nullptr, /*deep=*/false, m_origin);
+        alone.addMember(this);
+        return alone.commitIfComplete(boost::none);
+    }
+    TransactionResult const result = m_group->commitIfComplete(boost::none);
+    if (result != TransactionResult::NotCompleted)
+        set(ENDED);
+    return result;
+}
+
+void TransactionImpl::removeRef()
+{
+    if (--m_handleCount != 0)
+        return;
+    if (!has(ENDED)) {
+        if (m_group && m_commitCount == 0)
+            return; // stays a member without handles until the group ends
+        m_handleCount = HANDLES_DELETING;
+        try {
+            rollBack();
+        }
+        catch (...) {
+            // there is nobody to tell; the model is as the failure left it
+        }
+    }
+    delete this;
+}
+
+void TransactionImpl::markRollBackOnly()
+{
+    if (has(ROLL_BACK_ONLY) || has(ENDED))
+        return;
+    set(ROLL_BACK_ONLY);
+    if (m_group)
+        m_group->markRollBackOnly();
+}
+
+void TransactionImpl::end()
+{
+    m_group = nullptr;
+    if (has(ENDED))
+        return;
+    set(ENDED);
+    m_model->transactionEnded();
+}
+
+void TransactionImpl::abandon()
+{
+    Transaction const keep(this);
+    std::fill(m_listeners.begin(), m_listeners.end(), nullptr);
+    set(ENDED);
+    m_model->transactionEnded();
+    if (TransactionGroup* const group = std::exchange(m_group, nullptr))
+        group->removeMember(this);
+}
+
+void TransactionImpl::removeListener(ListenerHolderBase* holder)
+{
+    auto const found = std::find(m_listeners.begin(), m_listeners.end(), holder);
+    if (found != m_listeners.end())
+        *found = nullptr;
+}
+
+// ---------------------------------------------------------------------------- listeners
+
+bool TransactionImpl::hasNews() const
+{
+    return has(HAS_CHANGES) || (m_deferredInvocations && !m_deferredInvocations->empty());
+}
+
+bool TransactionImpl::anyListener(ReportKind kind) const
+{
+    return std::any_of(m_listeners.begin(), m_listeners.end(), [&](ListenerHolderBase* holder) {
+        return holder
+               && (kind == ReportKind::Prepare    ? holder->wantsPrepare()
+                   : kind == ReportKind::Validate ? holder->wantsValidate()
+                                                  : holder->wantsNotify());
+    });
+}
+
+std::shared_ptr<ReportData> TransactionImpl::createReport(boost::optional<Value> const& message,
+                                                          ReportKind kind)
+{
+    if (!hasNews() || (kind != ReportKind::Any && !anyListener(kind)))
+        return nullptr;
+    auto report = std::make_shared<ReportData>(m_model, m_changes, message, has(REVERT_UNCHANGED),
+                                               has(DEEP), m_deferredInvocations, has(DESTROY_ALL),
+                                               m_origin);
+    for (auto const& [id, record] : m_changes->byUuid) {
+        if (record->isDestroyed())
+            report->processElement(m_destroyedElements->at(id), record.get());
+        else
+            report->processElement(m_model->findElement(id, FindElementBehavior::Fetch),
+                                   record.get());
+    }
+    for (auto const& [element, record] : m_changes->newcomers)
+        report->processElement(element, record.get());
+    return report;
+}
+
+void TransactionImpl::prepare(boost::optional<Value> const& message)
+{
+    std::shared_ptr<ReportData> report;
+    for (std::size_t i = 0; i < m_listeners.size() && !has(ENDED) && hasNews(); ++i) {
+        if (!m_listeners[i] || !m_listeners[i]->wantsPrepare())
+            continue;
+        if (!report || has(REPORT_STALE)) {
+            report = createReport(message, ReportKind::Any);
+            clear(REPORT_STALE);
+        }
+        if (!report->isEmpty())
+            m_listeners[i]->prepare(report);
+    }
+}
+
+bool TransactionImpl::validate(boost::optional<Value> const& message)
+{
+    if (!hasNews())
+        return true;
+    try {
+        std::shared_ptr<ReportData> report;
+        for (std::size_t i = 0; i < m_listeners.size() && !has(ENDED); ++i) {
+            if (!m_listeners[i] || !m_listeners[i]->wantsValidate())
+                continue;
+            if (!report)
+                report = createReport(message, ReportKind::Any);
+            if (!report->isEmpty() && !m_listeners[i]->validate(report))
+                return false;
+        }
+    }
+    catch (...) {
+        return false;
+    }
+    return true;
+}
+
+void TransactionImpl::notifyCommitted(boost::optional<Value> const& message)
+{
+    if (!hasNews() || !anyListener(ReportKind::Notify))
+        return;
+    Notifying const notifying(*this);
+    std::shared_ptr<ReportData> report;
+    for (std::size_t i = 0; i < m_listeners.size(); ++i) {
+        if (!m_listeners[i] || !m_listeners[i]->wantsNotify())
+            continue;
+        try {
+            if (!report)
+                report = createReport(message, ReportKind::Any);
+            if (!report->isEmpty())
+                m_listeners[i]->committed(report);
+        }
+        catch (...) {
+            // the changes are final, whatever a listener thinks of them
+        }
+    }
+}
+
+void TransactionImpl::runDeferredInvocations()
+{
+    if (!m_deferredInvocations)
+        return;
+    for (std::size_t i = 0; i < m_deferredInvocations->size(); ++i) {
+        try {
+            (*m_deferredInvocations)[i]->invoke();
+        }
+        catch (...) {
+            // the next one runs all the same
+        }
+    }
+}
+
+void TransactionImpl::prepareRollBackReport()
+{
+    try {
+        m_rollBackReport = createReport(boost::none, ReportKind::Notify);
+    }
+    catch (...) {
+        m_rollBackReport = nullptr; // the rollback matters more than its report
+    }
+}
+
+void TransactionImpl::notifyRolledBack()
+{
+    if (!m_rollBackReport || !anyListener(ReportKind::Notify))
+        return;
+    Notifying const notifying(*this);
+    for (std::size_t i = 0; i < m_listeners.size(); ++i) {
+        if (!m_listeners[i] || !m_listeners[i]->wantsNotify())
+            continue;
+        try {
+            m_listeners[i]->rolledBack(has(DEEP), m_rollBackReport);
+        }
+        catch (...) {
+            // the changes are gone, whatever a listener thinks of it
+        }
+    }
+}
+
+void TransactionImpl::checkInvariants()
+{
+    if (m_model && m_model->getValidity() == ElementImpl::ElementValidity::Valid)
+        m_model->checkInvariantsAtEnd();
+}
+
+// ---------------------------------------------------------------------------- undo
+
+void TransactionImpl::pinElements()
+{
+    for (auto const& [id, record] : m_changes->byUuid) {
+        ModelElement::Impl* const element = record->isDestroyed()
+                                                ? m_destroyedElements->at(id).getImpl()
+                                                : m_model->findElementImpl(id);
+        m_pins.emplace_back(element);
+    }
+}
+
+TransactionResult TransactionImpl::undo()
+{
+    if (!has(HAS_CHANGES))
+        return TransactionResult::NotCompleted;
+    if (!has(DEEP))
+        return TransactionResult::NotRevertible;
+    pinElements();
+    set(ROLLED_BACK);
+    auto const undoCreation = [this](ModelElement const& element) {
+        element->basicDisassociateAll();
+        m_model->remove(element.getImpl());
+        element->invalidate();
+    };
+    for (auto const& [element, record] : m_changes->newcomers) {
+        if (!record->isDestroyed())
+            undoCreation(element);
+    }
+    std::size_t next = 0;
+    for (auto const& [id, record] : m_changes->byUuid) {
+        ModelElement const& element = m_pins[next++];
+        if (record->isDestroyed() && !record->isCreated())
+            m_model->resurrectElement(element.getImpl());
+    }
+    next = 0;
+    for (auto const& [id, record] : m_changes->byUuid) {
+        ModelElement const& element = m_pins[next++];
+        if (!record->isCreated())
+            element->copyStateFromStorage(static_cast<ModelElement::Impl::Storage*>(record.get()));
+        else if (!record->isDestroyed() && element)
+            undoCreation(element);
+    }
+    m_pins.clear();
+    return TransactionResult::RolledBack;
+}
+} // namespace tarn::kiln::internal

@@ -1,0 +1,144 @@
+/// \file
+/// The transaction of one model.
+#pragma once
+#include "tarnkiln/kernel/AbstractTransactionImpl.h"
+#include "tarnkiln/kernel/ChangesHolder.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/ReportData.h"
+
+#include <unordered_map>
+#include <vector>
+
+namespace tarn::kiln::internal {
+
+/// Records what changes in one model, tells the listeners, and takes the changes back.
+///
+/// A model has at most one. It is ready to be committed when every handle has committed, that is,
+/// when the count of its handles equals that of the attempts:
+///
+/// | Handle | handles | attempts |
+/// |---|---|---|
+/// | nested, open | 1 | 0 |
+/// | nested, committed and held | 1 | 1 |
+/// | nested, committed and dropped | 0 | 0 |
+/// | nested, dropped uncommitted | 0 | 0, and it can only be rolled back |
+/// | of a member that nobody touched | 0 | 0 |
+class TransactionImpl final : public AbstractTransactionImpl
+{
+public:
+    TransactionImpl(Model const& model, TransactionGroup* group,
+                    meta::TransactionOrigin const& origin, bool deep);
+    ~TransactionImpl() override;
+
+    // AbstractTransactionImpl
+    TransactionResult commit(boost::optional<Value> const& message) override;
+    TransactionResult rollBack() override;
+    bool isRollBackOnly() const override { return has(ROLL_BACK_ONLY); }
+    void addFirstChangeCallback(std::function<void()> const& callback) override;
+    void eventEmitted(std::unique_ptr<meta::AbstractDeferredInvocation> invocation) override;
+    void removeRef() override;
+
+    /// \name Recording
+    /// Each fails with `ChangesProhibited` during validation and rollback, unless nothing is
+    /// recorded at all.
+    /// @{
+    virtual void elementCreated(ModelElement::Impl* element);
+    virtual void elementDestroying(ModelElement::Impl* element);
+    virtual void allElementsDestroying();
+    virtual void elementModifying(ModelElement::Impl* element, unsigned long index);
+    /// Keeps the present link to the container, in a deep transaction.
+    void containerChanging(ModelElement::Impl* element);
+    /// @}
+
+    /// Which listeners a report is built for.
+    enum class ReportKind
+    {
+        Prepare = 0,
+        Validate = 1,
+        Notify = 2,
+        Any = 3 ///< Built whoever listens.
+    };
+    /// Null if there is nothing to tell, or nobody of that kind to tell it.
+    virtual std::shared_ptr<ReportData> createReport(boost::optional<Value> const& message,
+                                                     ReportKind kind);
+
+    /// \name Steps of the group
+    /// @{
+    bool isReady() const { return m_handleCount == m_commitCount; }
+    void prepare(boost::optional<Value> const& message);
+    void prohibitChanges() { set(CHANGES_PROHIBITED); }
+    bool validate(boost::optional<Value> const& message);
+    void end();
+    void notifyCommitted(boost::optional<Value> const& message);
+    void runDeferredInvocations();
+    void prepareRollBackReport();
+    TransactionResult undo();
+    void notifyRolledBack();
+    void markRollBackOnly();
+    void checkInvariants();
+    /// @}
+
+    /// \name Steps of nested transactions
+    /// @{
+    TransactionResult nestedFailed();
+    void forgetCommit() { --m_commitCount; }
+    /// @}
+
+    /// Ends without a commit, when the model is being destroyed.
+    void abandon();
+    void removeListener(ListenerHolderBase* holder);
+
+    bool hasEnded() const { return has(ENDED); }
+    bool isDeep() const { return has(DEEP); }
+    bool isRolledBack() const { return has(ROLLED_BACK); }
+    TransactionGroup* getGroup() const { return m_group; }
+    TransactionImpl* getPreviousNotifying() const { return m_previousNotifying; }
+
+private:
+    class Notifying;
+
+    enum Flag : unsigned
+    {
+        DESTROY_ALL = 1,        ///< No element may be created any more.
+        ROLLED_BACK = 2,        ///< Undo has begun: recording is silently ignored.
+        CHANGES_PROHIBITED = 4, ///< Validation or rollback: recording fails.
+        HAS_CHANGES = 8,        ///< Something was recorded.
+        REPORT_STALE = 16,      ///< Something was since the last report for preparing listeners.
+        ROLL_BACK_ONLY = 32,
+        ENDED = 64,
+        FREEZE_ON_NOTIFY = 128,
+        DEEP = 256,
+        REVERT_UNCHANGED = 512
+    };
+    bool has(Flag flag) const { return (m_flags & flag) != 0; }
+    void set(Flag flag) { m_flags |= flag; }
+    void clear(Flag flag) { m_flags &= ~static_cast<unsigned>(flag); }
+
+    bool startRecording();
+    void announceFirstChange();
+    void finishRecording() { m_flags |= HAS_CHANGES | REPORT_STALE; }
+    ChangesHolder makeRecord(ModelElement::Impl const& element) const;
+    ModelElement::Impl::Changes& recordOf(ModelElement::Impl* element);
+    ModelElement::Impl::Changes* findRecord(ModelElement::Impl const* element) const;
+    ModelElement::Impl::Changes& addRecord(ModelElement::Impl* element);
+    bool isDestroyedPredecessor(ModelElement::Impl const* element) const;
+    bool hasNews() const;
+    bool anyListener(ReportKind kind) const;
+    void pinElements();
+
+    Model m_model;
+    TransactionGroup* m_group; ///< Null when the transaction stands alone, or has ended.
+    std::function<void()> m_firstChangeCallback;
+    bool m_inFirstChangeCallback = false;
+    std::shared_ptr<ChangeRecords> m_changes;
+    std::vector<ListenerHolderBase*> m_listeners; ///< As at the beginning; null once removed.
+    /// Keeps destroyed elements, so that they can come back; made when first needed.
+    std::unique_ptr<std::unordered_map<UUID, ModelElement, UUIDHasher>> m_destroyedElements;
+    std::shared_ptr<ReportData::DeferredInvocations> m_deferredInvocations;
+    std::shared_ptr<ReportData> m_rollBackReport;
+    std::vector<ModelElement> m_pins; ///< Room is kept for an element of each record.
+    unsigned m_flags;
+    std::uint32_t m_commitCount = 0;
+    TransactionImpl* m_previousNotifying = nullptr;
+};
+} // namespace tarn::kiln::internal
