@@ -5,6 +5,7 @@
 #include "tarnkiln/kernel/Feature.h"
 #include "tarnkiln/kernel/Model.h"
 #include "tarnkiln/kernel/ModelElement.h"
+#include "tarnkiln/kernel/ProxyId.h"
 #include "tarnkiln/kernel/ReflectionPrivateTag.h"
 
 #include <boost/optional.hpp>
