@@ -104,8 +104,8 @@ TransactionResult TransactionGroup::finishCommit(boost::optional<Value> const& m
 bool TransactionGroup::prepareAll(boost::optional<Value> const& message)
 {
     try {
-        for (std::size_t i = 0; i < m_members.size(); ++i)
-            m_members[i]->prepare(message);
+        for (std::size_t i = 0; i < m_pins.size(); ++i)
+            memberOf(m_pins[i]).prepare(message);
     }
     catch (...) {
         return false;
@@ -115,8 +115,8 @@ bool TransactionGroup::prepareAll(boost::optional<Value> const& message)
 
 bool TransactionGroup::validateAll(boost::optional<Value> const& message)
 {
-    for (std::size_t i = 0; i < m_members.size(); ++i) {
-        if (!m_members[i]->validate(message))
+    for (std::size_t i = 0; i < m_pins.size(); ++i) {
+        if (!memberOf(m_pins[i]).validate(message))
             return false;
     }
     return true;

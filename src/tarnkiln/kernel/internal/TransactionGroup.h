@@ -55,7 +55,7 @@ private:
 
     ModelConstellation::Impl* m_constellation;
     Members m_members; ///< Not owned; those without handles are kept by the group's being open.
-    Pins m_pins;       ///< Of the members, while the group is ending.
+    Pins m_pins;       ///< While the group is ending: of all members, those that left meanwhile too.
     bool m_deep;
     bool m_rollBackOnly = false;
     bool m_ending = false; ///< A commit or rollback is running.

@@ -288,6 +288,7 @@ void TransactionImpl::abandon()
 {
     Transaction const keep(this);
     std::fill(m_listeners.begin(), m_listeners.end(), nullptr);
+    m_deferredInvocations.reset();
     set(ENDED);
     m_model->transactionEnded();
     if (TransactionGroup* const group = std::exchange(m_group, nullptr))
@@ -480,9 +481,11 @@ TransactionResult TransactionImpl::undo()
     next = 0;
     for (auto const& [id, record] : m_changes->byUuid) {
         ModelElement const& element = m_pins[next++];
+        if (!element.getImpl())
+            continue;
         if (!record->isCreated())
             element->copyStateFromStorage(static_cast<ModelElement::Impl::Storage*>(record.get()));
-        else if (!record->isDestroyed() && element)
+        else if (!record->isDestroyed())
             undoCreation(element);
     }
     m_pins.clear();
