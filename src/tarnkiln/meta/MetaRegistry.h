@@ -1,0 +1,211 @@
+/// \file
+/// The process-wide directory of all metamodels.
+///
+///     meta::MetaRegistry& registry = meta::MetaRegistry::getInstance();
+///     meta::Class book = registry.getClass(u"library.Book");
+///
+///     {
+///         meta::MetaRegistry::LockedModel locked(registry); // changes need it, look-ups do not
+///         Transaction transaction = locked.getModel()->beginTransaction(/*revertible=*/true);
+///         ...
+///         transaction.commit();
+///     }
+#pragma once
+#include "tarnkiln/Export.h"
+#include "tarnkiln/collections/Fwd.h"
+#include "tarnkiln/kernel/Freezer.h"
+#include "tarnkiln/kernel/Model.h"
+#include "tarnkiln/kernel/ModelElement.h"
+#include "tarnkiln/meta/Fwd.h"
+#include "tarnkiln/meta/Package.h"
+#include "tarnkiln/meta/Type.h"
+#include "tarnkiln/meta/ValueOwnershipConverter.h"
+
+#include <map>
+#include <memory>
+#include <mutex>
+#include <unordered_map>
+#include <utility>
+
+namespace tarn::kiln::internal {
+class UnregisterDestroyedTypes;
+}
+
+namespace tarn::kiln::meta {
+
+/// Owns the model in which every metamodel lives, and finds types by name, packages by URI and the
+/// current version of a family of packages.
+///
+/// The registry model is frozen except while a `LockedModel` lives; its elements may therefore be
+/// read on any thread without a lock.
+///
+/// Threads: may be used from all threads. Functions that say "the caller holds a `LockedModel`"
+/// take no lock of their own.
+class TARNKILN_EXPORT MetaRegistry
+{
+public:
+    class LockedModel;
+    class LockedConstModel;
+
+    /// Makes the collection that `owner` keeps as its value of `property`; the caller owns it. An
+    /// empty owner asks for a snapshot.
+    using CollectionInstantiator = AbstractOwnedCollection* (*)(ModelElement const& owner,
+                                                                Property const& property);
+    /// Makes a builder of elements of a class, in `model`.
+    using BuilderInstantiator = std::unique_ptr<ModelElement::Builder> (*)(Model const& model);
+
+    /// The URI of the registry model: "registry@registry://metaRegistry/model".
+    static ustring const MetaRegistryModelID;
+
+    MetaRegistry(MetaRegistry const&) = delete;
+    MetaRegistry& operator=(MetaRegistry const&) = delete;
+
+    /// The one registry, made at the first call, by whichever thread comes first. It lives to the
+    /// end of the process.
+    static MetaRegistry& getInstance();
+
+    /// The model in which all metamodels live.
+    Model const& getModel() const { return m_model; }
+
+    /// \name Types
+    /// @{
+    /// Enters a type under `name`; either function may be null.
+    ///
+    /// An entry whose type is dead gives way to the new one. Makes the collections of the type's
+    /// attributes, operations or literals, so that other threads need not.
+    /// \throws tarnkiln::messages::DuplicateTypeInRegistry  (name) if another type has the name.
+    void registerType(Type const& type, ustring const& name, CollectionInstantiator collection,
+                      BuilderInstantiator builder);
+    /// The same under the type's qualified name.
+    void registerType(Type const& type, CollectionInstantiator collection,
+                      BuilderInstantiator builder);
+    void registerType(Type const& type, BuilderInstantiator builder);
+    /// Takes the entry out if it is that of `type`. The caller holds a `LockedModel`.
+    void unregisterType(Type const& type, ustring const& name);
+    /// Replaces what makes collections for `type`, which must be registered under its qualified
+    /// name.
+    void updateCollectionInstantiator(Type const& type, CollectionInstantiator collection);
+
+    /// The type of that name; empty if there is none. Where no type has these names, "meta.Model"
+    /// and "meta.ModelElement" still stand for the classes of `Model` and `ModelElement`.
+    Type getType(ustring const& name) const;
+    /// The same, empty also for a type of another kind.
+    Class getClass(ustring const& name) const;
+    PrimitiveType getPrimitiveType(ustring const& name) const;
+
+    /// A builder of elements of `metaClass` in `model`; null if that class, and no other of its
+    /// name, is not registered with a function for it.
+    std::unique_ptr<ModelElement::Builder> instantiateBuilder(Class const& metaClass,
+                                                              Model const& model) const;
+    /// A new collection for the many-valued property of `owner`, or a snapshot if that is empty;
+    /// the caller owns it. Null if the property's type, and no other of its name, is not
+    /// registered with a function for it. Data types that are not generated have no collections.
+    AbstractOwnedCollection* instantiateDynamicCollection(ModelElement const& owner,
+                                                          Property const& property) const;
+    /// @}
+
+    /// \name Packages and families
+    /// @{
+    /// Enters a package under its URI, in place of any other, and makes it the current one of its
+    /// family, whatever its version. The caller holds a `LockedModel`.
+    void registerRootPackage(Package const& package);
+    /// Takes out the package of that URI, and the current package of its family, whichever that
+    /// is. The caller holds a `LockedModel`.
+    void unregisterRootPackage(ustring const& uri);
+    /// The package of exactly that URI; empty if there is none.
+    Package getRootPackage(ustring const& uri) const;
+    /// The same; if there is none and `load` is true, its family is loaded first. Must not be
+    /// called with `load` under a lock of the registry.
+    Package getRootPackage(ustring const& uri, bool load);
+    /// The package of the family that was registered last, loaded if there is none; empty if there
+    /// is still none. Must not be called under a lock of the registry.
+    Package getPackageForFamily(ustring const& family);
+    /// Whether `uri` has the version of the current package of its family, which may be loaded for
+    /// it. False if there is no such family.
+    bool isVersionCurrentForFamily(ustring const& uri);
+
+    /// The version and the family that a package URI names, in this order; both empty for a text
+    /// that is no such URI.
+    ///
+    /// A package URI is `SchemaBase`, a family, "/", a version, and possibly "/" and the qualified
+    /// name of a package. Versions are only compared for equality.
+    static std::pair<ustring, ustring> parseUri(ustring const& uri);
+    /// Whether `uri` has a family and a version, both not empty.
+    static bool isValidUri(ustring const& uri);
+    /// The URI of a root package, from the parts in the order in which `parseUri` gives them.
+    static ustring composeUri(ustring const& version, ustring const& family);
+    /// @}
+
+    /// \name Ownership of values
+    /// @{
+    /// Sets the converter of a type, once: an earlier one stays. Must come before values of the
+    /// type exist.
+    void registerOwnershipConverter(Type const& type,
+                                    std::unique_ptr<ValueOwnershipConverter> converter);
+    void unregisterOwnershipConverter(Type const& type);
+    /// The copy of `value` that an element may keep. Takes no lock.
+    Value convertValueForOwnership(Value const& value);
+    /// Lets go of a value that `convertValueForOwnership` gave. Takes no lock.
+    void releaseOwnedValue(Value const& value);
+    /// @}
+
+private:
+    struct TypeEntry
+    {
+        BuilderInstantiator builderInstantiator;
+        CollectionInstantiator collectionInstantiator;
+        Type type;
+    };
+
+    MetaRegistry();
+    ~MetaRegistry();
+
+    void initialize();
+    TypeEntry const* findEntry(Type const& type) const;
+    ValueOwnershipConverter* findConverter(Value const& value) const;
+
+    Model m_model;
+    std::map<ustring, TypeEntry> m_types;  ///< By qualified name.
+    Model::Freezer m_freezer;
+    std::map<ustring, Package> m_rootPackages;  ///< By URI; all versions.
+    std::map<ustring, Package> m_families;      ///< The package registered last for each.
+    std::unordered_map<Type, std::unique_ptr<ValueOwnershipConverter>, std::hash<ModelElement>>
+        m_converters;
+    mutable std::recursive_mutex m_mutex;  ///< Guards all of the above.
+    bool m_initialised = false;
+    std::unique_ptr<internal::UnregisterDestroyedTypes> m_unregisterDestroyedTypes;
+};
+
+/// Holds the registry's lock and lets its model be changed, for as long as it lives. Locks nest.
+class TARNKILN_EXPORT MetaRegistry::LockedModel
+{
+public:
+    explicit LockedModel(MetaRegistry& registry);
+    LockedModel(LockedModel const&) = delete;
+    LockedModel& operator=(LockedModel const&) = delete;
+    ~LockedModel();
+
+    Model const& getModel() const { return m_model; }
+
+private:
+    std::lock_guard<std::recursive_mutex> m_lock;
+    Model m_model;
+    Model::Thawer m_thawer;
+};
+
+/// Holds the registry's lock for as long as it lives; the model stays frozen.
+class TARNKILN_EXPORT MetaRegistry::LockedConstModel
+{
+public:
+    explicit LockedConstModel(MetaRegistry const& registry);
+    LockedConstModel(LockedConstModel const&) = delete;
+    LockedConstModel& operator=(LockedConstModel const&) = delete;
+    ~LockedConstModel();
+
+    Model const& getModel() const { return m_model; }
+
+private:
+    std::lock_guard<std::recursive_mutex> m_lock;
+    Model m_model;
+};
+}  // namespace tarn::kiln::meta

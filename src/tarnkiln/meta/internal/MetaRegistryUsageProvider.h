@@ -1,0 +1,16 @@
+/// \file
+/// Which metamodels the registry model uses.
+#pragma once
+#include "tarnkiln/meta/DataModelUsageProvider.h"
+
+namespace tarn::kiln::internal {
+
+/// Says that the registry model is described by the metamodel of metamodels, whatever it holds.
+///
+/// That metamodel is not built yet: the answer is that no package is used.
+class MetaRegistryUsageProvider final : public meta::DataModelUsageProvider
+{
+public:
+    std::vector<meta::Package> getUsedPackages() const override;
+};
+}  // namespace tarn::kiln::internal
