@@ -2,7 +2,7 @@
 /// What a transaction remembers about one element.
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
-#include "tarnkiln/kernel/internal/SlotSet.h"
+#include "tarnkiln/support/SlotSet.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/Property.h"
 

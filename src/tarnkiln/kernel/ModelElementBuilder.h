@@ -3,7 +3,7 @@
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
-#include "tarnkiln/kernel/internal/SlotSet.h"
+#include "tarnkiln/support/SlotSet.h"
 
 #include <map>
 #include <memory>

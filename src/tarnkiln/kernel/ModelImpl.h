@@ -6,8 +6,8 @@
 #include "tarnkiln/kernel/ModelConstellation.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
-#include "tarnkiln/kernel/internal/ElementRegistry.h"
-#include "tarnkiln/kernel/internal/TopLevelElements.h"
+#include "tarnkiln/support/ElementRegistry.h"
+#include "tarnkiln/support/TopLevelElements.h"
 #include "tarnkiln/meta/TransactionOrigin.h"
 
 #include <boost/optional.hpp>
