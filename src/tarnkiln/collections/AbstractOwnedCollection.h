@@ -1,0 +1,92 @@
+/// \file
+/// The frame of every collection that is the value of a many-valued property.
+#pragma once
+#include "tarnkiln/Export.h"
+#include "tarnkiln/collections/Fwd.h"
+#include "tarnkiln/kernel/Feature.h"
+#include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/meta/Fwd.h"
+#include "tarnkiln/meta/Property.h"
+
+namespace tarn::kiln {
+
+/// The values of one many-valued property of one element, or a snapshot of them.
+///
+/// The element owns its collection, at one address for as long as it lives, and the collection
+/// announces each change to the element before it makes it. It keeps no log: the record of a deep
+/// transaction takes a snapshot when a property changes for the first time.
+///
+/// | State | Owner | Behaviour |
+/// |---|---|---|
+/// | attached | the element | changes are announced, the other end and the container kept in step |
+/// | snapshot | null | changes are silent and touch nothing else; proxies stay as they are |
+///
+/// Each public change tests its arguments, opens an `Operation`, calls `modifying()`, changes the
+/// contents, keeps the other end in step, and commits, in that order. A change of a collection
+/// whose element is destroyed does nothing.
+///
+/// Iterators are positions in the storage and do not survive a change.
+///
+/// Threads: as the element's model.
+class TARNKILN_EXPORT AbstractOwnedCollection
+{
+public:
+    class Operation;
+
+    AbstractOwnedCollection(AbstractOwnedCollection const&) = delete;
+    AbstractOwnedCollection& operator=(AbstractOwnedCollection const&) = delete;
+    virtual ~AbstractOwnedCollection();
+
+    /// The type of the entries; empty while its metamodel is not built.
+    virtual meta::Type getCollectionType() const = 0;
+    /// Replaces the contents by those of `other`, which must be of the same class.
+    virtual void copyContents(AbstractOwnedCollection const& other) = 0;
+
+    /// Empty for a snapshot without one and while the metamodel is not built.
+    meta::Property const& getCollectionProperty() const;
+    Feature const& getCollectionFeature() const { return m_feature; }
+    /// Null for a snapshot.
+    ModelElement::Impl* getOwner() const { return m_owner; }
+
+    /// Announces a change to the owner, before it is made. Silent for a snapshot and without a
+    /// live property.
+    ///
+    /// \throws tarnkiln::messages::ModelFrozen, NoOpenTransaction, ChangesProhibited  if the model
+    ///     may not be changed now.
+    void modifying();
+
+protected:
+    /// \param owner    null makes a snapshot.
+    /// \param feature  a property or a slot; a property is kept alive.
+    AbstractOwnedCollection(ModelElement::Impl* owner, Feature const& feature);
+
+    /// Whether the owner is destroyed, so that public changes do nothing.
+    bool isOwnerDead() const { return m_owner && !m_owner->isLive(); }
+
+    ModelElement::Impl* const m_owner;
+
+private:
+    Feature const m_feature;
+    meta::Property const m_property;  ///< Empty if the property is given by a slot.
+};
+
+/// The bracket around one change of a collection: a transaction if none is open, else nothing.
+///
+/// An `Operation` that is not committed takes the change back if its own transaction is deep.
+class TARNKILN_EXPORT AbstractOwnedCollection::Operation
+{
+public:
+    explicit Operation(AbstractOwnedCollection& collection);
+    Operation(Operation const&) = delete;
+    Operation& operator=(Operation const&) = delete;
+    ~Operation();
+
+    /// Commits what this bracket opened; `NotCompleted` if it opened nothing. Raises nothing: a
+    /// listener that refuses a change makes it `RolledBack` or `NotRevertible`.
+    TransactionResult commit();
+
+private:
+    Transaction m_transaction;  ///< Empty unless opened here.
+};
+}  // namespace tarn::kiln

@@ -1,0 +1,6 @@
+#include "tarnkiln/collections/GenericMultimapInterface.h"
+
+namespace tarn::kiln {
+
+GenericMultimapInterface::~GenericMultimapInterface() = default;
+}  // namespace tarn::kiln

@@ -1,0 +1,46 @@
+/// \file
+/// How the keys of keyed collections travel in a `Value`.
+#pragma once
+#include "tarnkiln/Export.h"
+#include "tarnkiln/collections/TotalLess.h"
+#include "tarnkiln/kernel/Types.h"
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/meta/Property.h"
+#include "tarnkiln/meta/Type.h"
+
+namespace tarn::kiln::internal {
+
+/// Keys of the type `K` as values. Defined for the integers, `double`, `ustring`, `string` and
+/// `UUID`; a further key type needs a specialisation.
+template <class K> struct TARNKILN_EXPORT KeyTraits
+{
+    /// An enumeration value is a key of type `unsigned long`.
+    ///
+    /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  if `value` is of another type.
+    static K fromValue(Value const& value);
+    /// \param keyType  the type of the qualifying property. The values of an enumeration are its
+    ///     literals; those of a class are UUIDs; without a type the value has the type of `K`.
+    static Value toValue(K const& key, meta::Type const& keyType);
+    /// The type of the keys where the qualifying property is not known: `String` for a `ustring`,
+    /// empty for the others.
+    static meta::Type fallbackType();
+};
+
+/// The type of the property that qualifies `collectionProperty`; empty if that is not known.
+TARNKILN_EXPORT meta::Type qualifierTypeOf(meta::Property const& collectionProperty);
+
+#define TARNKILN_KEY_TRAITS(K) extern template struct KeyTraits<K>
+TARNKILN_KEY_TRAITS(int);
+TARNKILN_KEY_TRAITS(signed char);
+TARNKILN_KEY_TRAITS(short);
+TARNKILN_KEY_TRAITS(long);
+TARNKILN_KEY_TRAITS(unsigned int);
+TARNKILN_KEY_TRAITS(unsigned char);
+TARNKILN_KEY_TRAITS(unsigned short);
+TARNKILN_KEY_TRAITS(unsigned long);
+TARNKILN_KEY_TRAITS(double);
+TARNKILN_KEY_TRAITS(ustring);
+TARNKILN_KEY_TRAITS(string);
+TARNKILN_KEY_TRAITS(UUID);
+#undef TARNKILN_KEY_TRAITS
+}  // namespace tarn::kiln::internal

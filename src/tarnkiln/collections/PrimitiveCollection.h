@@ -1,0 +1,70 @@
+/// \file
+/// What sequences and sets of plain values share.
+#pragma once
+#include "tarnkiln/collections/AbstractPrimitiveCollection.h"
+#include "tarnkiln/collections/PrimitiveTraits.h"
+
+#include <utility>
+#include <vector>
+
+namespace tarn::kiln {
+
+/// Holds the container.
+///
+/// \tparam T  a type with `internal::PrimitiveTraits`.
+template <class T, class Container>
+class TARNKILN_EXPORT PrimitiveCollection : public AbstractPrimitiveCollection
+{
+public:
+    using value_type = T;
+
+    bool empty() const { return m_entries.empty(); }
+    Container const& getEntries() const { return m_entries; }
+
+    // AbstractOwnedCollection
+    meta::Type getCollectionType() const override { return internal::PrimitiveTraits<T>::type(); }
+    void copyContents(AbstractOwnedCollection const& other) override;
+    // AbstractPrimitiveCollection
+    void clear() override;
+    std::size_t size() const override { return m_entries.size(); }
+    std::vector<Value> getAllValues() const override;
+
+protected:
+    using AbstractPrimitiveCollection::AbstractPrimitiveCollection;
+
+    Container m_entries;
+};
+
+template <class T, class Container>
+void PrimitiveCollection<T, Container>::copyContents(AbstractOwnedCollection const& other)
+{
+    Container copy = static_cast<PrimitiveCollection const&>(other).m_entries;
+    Operation operation(*this);
+    modifying();
+    m_entries.swap(copy);
+    operation.commit();
+}
+
+template <class T, class Container> void PrimitiveCollection<T, Container>::clear()
+{
+    if (isOwnerDead())
+        return;
+    Operation operation(*this);
+    modifying();
+    m_entries.clear();
+    operation.commit();
+}
+
+template <class T, class Container>
+std::vector<Value> PrimitiveCollection<T, Container>::getAllValues() const
+{
+    meta::Type const type = getCollectionType();
+    std::vector<Value> result;
+    if (!type)
+        return result;
+    result.reserve(m_entries.size());
+    for (T const& entry : m_entries)
+        result.push_back(internal::PrimitiveTraits<T>::toValue(entry, type));
+    return result;
+}
+}  // namespace tarn::kiln
