@@ -1,0 +1,27 @@
+# Target `coverage-report`: runs the tests and prints the coverage of our own sources.
+# Not counted: the branches that only exceptions take, and lines that hold an assertion.
+
+find_program(TARNKILN_GCOVR gcovr)
+mark_as_advanced(TARNKILN_GCOVR)
+if(TARNKILN_GCOVR)
+    add_custom_target(coverage-report
+        COMMAND ${CMAKE_CTEST_COMMAND} --output-on-failure
+        COMMAND ${TARNKILN_GCOVR}
+            --root ${PROJECT_SOURCE_DIR}
+            --filter ${PROJECT_SOURCE_DIR}/src/
+            --filter ${PROJECT_SOURCE_DIR}/generated/
+            --filter ${PROJECT_SOURCE_DIR}/platform/
+            --exclude-throw-branches
+            --exclude-unreachable-branches
+            --exclude-lines-by-pattern ".*TARNKILN_ASSERT\\(.*"
+            --txt --txt-metric branch
+            --print-summary
+            ${PROJECT_BINARY_DIR}
+        WORKING_DIRECTORY ${PROJECT_BINARY_DIR}
+        USES_TERMINAL
+        VERBATIM)
+else()
+    add_custom_target(coverage-report
+        COMMAND ${CMAKE_COMMAND} -E echo "coverage-report needs gcovr"
+        COMMAND ${CMAKE_COMMAND} -E false)
+endif()

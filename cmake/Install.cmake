@@ -1,0 +1,28 @@
+# Installs the library as the package `tarnkiln`, for find_package(tarnkiln) by other projects.
+# The headers come from the file sets of the targets; what lies in internal/ is in none of them.
+
+include(CMakePackageConfigHelpers)
+
+set(TARNKILN_PACKAGE_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/tarnkiln)
+set(installed tarnkiln)
+if(TARGET tarnkiln_except)
+    list(APPEND installed tarnkiln_except)
+endif()
+
+set_target_properties(${installed} PROPERTIES INSTALL_RPATH "$ORIGIN")
+install(TARGETS ${installed}
+    EXPORT tarnkilnTargets
+    LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
+    INCLUDES DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}
+    FILE_SET HEADERS DESTINATION ${CMAKE_INSTALL_INCLUDEDIR})
+install(EXPORT tarnkilnTargets NAMESPACE tarnkiln:: DESTINATION ${TARNKILN_PACKAGE_DIR})
+
+configure_package_config_file(
+    ${CMAKE_CURRENT_LIST_DIR}/tarnkilnConfig.cmake.in ${PROJECT_BINARY_DIR}/tarnkilnConfig.cmake
+    INSTALL_DESTINATION ${TARNKILN_PACKAGE_DIR})
+write_basic_package_version_file(${PROJECT_BINARY_DIR}/tarnkilnConfigVersion.cmake
+    COMPATIBILITY SameMinorVersion)
+install(FILES
+    ${PROJECT_BINARY_DIR}/tarnkilnConfig.cmake
+    ${PROJECT_BINARY_DIR}/tarnkilnConfigVersion.cmake
+    DESTINATION ${TARNKILN_PACKAGE_DIR})
