@@ -4,13 +4,10 @@
 include(CMakePackageConfigHelpers)
 
 set(TARNKILN_PACKAGE_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/tarnkiln)
-set(installed tarnkiln)
-if(TARGET tarnkiln_except)
-    list(APPEND installed tarnkiln_except)
-endif()
+set(TARNKILN_INSTALLED_TARGETS tarnkiln tarnkiln_except)
 
-set_target_properties(${installed} PROPERTIES INSTALL_RPATH "$ORIGIN")
-install(TARGETS ${installed}
+set_target_properties(${TARNKILN_INSTALLED_TARGETS} PROPERTIES INSTALL_RPATH "$ORIGIN")
+install(TARGETS ${TARNKILN_INSTALLED_TARGETS}
     EXPORT tarnkilnTargets
     LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
     INCLUDES DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}

@@ -1,14 +1,11 @@
 #!/usr/bin/env python3
 """Fails if a shared library exports a symbol outside our namespaces or of an internal class.
 
-Usage: exportedSymbols.py LIBRARY shipped|internals
-Builds that export internals for tests are skipped: exit status 77.
+Usage: exportedSymbols.py LIBRARY
 """
 import re
 import subprocess
 import sys
-
-SKIPPED = 77
 
 # A mangled name in tarn::kiln or tarnkiln: a function or object, type information, a table, a thunk,
 # or a guard or local of such a function.
@@ -30,10 +27,7 @@ def is_allowed(mangled, readable):
 
 
 def main():
-    library, kind = sys.argv[1:]
-    if kind == "internals":
-        print("skipped: this build exports internal classes for the tests")
-        return SKIPPED
+    (library,) = sys.argv[1:]
     symbols = exported(library)
     if not symbols:
         print("the library exports nothing")
