@@ -1,0 +1,76 @@
+/// \file
+/// Which C++ types a `Value` can hold and be read as.
+#pragma once
+#include "tarnkiln/Export.h"
+#include "tarnkiln/collections/Fwd.h"
+#include "tarnkiln/kernel/Fwd.h"
+#include "tarnkiln/kernel/ModelElement.h"
+#include "tarnkiln/kernel/Types.h"
+#include "tarnkiln/meta/Fwd.h"
+
+#include <boost/optional/optional_fwd.hpp>
+
+#include <concepts>
+#include <set>
+#include <vector>
+
+namespace boost::posix_time {
+class ptime;
+}
+
+namespace tarn::kiln::internal {
+
+template <class T, class... Types>
+concept OneOf = (std::same_as<T, Types> || ...);
+
+/// Plain values.
+template <class T>
+concept Scalar =
+    OneOf<T, bool, signed char, unsigned char, short, unsigned short, int, unsigned int, long,
+          unsigned long, double, ustring, string, UUID, boost::posix_time::ptime,
+          meta::TransactionOrigin, meta::ExtensionPrototype, meta::Language>;
+
+/// Handles of elements; `T` must be a complete type.
+template <class T>
+concept ElementReference = std::derived_from<T, ModelElement>;
+
+/// The containers that a value can own. Those of handles are ordered by UUID.
+template <class T> inline constexpr bool isContainer = false;
+template <class T>
+inline constexpr bool isContainer<std::vector<T>> = Scalar<T> || OneOf<T, Model, meta::Operation>;
+template <class T>
+inline constexpr bool isContainer<std::set<T>> = Scalar<T> || OneOf<T, Model, meta::Operation>;
+
+template <class T> inline constexpr bool isOptional = false;
+template <class T>
+inline constexpr bool isOptional<boost::optional<T>> = Scalar<T> || OneOf<T, Model>;
+
+/// What a value can hold besides elements.
+template <class T>
+concept PlainPayload = Scalar<T> || OneOf<T, Model> || isOptional<T> || isContainer<T>;
+
+/// What a value can be made from.
+template <class T>
+concept Payload = PlainPayload<T> || ElementReference<T>;
+
+/// Collections that elements own.
+template <class T>
+concept CollectionReference =
+    OneOf<T, ReferenceCollection&, AbstractPrimitiveCollection&, StringToStringMap&>;
+
+/// How `Value` keeps and reads a `T`; defined and instantiated in `ValueAccess.cpp`.
+template <class T> struct TARNKILN_EXPORT ValueAccess
+{
+    /// Gives a value that holds nothing yet the payload and the shape.
+    static void store(Value& value, T const& payload);
+    static void check(Value const& value);
+    static T read(Value const& value);
+};
+
+/// The same for collections, which a value shares; in `ValueCollections.cpp`.
+template <class Collection> struct TARNKILN_EXPORT ValueAccess<Collection&>
+{
+    static void check(Value const& value);
+    static Collection& read(Value const& value);
+};
+}  // namespace tarn::kiln::internal
