@@ -7,11 +7,12 @@ import sys
 
 import jinja2
 
+import check
 import model
 
 ROOT = pathlib.Path(__file__).resolve().parent
-PER_CLASS = {"Handle.h": "{name}.h"}
-PER_PACKAGE = {"Catalogue.h": "Catalogue.h"}
+PER_CLASS = {"Handle.h": "{name}.h", "Impl.h": "{name}Impl.h", "Class.cpp": "{name}.cpp"}
+PER_PACKAGE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt"}
 
 
 def environment():
@@ -31,7 +32,8 @@ def render(package, command):
             text = env.get_template(template + ".jinja").render(c=cls, p=package, origin=origin)
             files[pattern.format(name=cls.name)] = text
     for template, name in PER_PACKAGE.items():
-        files[name] = env.get_template(template + ".jinja").render(p=package, origin=origin)
+        files[name] = env.get_template(template + ".jinja").render(
+            p=package, origin=origin, command=command)
     return files
 
 
@@ -43,7 +45,7 @@ def write(files, output):
             path.write_text(text)
 
 
-def check(files, output):
+def compare(files, output):
     """Prints how `output` differs from `files`; the number of files that do."""
     stale = 0
     for name, text in sorted(files.items()):
@@ -68,12 +70,12 @@ def main():
     arguments = parser.parse_args()
     try:
         package = model.Package(arguments.description, arguments.description.with_suffix(".cpp.json"))
-    except model.DescriptionError as error:
+    except check.DescriptionError as error:
         print(error, file=sys.stderr)
         return 2
     files = render(package, "tools/metagen/metagen.py")
     if arguments.check:
-        return 1 if check(files, arguments.output) else 0
+        return 1 if compare(files, arguments.output) else 0
     write(files, arguments.output)
     return 0
 

@@ -1,23 +1,18 @@
 """The description of a metamodel, checked and turned into the names that the templates print.
 
 A description has two halves: the facts (classes, properties, indices, UUIDs) and an overlay with
-the decisions that only C++ needs (namespace, documentation, getters, setters). Everything that
-templates print is computed here; they only lay it out.
+the decisions that only C++ needs (namespace, documentation, C++ types, what is written by hand).
+Everything that templates print is computed here; they only lay it out.
 """
 import json
 import re
 import textwrap
 
+import check
+
 WIDTH = 100
 MODEL_ELEMENT = "ModelElement"
-
-
-class DescriptionError(Exception):
-    """A description that contradicts itself; says in which file, where inside it, and why."""
-
-    def __init__(self, file, path, reason):
-        super().__init__(f"{file}: {path}: {reason}")
-        self.file, self.path, self.reason = str(file), path, reason
+UNBOUNDED = 0xFFFFFFFF
 
 
 def comment(text, indent=0):
@@ -29,78 +24,388 @@ def comment(text, indent=0):
     return "\n".join((prefix + line).rstrip() for line in lines)
 
 
-class Class:
-    def __init__(self, facts, cpp, package):
-        self.name = facts["name"]
-        self.superclass = facts["superclass"]
-        self.abstract = facts["abstract"]
-        self.uuid = facts["uuid"]
-        self.file = cpp["file"]
-        self.brief = cpp["brief"]
-        self.details = cpp.get("details", "")
-        self.package = package
-
-    @property
-    def is_root(self):
-        return self.superclass == MODEL_ELEMENT
-
-    @property
-    def base(self):
-        """The base of the handle, as code in the package's namespace names it."""
-        return self.superclass
-
-    @property
-    def base_header(self):
-        if self.is_root:
-            return "tarnkiln/kernel/ModelElement.h"
-        return f"{self.package.include}/{self.superclass}.h"
-
-    @property
-    def handle_includes(self):
-        return sorted([self.base_header, "tarnkiln/Export.h", "tarnkiln/meta/Fwd.h"])
-
-    @property
-    def article(self):
-        return "an" if self.name[0] in "AEIOU" else "a"
-
-    @property
-    def file_doc(self):
-        return comment(f"\\file\nThe handle of {self.file}.")
-
-    @property
-    def doc(self):
-        text = self.brief + "\n\n"
-        if self.details:
-            text += self.details + "\n\n"
-        noun = spoken(self.name)
-        text += (f"The handle is shared: copies refer to the same {noun}; it is false when empty or when "
-                 f"the {noun} was destroyed.\n\n"
-                 "Threads: handles may be copied and dropped anywhere. What belongs to the registry may "
-                 "be read on any thread; all else happens on the thread that uses the model.")
-        return comment(text)
-
-    @property
-    def cast_doc(self):
-        return comment(f"The {spoken(self.name)} behind `element`; empty if that is empty or "
-                       "something else.", 4)
-
-
 def spoken(name):
     """`EnumLiteral` as a reader says it: "enum literal"."""
     words = re.findall(r"[A-Z]+(?=[A-Z][a-z])|[A-Z][a-z]*|[A-Z]+", name)
     return " ".join(word if word.isupper() and len(word) > 1 else word.lower() for word in words)
 
 
+def constant(name):
+    """`importedPackageURIs` as a constant: "IMPORTED_PACKAGE_URIS"."""
+    parts = re.findall(r"[A-Z]+s?(?=[A-Z][a-z]|$)|[A-Z]?[a-z0-9]+|[A-Z]+", name)
+    return "_".join(part.upper() for part in parts)
+
+
+def capital(name):
+    return name[0].upper() + name[1:]
+
+
+class Property:
+    """One property of a class, and the C++ that stands for it."""
+
+    def __init__(self, facts, cpp, owner):
+        self.facts = facts
+        self.cpp = cpp
+        self.owner = owner
+        self.name = facts["name"]
+        self.index = facts["index"]
+        self.stored = self.index is not None
+        self.many = facts["upper"] != 1
+        self.is_element = facts["typeKind"] == "Class"
+        self.composite = facts["composite"]
+        self.constant = constant(self.name)
+        self.field = f"m_{self.name}"
+        self.setter_kind = cpp.get("setter", "generated")
+
+    def link(self):
+        """Finds what the description names; all classes exist by now."""
+        package = self.owner.package
+        self.target = package.by_name.get(self.facts["type"]) if self.is_element else None
+        self.opposite = self.target and self.target.find(self.facts["opposite"])
+        self.qualifier = self.target and self.target.find(self.facts["qualifiedBy"])
+        self.is_container = bool(self.opposite and self.opposite.composite)
+        self.key_changer = None
+
+    @property
+    def kind(self):
+        if not self.stored:
+            return "derived"
+        if self.is_element:
+            if self.is_container:
+                return "container"
+            if self.many:
+                return "references"
+            return "composite reference" if self.composite else "reference"
+        if self.many:
+            return "values"
+        return "optional" if self.facts["lower"] == 0 else "scalar"
+
+    # Names and types
+
+    @property
+    def getter(self):
+        return self.name if re.match(r"is[A-Z]", self.name) else "get" + capital(self.name)
+
+    @property
+    def setter(self):
+        return "set" + capital(self.name)
+
+    @property
+    def has(self):
+        return "has" + capital(self.name)
+
+    @property
+    def maker(self):
+        return "make" + capital(self.name)
+
+    @property
+    def parameter(self):
+        if self.is_element:
+            return f"{self.type} const& {self.argument}"
+        if self.kind == "scalar" and self.value["byValue"]:
+            return f"{self.type} {self.argument}"
+        return f"{self.type} const& {self.argument}"
+
+    @property
+    def argument(self):
+        """The name of the setter's argument; no word of the language."""
+        words = re.sub(r"^is(?=[A-Z])", "", self.name)
+        name = words[0].lower() + words[1:]
+        return "value" if name in ("operation", "static", "public", "default") else name
+
+    @property
+    def value(self):
+        return self.owner.package.types[self.facts["type"]]
+
+    @property
+    def type(self):
+        """The handle, the plain value, or the optional value."""
+        if self.is_element:
+            return self.facts["type"]
+        plain = self.value["cpp"]
+        return f"boost::optional<{plain}>" if self.kind == "optional" else plain
+
+    @property
+    def result(self):
+        return self.type if self.value["byValue"] and self.kind == "scalar" else f"{self.type} const&"
+
+    @property
+    def initial(self):
+        """The initializer of the field, with its blank."""
+        text = self.facts["default"]
+        if self.kind != "scalar":
+            return ""
+        plain = self.value["cpp"]
+        if plain == "bool":
+            return " = true" if text == "true" else " = false"
+        if plain == "UUID":
+            return "{}"
+        return f" = {text or 0}" if self.value["byValue"] else ""
+
+    @property
+    def collection(self):
+        """The class of a many-valued property's collection."""
+        entry = self.facts["type"] if self.is_element else self.value["cpp"]
+        if self.qualifier:
+            form = "ElementMap" if self.facts["qualificationUnique"] else "ElementMultimap"
+            return f"{form}<{self.qualifier.value['cpp']}, {entry}>"
+        if self.is_element:
+            return f"ElementSequence<{entry}>" if self.facts["ordered"] else \
+                f"UnorderedElementSet<{entry}>"
+        return f"PrimitiveSequence<{entry}>" if self.facts["ordered"] else f"PrimitiveSet<{entry}>"
+
+    @property
+    def collection_header(self):
+        return f"tarnkiln/collections/{self.collection.split('<')[0]}.h"
+
+    @property
+    def is_unique(self):
+        return "true" if self.facts["unique"] else "false"
+
+    @property
+    def key_expression(self):
+        return f"static_cast<{self.target.name}::Impl*>(member)->{self.qualifier.getter}()"
+
+    @property
+    def slot_initializer(self):
+        parts = [f".index = {self.index}"]
+        if self.composite:
+            parts.append(".composite = true")
+        if self.many:
+            parts.append(".single = false")
+        if self.qualifier:
+            parts.append(".keyed = true")
+        if self.opposite:
+            parts.append(f".opposite = &{self.opposite.owner.name}::Impl::{self.opposite.constant}")
+        return ", ".join(parts)
+
+    @property
+    def row(self):
+        own = f"&Impl::{self.field}, {self.constant}"
+        setter = f"&Impl::{self.setter}"
+        return {
+            "scalar": f"Scalar<{own}, {setter}>",
+            "optional": f"Optional<{own}, {setter}>",
+            "reference": f"Reference<{self.type}, {own}, {setter}>" if self.is_element else "",
+            "composite reference":
+                f"CompositeReference<{self.type}, {own}, {setter}>" if self.is_element else "",
+            "container": f"Container<{self.type}, {self.constant}, {setter}>",
+            "references": f"References<{own}, &Impl::{self.maker}, &Impl::{self.getter}>",
+            "values": f"Values<{own}, &Impl::{self.maker}, &Impl::{self.getter}>",
+        }[self.kind]
+
+    @property
+    def doc(self):
+        text = capital(self.cpp["doc"]) + "."
+        if self.key_changer:
+            text += "\n" + self.key_changer.key_failure
+        return comment(text, 4)
+
+    @property
+    def overridden(self):
+        """Whether a derived class gives the setter another body."""
+        return any(c.rekeyed and c.rekeyed.key is self and c is not self.owner
+                   for c in self.owner.package.classes)
+
+
+class Rekeyed:
+    """A class whose elements stand in a collection of their owner by the value of `key`."""
+
+    def __init__(self, to_owner):
+        self.to_owner = to_owner
+        self.collection = to_owner.opposite
+        self.key = self.collection.qualifier
+        self.unique = self.collection.facts["qualificationUnique"]
+
+    @property
+    def key_failure(self):
+        if not self.unique:
+            return ""
+        return ("\\throws tarnkiln::messages::UniquenessConstraint  if the owner has another such "
+                f"{'name' if self.key.name == 'name' else 'key'}.")
+
+    @property
+    def doc(self):
+        text = f"Gives it another {self.key.name}, under which the owner then keeps it."
+        if self.unique:
+            text += "\n\n" + self.key_failure
+        return comment(text, 4)
+
+
+class Class:
+    def __init__(self, facts, cpp, package):
+        self.facts = facts
+        self.cpp = cpp
+        self.package = package
+        self.name = facts["name"]
+        self.superclass = facts["superclass"]
+        self.abstract = facts["abstract"]
+        self.slots = facts["slots"]
+        self.brief = cpp["brief"]
+        self.properties = [Property(entry, cpp["properties"][entry["name"]], self)
+                           for entry in facts["properties"]]
+        self.declarations = cpp.get("declarations", [])
+
+    def link(self):
+        for prop in self.properties:
+            prop.link()
+
+    def link_keys(self):
+        self.rekeyed = None
+        for prop in self.stored:
+            if prop.opposite and prop.opposite.qualifier:
+                self.rekeyed = Rekeyed(prop)
+        self.rekeys_inherited = bool(self.rekeyed) and self.rekeyed.key.owner is not self
+        if self.rekeyed and not self.rekeys_inherited:
+            self.rekeyed.key.key_changer = self.rekeyed
+
+    @property
+    def stored(self):
+        return [p for p in self.properties if p.stored]
+
+    @property
+    def base(self):
+        return None if self.superclass == MODEL_ELEMENT else self.package.by_name[self.superclass]
+
+    def find(self, name):
+        """The property of that name, here or in a superclass."""
+        for prop in self.properties:
+            if prop.name == name:
+                return prop
+        return self.base.find(name) if name and self.base else None
+
+    # Documentation
+
+    @property
+    def article(self):
+        return "an" if self.name[0] in "AEIOU" else "a"
+
+    @property
+    def handle_file_doc(self):
+        return comment(f"\\file\nThe handle of {self.cpp['file']}.")
+
+    @property
+    def handle_doc(self):
+        text = self.brief + "\n\n"
+        if self.cpp["details"]:
+            text += self.cpp["details"] + "\n\n"
+        noun = spoken(self.name)
+        return comment(
+            text + f"The handle is shared: copies refer to the same {noun}; it is false when empty "
+            f"or when the {noun} was destroyed.\n\n"
+            "Threads: handles may be copied and dropped anywhere. What belongs to the registry may "
+            "be read on any thread; all else happens on the thread that uses the model.")
+
+    @property
+    def cast_doc(self):
+        return comment(f"The {spoken(self.name)} behind `element`; empty if that is empty or "
+                       "something else.", 4)
+
+    @property
+    def impl_doc(self):
+        return comment(
+            f"The properties of {self.article} `{self.name}`.\n\n"
+            "Setters work in the open transaction of the model, or in one of their own. They fail "
+            "with `CannotModifyProxy` if this element stands in for another one, and with "
+            "`ModelFrozen`, `NoOpenTransaction` or `ChangesProhibited` if the model may not be "
+            "changed now. An equal value changes nothing.\n\n"
+            "Threads: as the handle.")
+
+    def declaration_doc(self, declaration):
+        return comment(declaration["doc"], 4) if declaration["doc"] else ""
+
+    # Includes
+
+    @property
+    def handle_includes(self):
+        base = "tarnkiln/kernel/ModelElement.h" if self.base is None else self.header(self.superclass)
+        return sorted([base, "tarnkiln/Export.h", "tarnkiln/meta/Fwd.h"])
+
+    def header(self, name):
+        return f"{self.package.include}/{name}.h"
+
+    @property
+    def impl_includes(self):
+        headers = {self.header(self.name), "tarnkiln/support/Dispatch.h"}
+        if self.base:
+            headers.add(self.header(self.superclass + "Impl"))
+        for prop in self.properties:
+            if prop.target and prop.cpp.get("getter") != "none":
+                headers.add(self.header(prop.target.name))
+            if prop.stored and prop.many:
+                headers.add(prop.collection_header)
+        headers |= {h for h in self.cpp.get("includes", []) if not h.startswith("<")}
+        return sorted(headers)
+
+    @property
+    def impl_system_includes(self):
+        headers = {h for h in self.cpp.get("includes", []) if h.startswith("<")}
+        for prop in self.stored:
+            if not prop.is_element and "include" in prop.value:
+                headers.add(prop.value["include"])
+            if prop.kind == "optional":
+                headers.add("<boost/optional.hpp>")
+            if prop.many:
+                headers.add("<memory>")
+        boost = sorted(h for h in headers if h.startswith("<boost"))
+        standard = sorted(headers - set(boost))
+        return [block for block in (boost, standard) if block]
+
+    @property
+    def source_includes(self):
+        headers = {"tarnkiln/support/DispatchSteps.h", "tarnkiln/support/Handle.h",
+                   "tarnkiln/support/Unbuilt.h"}
+        for prop in self.stored:
+            if prop.target:
+                headers.add(self.header(prop.target.name + "Impl"))
+        if self.rekeyed:
+            headers.add("tarnkiln/support/Keyed.h")
+            headers.add(self.rekeyed.collection.collection_header)
+        headers.discard(self.header(self.name + "Impl"))
+        return sorted(headers)
+
+    # C++
+
+    @property
+    def base_impl(self):
+        return f"{self.superclass}::Impl"
+
+    @property
+    def qualified_impl(self):
+        return f"{self.package.namespace}::{self.name}::Impl"
+
+    @property
+    def qualified_base_impl(self):
+        return self.base.qualified_impl if self.base else "tarn::kiln::ModelElement::Impl"
+
+    @property
+    def fields(self):
+        return [p for p in self.stored if p.kind != "container"]
+
+    @property
+    def collections(self):
+        return [p for p in self.stored if p.many]
+
+    @property
+    def accessors(self):
+        """The properties that have a getter; derived ones may be written by hand."""
+        return [p for p in self.properties if p.stored or "code" in p.cpp]
+
+
 class Package:
-    """All classes of one metamodel, base classes first where order matters."""
+    """All classes of one metamodel."""
 
     def __init__(self, facts_file, overlay_file):
-        facts = json.loads(facts_file.read_text())
-        overlay = json.loads(overlay_file.read_text())
+        facts, overlay = check.load(facts_file, overlay_file)
         self.title = facts_file.name
         self.namespace = overlay["namespace"]
         self.include = overlay["include"]
         self.export = overlay["export"]
+        self.types = overlay["types"]
         self.classes = [Class(entry, overlay["classes"][entry["name"]], self)
                         for entry in facts["classes"]]
         self.by_name = {c.name: c for c in self.classes}
+        for cls in self.classes:
+            cls.link()
+        for cls in self.classes:
+            cls.link_keys()

@@ -15,7 +15,6 @@
 
 #include <boost/optional.hpp>
 
-#include <cstddef>
 #include <vector>
 
 namespace tarn::kiln {
