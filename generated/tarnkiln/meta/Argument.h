@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Argument : public TypedElement
 {
 public:
-    class Impl;           // ArgumentImpl.h
-    class Builder;        // ArgumentBuilder.h
-    class Constrainables; // ArgumentConstrainables.h
+    class Impl;            // ArgumentImpl.h
+    class Builder;         // ArgumentBuilder.h
+    class Constrainables;  // ArgumentConstrainables.h
 
     Argument() = default;
-    explicit Argument(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Argument(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The argument behind `element`; empty if that is empty or something else.
     static Argument cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Argument create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -21,18 +21,18 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Attribute : public ModelElement
 {
 public:
-    class Impl;           // AttributeImpl.h
-    class Builder;        // AttributeBuilder.h
-    class Constrainables; // AttributeConstrainables.h
+    class Impl;            // AttributeImpl.h
+    class Builder;         // AttributeBuilder.h
+    class Constrainables;  // AttributeConstrainables.h
 
     Attribute() = default;
-    explicit Attribute(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Attribute(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The attribute behind `element`; empty if that is empty or something else.
     static Attribute cast(ModelElement const& element);
     static meta::Class const& metaClass();
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

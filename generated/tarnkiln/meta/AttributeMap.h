@@ -21,12 +21,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT AttributeMap : public ModelElement
 {
 public:
-    class Impl;           // AttributeMapImpl.h
-    class Builder;        // AttributeMapBuilder.h
-    class Constrainables; // AttributeMapConstrainables.h
+    class Impl;            // AttributeMapImpl.h
+    class Builder;         // AttributeMapBuilder.h
+    class Constrainables;  // AttributeMapConstrainables.h
 
     AttributeMap() = default;
-    explicit AttributeMap(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit AttributeMap(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The attribute map behind `element`; empty if that is empty or something else.
     static AttributeMap cast(ModelElement const& element);
@@ -34,7 +34,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static AttributeMap create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -18,12 +18,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT AttributeMapAttribute : public Attribute
 {
 public:
-    class Impl;           // AttributeMapAttributeImpl.h
-    class Builder;        // AttributeMapAttributeBuilder.h
-    class Constrainables; // AttributeMapAttributeConstrainables.h
+    class Impl;            // AttributeMapAttributeImpl.h
+    class Builder;         // AttributeMapAttributeBuilder.h
+    class Constrainables;  // AttributeMapAttributeConstrainables.h
 
     AttributeMapAttribute() = default;
-    explicit AttributeMapAttribute(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit AttributeMapAttribute(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The attribute map attribute behind `element`; empty if that is empty or something else.
     static AttributeMapAttribute cast(ModelElement const& element);
@@ -31,7 +31,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static AttributeMapAttribute create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

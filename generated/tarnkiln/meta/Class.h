@@ -22,12 +22,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Class : public StructuredType
 {
 public:
-    class Impl;           // ClassImpl.h
-    class Builder;        // ClassBuilder.h
-    class Constrainables; // ClassConstrainables.h
+    class Impl;            // ClassImpl.h
+    class Builder;         // ClassBuilder.h
+    class Constrainables;  // ClassConstrainables.h
 
     Class() = default;
-    explicit Class(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Class(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The class behind `element`; empty if that is empty or something else.
     static Class cast(ModelElement const& element);
@@ -35,7 +35,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Class create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

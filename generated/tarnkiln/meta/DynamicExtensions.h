@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT DynamicExtensions : public ModelElement
 {
 public:
-    class Impl;           // DynamicExtensionsImpl.h
-    class Builder;        // DynamicExtensionsBuilder.h
-    class Constrainables; // DynamicExtensionsConstrainables.h
+    class Impl;            // DynamicExtensionsImpl.h
+    class Builder;         // DynamicExtensionsBuilder.h
+    class Constrainables;  // DynamicExtensionsConstrainables.h
 
     DynamicExtensions() = default;
-    explicit DynamicExtensions(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit DynamicExtensions(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The dynamic extensions behind `element`; empty if that is empty or something else.
     static DynamicExtensions cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static DynamicExtensions create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

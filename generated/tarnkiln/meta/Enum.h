@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Enum : public Type
 {
 public:
-    class Impl;           // EnumImpl.h
-    class Builder;        // EnumBuilder.h
-    class Constrainables; // EnumConstrainables.h
+    class Impl;            // EnumImpl.h
+    class Builder;         // EnumBuilder.h
+    class Constrainables;  // EnumConstrainables.h
 
     Enum() = default;
-    explicit Enum(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Enum(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The enum behind `element`; empty if that is empty or something else.
     static Enum cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Enum create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

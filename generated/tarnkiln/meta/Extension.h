@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Extension : public Property
 {
 public:
-    class Impl;           // ExtensionImpl.h
-    class Builder;        // ExtensionBuilder.h
-    class Constrainables; // ExtensionConstrainables.h
+    class Impl;            // ExtensionImpl.h
+    class Builder;         // ExtensionBuilder.h
+    class Constrainables;  // ExtensionConstrainables.h
 
     Extension() = default;
-    explicit Extension(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Extension(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The extension behind `element`; empty if that is empty or something else.
     static Extension cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Extension create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -18,12 +18,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT IntegerAttribute : public Attribute
 {
 public:
-    class Impl;           // IntegerAttributeImpl.h
-    class Builder;        // IntegerAttributeBuilder.h
-    class Constrainables; // IntegerAttributeConstrainables.h
+    class Impl;            // IntegerAttributeImpl.h
+    class Builder;         // IntegerAttributeBuilder.h
+    class Constrainables;  // IntegerAttributeConstrainables.h
 
     IntegerAttribute() = default;
-    explicit IntegerAttribute(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit IntegerAttribute(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The integer attribute behind `element`; empty if that is empty or something else.
     static IntegerAttribute cast(ModelElement const& element);
@@ -31,7 +31,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static IntegerAttribute create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT NamedElement : public ModelElement
 {
 public:
-    class Impl;           // NamedElementImpl.h
-    class Builder;        // NamedElementBuilder.h
-    class Constrainables; // NamedElementConstrainables.h
+    class Impl;            // NamedElementImpl.h
+    class Builder;         // NamedElementBuilder.h
+    class Constrainables;  // NamedElementConstrainables.h
 
     NamedElement() = default;
-    explicit NamedElement(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit NamedElement(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The named element behind `element`; empty if that is empty or something else.
     static NamedElement cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static NamedElement create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -21,12 +21,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Operation : public TypedElement
 {
 public:
-    class Impl;           // OperationImpl.h
-    class Builder;        // OperationBuilder.h
-    class Constrainables; // OperationConstrainables.h
+    class Impl;            // OperationImpl.h
+    class Builder;         // OperationBuilder.h
+    class Constrainables;  // OperationConstrainables.h
 
     Operation() = default;
-    explicit Operation(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Operation(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The operation behind `element`; empty if that is empty or something else.
     static Operation cast(ModelElement const& element);
@@ -34,7 +34,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Operation create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

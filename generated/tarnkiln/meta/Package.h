@@ -21,12 +21,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Package : public NamedElement
 {
 public:
-    class Impl;           // PackageImpl.h
-    class Builder;        // PackageBuilder.h
-    class Constrainables; // PackageConstrainables.h
+    class Impl;            // PackageImpl.h
+    class Builder;         // PackageBuilder.h
+    class Constrainables;  // PackageConstrainables.h
 
     Package() = default;
-    explicit Package(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Package(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The package behind `element`; empty if that is empty or something else.
     static Package cast(ModelElement const& element);
@@ -34,7 +34,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Package create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

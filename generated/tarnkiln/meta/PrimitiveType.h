@@ -18,12 +18,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT PrimitiveType : public Type
 {
 public:
-    class Impl;           // PrimitiveTypeImpl.h
-    class Builder;        // PrimitiveTypeBuilder.h
-    class Constrainables; // PrimitiveTypeConstrainables.h
+    class Impl;            // PrimitiveTypeImpl.h
+    class Builder;         // PrimitiveTypeBuilder.h
+    class Constrainables;  // PrimitiveTypeConstrainables.h
 
     PrimitiveType() = default;
-    explicit PrimitiveType(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit PrimitiveType(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The primitive type behind `element`; empty if that is empty or something else.
     static PrimitiveType cast(ModelElement const& element);
@@ -31,7 +31,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static PrimitiveType create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -21,12 +21,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Property : public TypedElement
 {
 public:
-    class Impl;           // PropertyImpl.h
-    class Builder;        // PropertyBuilder.h
-    class Constrainables; // PropertyConstrainables.h
+    class Impl;            // PropertyImpl.h
+    class Builder;         // PropertyBuilder.h
+    class Constrainables;  // PropertyConstrainables.h
 
     Property() = default;
-    explicit Property(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Property(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The property behind `element`; empty if that is empty or something else.
     static Property cast(ModelElement const& element);
@@ -34,7 +34,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Property create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

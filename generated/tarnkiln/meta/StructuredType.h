@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT StructuredType : public Type
 {
 public:
-    class Impl;           // StructuredTypeImpl.h
-    class Builder;        // StructuredTypeBuilder.h
-    class Constrainables; // StructuredTypeConstrainables.h
+    class Impl;            // StructuredTypeImpl.h
+    class Builder;         // StructuredTypeBuilder.h
+    class Constrainables;  // StructuredTypeConstrainables.h
 
     StructuredType() = default;
-    explicit StructuredType(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit StructuredType(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The structured type behind `element`; empty if that is empty or something else.
     static StructuredType cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static StructuredType create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Type : public NamedElement
 {
 public:
-    class Impl;           // TypeImpl.h
-    class Builder;        // TypeBuilder.h
-    class Constrainables; // TypeConstrainables.h
+    class Impl;            // TypeImpl.h
+    class Builder;         // TypeBuilder.h
+    class Constrainables;  // TypeConstrainables.h
 
     Type() = default;
-    explicit Type(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit Type(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The type behind `element`; empty if that is empty or something else.
     static Type cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static Type create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -20,12 +20,12 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT TypedElement : public NamedElement
 {
 public:
-    class Impl;           // TypedElementImpl.h
-    class Builder;        // TypedElementBuilder.h
-    class Constrainables; // TypedElementConstrainables.h
+    class Impl;            // TypedElementImpl.h
+    class Builder;         // TypedElementBuilder.h
+    class Constrainables;  // TypedElementConstrainables.h
 
     TypedElement() = default;
-    explicit TypedElement(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit TypedElement(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// The typed element behind `element`; empty if that is empty or something else.
     static TypedElement cast(ModelElement const& element);
@@ -33,7 +33,7 @@ public:
     /// A new one in `model`; the nil UUID stands for a fresh one.
     static TypedElement create(Model const& model, UUID const& id = {});
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -1,0 +1,68 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/ArgumentImpl.h"
+
+#include "tarnkiln/meta/OperationImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const Argument::Impl::OPERATION{
+    .index = 6, .opposite = &Operation::Impl::ARGUMENTS};
+
+constinit Slot const Argument::Impl::IS_INPUT{
+    .index = 7};
+
+Argument Argument::cast(ModelElement const& element)
+{
+    return support::cast<Argument>(element);
+}
+
+meta::Class const& Argument::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+Argument Argument::create(Model const& model, UUID const& id)
+{
+    return support::create<Argument>(model, id);
+}
+
+Argument::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+Argument::Impl::~Impl() = default;
+
+Operation Argument::Impl::getOperation() const
+{
+    return Operation(getOperationImpl());
+}
+
+Operation::Impl* Argument::Impl::getOperationImpl() const
+{
+    return support::containerOf<Operation::Impl>(*this, OPERATION);
+}
+
+bool Argument::Impl::hasOperation() const
+{
+    return getOperationImpl() && getOperationImpl()->isLive();
+}
+
+void Argument::Impl::setOperation(Operation const& value)
+{
+    support::setContainer(*this, OPERATION, value.getImpl());
+}
+
+void Argument::Impl::setIsInput(bool input)
+{
+    support::setScalar(*this, m_isInput, IS_INPUT, input);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::Argument::Impl, tarn::kiln::meta::TypedElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::Argument::Impl, tarn::kiln::meta::TypedElement::Impl>;

@@ -1,0 +1,70 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/AttributeImpl.h"
+
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/AttributeMapImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const Attribute::Impl::KEY{
+    .index = 1};
+
+constinit Slot const Attribute::Impl::OWNER{
+    .index = 2, .opposite = &AttributeMap::Impl::ATTRIBUTES};
+
+Attribute Attribute::cast(ModelElement const& element)
+{
+    return support::cast<Attribute>(element);
+}
+
+meta::Class const& Attribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+Attribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+Attribute::Impl::~Impl() = default;
+
+void Attribute::Impl::setKey(ustring const& key)
+{
+    support::changeKey(
+        *this, getKey(), key, getOwner(), OWNER,
+        [&] { support::requireFreeKey(getOwner()->getAttributes(), key); },
+        [&] { support::setScalar(*this, m_key, KEY, key); });
+}
+
+AttributeMap Attribute::Impl::getOwner() const
+{
+    return AttributeMap(getOwnerImpl());
+}
+
+AttributeMap::Impl* Attribute::Impl::getOwnerImpl() const
+{
+    return support::containerOf<AttributeMap::Impl>(*this, OWNER);
+}
+
+bool Attribute::Impl::hasOwner() const
+{
+    return getOwnerImpl() && getOwnerImpl()->isLive();
+}
+
+void Attribute::Impl::setOwner(AttributeMap const& owner)
+{
+    support::setContainer(*this, OWNER, owner.getImpl(), [&] {
+        support::requireFreeKey(owner->getAttributes(), getKey());
+    });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::Attribute::Impl, tarn::kiln::ModelElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::Attribute::Impl, tarn::kiln::ModelElement::Impl>;

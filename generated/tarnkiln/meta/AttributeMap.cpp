@@ -1,0 +1,53 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/AttributeMapImpl.h"
+
+#include "tarnkiln/meta/AttributeImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const AttributeMap::Impl::ATTRIBUTES{
+    .index = 1, .composite = true, .single = false, .keyed = true, .opposite = &Attribute::Impl::OWNER};
+
+AttributeMap AttributeMap::cast(ModelElement const& element)
+{
+    return support::cast<AttributeMap>(element);
+}
+
+meta::Class const& AttributeMap::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+AttributeMap AttributeMap::create(Model const& model, UUID const& id)
+{
+    return support::create<AttributeMap>(model, id);
+}
+
+AttributeMap::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+AttributeMap::Impl::~Impl() = default;
+
+std::unique_ptr<ElementMap<ustring, Attribute>> AttributeMap::Impl::makeAttributes(Impl* owner)
+{
+    auto const keyOf = [](ModelElement::Impl* member) {
+        return static_cast<Attribute::Impl*>(member)->getKey();
+    };
+    return std::make_unique<ElementMap<ustring, Attribute>>(owner, keyOf, ATTRIBUTES);
+}
+
+ElementMap<ustring, Attribute>& AttributeMap::Impl::getAttributes() const
+{
+    return support::shownCollection(*this, m_attributes, &Impl::makeAttributes);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::AttributeMap::Impl, tarn::kiln::ModelElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::AttributeMap::Impl, tarn::kiln::ModelElement::Impl>;

@@ -1,0 +1,55 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/AttributeMapAttributeImpl.h"
+
+#include "tarnkiln/meta/AttributeMapImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const AttributeMapAttribute::Impl::VALUE{
+    .index = 3, .composite = true};
+
+AttributeMapAttribute AttributeMapAttribute::cast(ModelElement const& element)
+{
+    return support::cast<AttributeMapAttribute>(element);
+}
+
+meta::Class const& AttributeMapAttribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+AttributeMapAttribute AttributeMapAttribute::create(Model const& model, UUID const& id)
+{
+    return support::create<AttributeMapAttribute>(model, id);
+}
+
+AttributeMapAttribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+AttributeMapAttribute::Impl::~Impl() = default;
+
+AttributeMap AttributeMapAttribute::Impl::getValue() const
+{
+    return AttributeMap(support::resolve(*this, m_value, VALUE));
+}
+
+bool AttributeMapAttribute::Impl::hasValue() const
+{
+    return m_value && m_value.get()->isLive();
+}
+
+void AttributeMapAttribute::Impl::setValue(AttributeMap const& value)
+{
+    support::setReference(*this, m_value, VALUE, value.getImpl());
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::AttributeMapAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::AttributeMapAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;

@@ -1,0 +1,44 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/BooleanAttributeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const BooleanAttribute::Impl::VALUE{
+    .index = 3};
+
+BooleanAttribute BooleanAttribute::cast(ModelElement const& element)
+{
+    return support::cast<BooleanAttribute>(element);
+}
+
+meta::Class const& BooleanAttribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+BooleanAttribute BooleanAttribute::create(Model const& model, UUID const& id)
+{
+    return support::create<BooleanAttribute>(model, id);
+}
+
+BooleanAttribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+BooleanAttribute::Impl::~Impl() = default;
+
+void BooleanAttribute::Impl::setValue(bool value)
+{
+    support::setScalar(*this, m_value, VALUE, value);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::BooleanAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::BooleanAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;

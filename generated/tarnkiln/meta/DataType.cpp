@@ -1,0 +1,36 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/DataTypeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+DataType DataType::cast(ModelElement const& element)
+{
+    return support::cast<DataType>(element);
+}
+
+meta::Class const& DataType::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+DataType DataType::create(Model const& model, UUID const& id)
+{
+    return support::create<DataType>(model, id);
+}
+
+DataType::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+DataType::Impl::~Impl() = default;
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::DataType::Impl, tarn::kiln::meta::StructuredType::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::DataType::Impl, tarn::kiln::meta::StructuredType::Impl>;

@@ -1,0 +1,44 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/DateTimeAttributeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const DateTimeAttribute::Impl::VALUE{
+    .index = 3};
+
+DateTimeAttribute DateTimeAttribute::cast(ModelElement const& element)
+{
+    return support::cast<DateTimeAttribute>(element);
+}
+
+meta::Class const& DateTimeAttribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+DateTimeAttribute DateTimeAttribute::create(Model const& model, UUID const& id)
+{
+    return support::create<DateTimeAttribute>(model, id);
+}
+
+DateTimeAttribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+DateTimeAttribute::Impl::~Impl() = default;
+
+void DateTimeAttribute::Impl::setValue(boost::posix_time::ptime const& value)
+{
+    support::setScalar(*this, m_value, VALUE, value);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::DateTimeAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::DateTimeAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;

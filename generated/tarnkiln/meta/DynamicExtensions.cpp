@@ -1,0 +1,84 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/DynamicExtensionsImpl.h"
+
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const DynamicExtensions::Impl::MODEL_ID{
+    .index = 1};
+
+constinit Slot const DynamicExtensions::Impl::EXTENSIONS{
+    .index = 2, .composite = true, .single = false, .keyed = true, .opposite = &Extension::Impl::OWNER};
+
+constinit Slot const DynamicExtensions::Impl::OWNING_CLASS{
+    .index = 3, .opposite = &Class::Impl::EXTENSIONS};
+
+DynamicExtensions DynamicExtensions::cast(ModelElement const& element)
+{
+    return support::cast<DynamicExtensions>(element);
+}
+
+meta::Class const& DynamicExtensions::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+DynamicExtensions DynamicExtensions::create(Model const& model, UUID const& id)
+{
+    return support::create<DynamicExtensions>(model, id);
+}
+
+DynamicExtensions::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+DynamicExtensions::Impl::~Impl() = default;
+
+std::unique_ptr<ElementMap<ustring, Extension>> DynamicExtensions::Impl::makeExtensions(Impl* owner)
+{
+    auto const keyOf = [](ModelElement::Impl* member) {
+        return static_cast<Extension::Impl*>(member)->getName();
+    };
+    return std::make_unique<ElementMap<ustring, Extension>>(owner, keyOf, EXTENSIONS);
+}
+
+ElementMap<ustring, Extension>& DynamicExtensions::Impl::getExtensions() const
+{
+    return support::shownCollection(*this, m_extensions, &Impl::makeExtensions);
+}
+
+Class DynamicExtensions::Impl::getOwningClass() const
+{
+    return Class(getOwningClassImpl());
+}
+
+Class::Impl* DynamicExtensions::Impl::getOwningClassImpl() const
+{
+    return support::containerOf<Class::Impl>(*this, OWNING_CLASS);
+}
+
+bool DynamicExtensions::Impl::hasOwningClass() const
+{
+    return getOwningClassImpl() && getOwningClassImpl()->isLive();
+}
+
+void DynamicExtensions::Impl::setOwningClass(Class const& owningClass)
+{
+    support::setContainer(*this, OWNING_CLASS, owningClass.getImpl(), [&] {
+        support::requireFreeKey(owningClass->getExtensions(), getModelID());
+    });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::DynamicExtensions::Impl, tarn::kiln::ModelElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::DynamicExtensions::Impl, tarn::kiln::ModelElement::Impl>;

@@ -1,0 +1,88 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/EnumLiteralImpl.h"
+
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const EnumLiteral::Impl::VALUE{
+    .index = 2};
+
+constinit Slot const EnumLiteral::Impl::PARENT_ENUM{
+    .index = 3, .opposite = &Enum::Impl::LITERALS};
+
+constinit Slot const EnumLiteral::Impl::PUBLIC_IDENTIFIER{
+    .index = 4};
+
+EnumLiteral EnumLiteral::cast(ModelElement const& element)
+{
+    return support::cast<EnumLiteral>(element);
+}
+
+meta::Class const& EnumLiteral::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+EnumLiteral EnumLiteral::create(Model const& model, UUID const& id)
+{
+    return support::create<EnumLiteral>(model, id);
+}
+
+EnumLiteral::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+EnumLiteral::Impl::~Impl() = default;
+
+void EnumLiteral::Impl::setValue(int value)
+{
+    support::setScalar(*this, m_value, VALUE, value);
+}
+
+Enum EnumLiteral::Impl::getParentEnum() const
+{
+    return Enum(getParentEnumImpl());
+}
+
+Enum::Impl* EnumLiteral::Impl::getParentEnumImpl() const
+{
+    return support::containerOf<Enum::Impl>(*this, PARENT_ENUM);
+}
+
+bool EnumLiteral::Impl::hasParentEnum() const
+{
+    return getParentEnumImpl() && getParentEnumImpl()->isLive();
+}
+
+void EnumLiteral::Impl::setParentEnum(Enum const& parentEnum)
+{
+    support::setContainer(*this, PARENT_ENUM, parentEnum.getImpl(), [&] {
+        support::requireFreeKey(parentEnum->getLiterals(), getName());
+    });
+}
+
+void EnumLiteral::Impl::setPublicIdentifier(boost::optional<ustring> const& publicIdentifier)
+{
+    support::setScalar(*this, m_publicIdentifier, PUBLIC_IDENTIFIER, publicIdentifier);
+}
+
+void EnumLiteral::Impl::setName(ustring const& name)
+{
+    support::changeKey(
+        *this, getName(), name, getParentEnum(), PARENT_ENUM,
+        [&] { support::requireFreeKey(getParentEnum()->getLiterals(), name); },
+        [&] { NamedElement::Impl::setName(name); });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::EnumLiteral::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::EnumLiteral::Impl, tarn::kiln::meta::NamedElement::Impl>;

@@ -1,0 +1,72 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/ExtensionImpl.h"
+
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/DynamicExtensionsImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const Extension::Impl::OWNER{
+    .index = 26, .opposite = &DynamicExtensions::Impl::EXTENSIONS};
+
+Extension Extension::cast(ModelElement const& element)
+{
+    return support::cast<Extension>(element);
+}
+
+meta::Class const& Extension::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+Extension Extension::create(Model const& model, UUID const& id)
+{
+    return support::create<Extension>(model, id);
+}
+
+Extension::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+Extension::Impl::~Impl() = default;
+
+DynamicExtensions Extension::Impl::getOwner() const
+{
+    return DynamicExtensions(getOwnerImpl());
+}
+
+DynamicExtensions::Impl* Extension::Impl::getOwnerImpl() const
+{
+    return support::containerOf<DynamicExtensions::Impl>(*this, OWNER);
+}
+
+bool Extension::Impl::hasOwner() const
+{
+    return getOwnerImpl() && getOwnerImpl()->isLive();
+}
+
+void Extension::Impl::setOwner(DynamicExtensions const& owner)
+{
+    support::setContainer(*this, OWNER, owner.getImpl(), [&] {
+        support::requireFreeKey(owner->getExtensions(), getName());
+    });
+}
+
+void Extension::Impl::setName(ustring const& name)
+{
+    support::changeKey(
+        *this, getName(), name, getOwner(), OWNER,
+        [&] { support::requireFreeKey(getOwner()->getExtensions(), name); },
+        [&] { Property::Impl::setName(name); });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::Extension::Impl, tarn::kiln::meta::Property::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::Extension::Impl, tarn::kiln::meta::Property::Impl>;

@@ -1,0 +1,44 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/IntegerAttributeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const IntegerAttribute::Impl::VALUE{
+    .index = 3};
+
+IntegerAttribute IntegerAttribute::cast(ModelElement const& element)
+{
+    return support::cast<IntegerAttribute>(element);
+}
+
+meta::Class const& IntegerAttribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+IntegerAttribute IntegerAttribute::create(Model const& model, UUID const& id)
+{
+    return support::create<IntegerAttribute>(model, id);
+}
+
+IntegerAttribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+IntegerAttribute::Impl::~Impl() = default;
+
+void IntegerAttribute::Impl::setValue(int value)
+{
+    support::setScalar(*this, m_value, VALUE, value);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::IntegerAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::IntegerAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;

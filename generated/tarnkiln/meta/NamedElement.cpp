@@ -1,0 +1,44 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/NamedElementImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const NamedElement::Impl::NAME{
+    .index = 1};
+
+NamedElement NamedElement::cast(ModelElement const& element)
+{
+    return support::cast<NamedElement>(element);
+}
+
+meta::Class const& NamedElement::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+NamedElement NamedElement::create(Model const& model, UUID const& id)
+{
+    return support::create<NamedElement>(model, id);
+}
+
+NamedElement::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+NamedElement::Impl::~Impl() = default;
+
+void NamedElement::Impl::setName(ustring const& name)
+{
+    support::setScalar(*this, m_name, NAME, name);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::NamedElement::Impl, tarn::kiln::ModelElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::NamedElement::Impl, tarn::kiln::ModelElement::Impl>;

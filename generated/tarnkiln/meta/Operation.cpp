@@ -1,0 +1,116 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/OperationImpl.h"
+
+#include "tarnkiln/collections/ElementMultimap.h"
+#include "tarnkiln/meta/ArgumentImpl.h"
+#include "tarnkiln/meta/StructuredTypeImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const Operation::Impl::ARGUMENTS{
+    .index = 6, .composite = true, .single = false, .opposite = &Argument::Impl::OPERATION};
+
+constinit Slot const Operation::Impl::OWNING_TYPE{
+    .index = 7, .opposite = &StructuredType::Impl::OWNED_OPERATIONS};
+
+constinit Slot const Operation::Impl::IS_ABSTRACT{
+    .index = 8};
+
+constinit Slot const Operation::Impl::IS_STATIC{
+    .index = 9};
+
+constinit Slot const Operation::Impl::IS_PUBLIC{
+    .index = 10};
+
+constinit Slot const Operation::Impl::IS_EVENT{
+    .index = 11};
+
+Operation Operation::cast(ModelElement const& element)
+{
+    return support::cast<Operation>(element);
+}
+
+meta::Class const& Operation::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+Operation Operation::create(Model const& model, UUID const& id)
+{
+    return support::create<Operation>(model, id);
+}
+
+Operation::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+Operation::Impl::~Impl() = default;
+
+std::unique_ptr<ElementSequence<Argument>> Operation::Impl::makeArguments(Impl* owner)
+{
+    return std::make_unique<ElementSequence<Argument>>(owner, true, ARGUMENTS);
+}
+
+ElementSequence<Argument>& Operation::Impl::getArguments() const
+{
+    return support::shownCollection(*this, m_arguments, &Impl::makeArguments);
+}
+
+StructuredType Operation::Impl::getOwningType() const
+{
+    return StructuredType(getOwningTypeImpl());
+}
+
+StructuredType::Impl* Operation::Impl::getOwningTypeImpl() const
+{
+    return support::containerOf<StructuredType::Impl>(*this, OWNING_TYPE);
+}
+
+bool Operation::Impl::hasOwningType() const
+{
+    return getOwningTypeImpl() && getOwningTypeImpl()->isLive();
+}
+
+void Operation::Impl::setOwningType(StructuredType const& owningType)
+{
+    support::setContainer(*this, OWNING_TYPE, owningType.getImpl());
+}
+
+void Operation::Impl::setIsAbstract(bool abstract)
+{
+    support::setScalar(*this, m_isAbstract, IS_ABSTRACT, abstract);
+}
+
+void Operation::Impl::setIsStatic(bool value)
+{
+    support::setScalar(*this, m_isStatic, IS_STATIC, value);
+}
+
+void Operation::Impl::setIsPublic(bool value)
+{
+    support::setScalar(*this, m_isPublic, IS_PUBLIC, value);
+}
+
+void Operation::Impl::setIsEvent(bool event)
+{
+    support::setScalar(*this, m_isEvent, IS_EVENT, event);
+}
+
+void Operation::Impl::setName(ustring const& name)
+{
+    support::changeKey(
+        *this, getName(), name, getOwningType(), OWNING_TYPE,
+        [] {},
+        [&] { TypedElement::Impl::setName(name); });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::Operation::Impl, tarn::kiln::meta::TypedElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::Operation::Impl, tarn::kiln::meta::TypedElement::Impl>;

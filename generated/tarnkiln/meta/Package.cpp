@@ -1,0 +1,133 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/PackageImpl.h"
+
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const Package::Impl::OWNED_TYPES{
+    .index = 2, .composite = true, .single = false, .keyed = true, .opposite = &Type::Impl::OWNING_PACKAGE};
+
+constinit Slot const Package::Impl::NESTED_PACKAGES{
+    .index = 3, .composite = true, .single = false, .keyed = true, .opposite = &Package::Impl::PARENT_PACKAGE};
+
+constinit Slot const Package::Impl::URI{
+    .index = 4};
+
+constinit Slot const Package::Impl::PARENT_PACKAGE{
+    .index = 5, .opposite = &Package::Impl::NESTED_PACKAGES};
+
+constinit Slot const Package::Impl::IMPORTED_PACKAGE_URIS{
+    .index = 6, .single = false};
+
+constinit Slot const Package::Impl::DEFAULT_VOBJ_CATEGORY{
+    .index = 7};
+
+Package Package::cast(ModelElement const& element)
+{
+    return support::cast<Package>(element);
+}
+
+meta::Class const& Package::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+Package Package::create(Model const& model, UUID const& id)
+{
+    return support::create<Package>(model, id);
+}
+
+Package::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+Package::Impl::~Impl() = default;
+
+std::unique_ptr<ElementMap<ustring, Type>> Package::Impl::makeOwnedTypes(Impl* owner)
+{
+    auto const keyOf = [](ModelElement::Impl* member) {
+        return static_cast<Type::Impl*>(member)->getName();
+    };
+    return std::make_unique<ElementMap<ustring, Type>>(owner, keyOf, OWNED_TYPES);
+}
+
+ElementMap<ustring, Type>& Package::Impl::getOwnedTypes() const
+{
+    return support::shownCollection(*this, m_ownedTypes, &Impl::makeOwnedTypes);
+}
+
+std::unique_ptr<ElementMap<ustring, Package>> Package::Impl::makeNestedPackages(Impl* owner)
+{
+    auto const keyOf = [](ModelElement::Impl* member) {
+        return static_cast<Package::Impl*>(member)->getName();
+    };
+    return std::make_unique<ElementMap<ustring, Package>>(owner, keyOf, NESTED_PACKAGES);
+}
+
+ElementMap<ustring, Package>& Package::Impl::getNestedPackages() const
+{
+    return support::shownCollection(*this, m_nestedPackages, &Impl::makeNestedPackages);
+}
+
+void Package::Impl::setUri(ustring const& uri)
+{
+    support::setScalar(*this, m_uri, URI, uri);
+}
+
+Package Package::Impl::getParentPackage() const
+{
+    return Package(getParentPackageImpl());
+}
+
+Package::Impl* Package::Impl::getParentPackageImpl() const
+{
+    return support::containerOf<Package::Impl>(*this, PARENT_PACKAGE);
+}
+
+bool Package::Impl::hasParentPackage() const
+{
+    return getParentPackageImpl() && getParentPackageImpl()->isLive();
+}
+
+void Package::Impl::setParentPackage(Package const& parentPackage)
+{
+    support::setContainer(*this, PARENT_PACKAGE, parentPackage.getImpl(), [&] {
+        support::requireFreeKey(parentPackage->getNestedPackages(), getName());
+    });
+}
+
+std::unique_ptr<PrimitiveSequence<ustring>> Package::Impl::makeImportedPackageURIs(Impl* owner)
+{
+    return std::make_unique<PrimitiveSequence<ustring>>(owner, false, IMPORTED_PACKAGE_URIS);
+}
+
+PrimitiveSequence<ustring>& Package::Impl::getImportedPackageURIs() const
+{
+    return support::shownCollection(*this, m_importedPackageURIs, &Impl::makeImportedPackageURIs);
+}
+
+void Package::Impl::setDefaultVobjCategory(boost::optional<string> const& defaultVobjCategory)
+{
+    support::setScalar(*this, m_defaultVobjCategory, DEFAULT_VOBJ_CATEGORY, defaultVobjCategory);
+}
+
+void Package::Impl::setName(ustring const& name)
+{
+    support::changeKey(
+        *this, getName(), name, getParentPackage(), PARENT_PACKAGE,
+        [&] { support::requireFreeKey(getParentPackage()->getNestedPackages(), name); },
+        [&] { NamedElement::Impl::setName(name); });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::Package::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::Package::Impl, tarn::kiln::meta::NamedElement::Impl>;

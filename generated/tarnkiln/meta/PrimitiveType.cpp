@@ -1,0 +1,36 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/PrimitiveTypeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+PrimitiveType PrimitiveType::cast(ModelElement const& element)
+{
+    return support::cast<PrimitiveType>(element);
+}
+
+meta::Class const& PrimitiveType::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+PrimitiveType PrimitiveType::create(Model const& model, UUID const& id)
+{
+    return support::create<PrimitiveType>(model, id);
+}
+
+PrimitiveType::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+PrimitiveType::Impl::~Impl() = default;
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::PrimitiveType::Impl, tarn::kiln::meta::Type::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::PrimitiveType::Impl, tarn::kiln::meta::Type::Impl>;

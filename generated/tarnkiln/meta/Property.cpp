@@ -1,0 +1,244 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/PropertyImpl.h"
+
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/StructuredTypeImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const Property::Impl::IS_DERIVED{
+    .index = 6};
+
+constinit Slot const Property::Impl::IS_COMPOSITE{
+    .index = 7};
+
+constinit Slot const Property::Impl::IS_READ_ONLY{
+    .index = 8};
+
+constinit Slot const Property::Impl::IS_UNIQUE{
+    .index = 9};
+
+constinit Slot const Property::Impl::QUALIFIED_BY{
+    .index = 10};
+
+constinit Slot const Property::Impl::CUSTOM_QUALIFICATION{
+    .index = 11};
+
+constinit Slot const Property::Impl::IS_QUALIFICATION_UNIQUE{
+    .index = 12};
+
+constinit Slot const Property::Impl::OPPOSITE{
+    .index = 13};
+
+constinit Slot const Property::Impl::PROPERTY_INDEX{
+    .index = 14};
+
+constinit Slot const Property::Impl::IS_PUBLIC_ACCESSOR{
+    .index = 15};
+
+constinit Slot const Property::Impl::IS_PUBLIC_MUTATOR{
+    .index = 16};
+
+constinit Slot const Property::Impl::IS_TRANSIENT{
+    .index = 17};
+
+constinit Slot const Property::Impl::IS_SPARSE{
+    .index = 18};
+
+constinit Slot const Property::Impl::OWNING_TYPE{
+    .index = 19, .opposite = &StructuredType::Impl::OWNED_ATTRIBUTES};
+
+constinit Slot const Property::Impl::VOBJ_DISP_CATEGORY{
+    .index = 20};
+
+constinit Slot const Property::Impl::VOBJ_DISP_SKIP_EMPTY{
+    .index = 21};
+
+constinit Slot const Property::Impl::IS_SET_ONCE{
+    .index = 22};
+
+constinit Slot const Property::Impl::IS_VOBJ_HIDDEN{
+    .index = 23};
+
+constinit Slot const Property::Impl::DEFAULT_VALUE{
+    .index = 24};
+
+constinit Slot const Property::Impl::IS_QUERY_INDEX{
+    .index = 25};
+
+Property Property::cast(ModelElement const& element)
+{
+    return support::cast<Property>(element);
+}
+
+meta::Class const& Property::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+Property Property::create(Model const& model, UUID const& id)
+{
+    return support::create<Property>(model, id);
+}
+
+Property::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+Property::Impl::~Impl() = default;
+
+void Property::Impl::setIsDerived(bool derived)
+{
+    support::setScalar(*this, m_isDerived, IS_DERIVED, derived);
+}
+
+void Property::Impl::setIsComposite(bool composite)
+{
+    support::setScalar(*this, m_isComposite, IS_COMPOSITE, composite);
+}
+
+void Property::Impl::setIsReadOnly(bool readOnly)
+{
+    support::setScalar(*this, m_isReadOnly, IS_READ_ONLY, readOnly);
+}
+
+void Property::Impl::setIsUnique(bool unique)
+{
+    support::setScalar(*this, m_isUnique, IS_UNIQUE, unique);
+}
+
+Property Property::Impl::getQualifiedBy() const
+{
+    return Property(support::resolve(*this, m_qualifiedBy, QUALIFIED_BY));
+}
+
+bool Property::Impl::hasQualifiedBy() const
+{
+    return m_qualifiedBy && m_qualifiedBy.get()->isLive();
+}
+
+void Property::Impl::setQualifiedBy(Property const& qualifiedBy)
+{
+    support::setReference(*this, m_qualifiedBy, QUALIFIED_BY, qualifiedBy.getImpl());
+}
+
+void Property::Impl::setCustomQualification(bool customQualification)
+{
+    support::setScalar(*this, m_customQualification, CUSTOM_QUALIFICATION, customQualification);
+}
+
+void Property::Impl::setIsQualificationUnique(bool qualificationUnique)
+{
+    support::setScalar(*this, m_isQualificationUnique, IS_QUALIFICATION_UNIQUE, qualificationUnique);
+}
+
+Property Property::Impl::getOpposite() const
+{
+    return Property(support::resolve(*this, m_opposite, OPPOSITE));
+}
+
+bool Property::Impl::hasOpposite() const
+{
+    return m_opposite && m_opposite.get()->isLive();
+}
+
+void Property::Impl::setOpposite(Property const& opposite)
+{
+    support::setReference(*this, m_opposite, OPPOSITE, opposite.getImpl());
+}
+
+void Property::Impl::setPropertyIndex(int propertyIndex)
+{
+    support::setScalar(*this, m_propertyIndex, PROPERTY_INDEX, propertyIndex);
+}
+
+void Property::Impl::setIsPublicAccessor(bool publicAccessor)
+{
+    support::setScalar(*this, m_isPublicAccessor, IS_PUBLIC_ACCESSOR, publicAccessor);
+}
+
+void Property::Impl::setIsPublicMutator(bool publicMutator)
+{
+    support::setScalar(*this, m_isPublicMutator, IS_PUBLIC_MUTATOR, publicMutator);
+}
+
+void Property::Impl::setIsTransient(bool transient)
+{
+    support::setScalar(*this, m_isTransient, IS_TRANSIENT, transient);
+}
+
+void Property::Impl::setIsSparse(bool sparse)
+{
+    support::setScalar(*this, m_isSparse, IS_SPARSE, sparse);
+}
+
+StructuredType Property::Impl::getOwningType() const
+{
+    return StructuredType(getOwningTypeImpl());
+}
+
+StructuredType::Impl* Property::Impl::getOwningTypeImpl() const
+{
+    return support::containerOf<StructuredType::Impl>(*this, OWNING_TYPE);
+}
+
+bool Property::Impl::hasOwningType() const
+{
+    return getOwningTypeImpl() && getOwningTypeImpl()->isLive();
+}
+
+void Property::Impl::setOwningType(StructuredType const& owningType)
+{
+    support::setContainer(*this, OWNING_TYPE, owningType.getImpl(), [&] {
+        support::requireFreeKey(owningType->getOwnedAttributes(), getName());
+    });
+}
+
+void Property::Impl::setVobjDispCategory(boost::optional<string> const& vobjDispCategory)
+{
+    support::setScalar(*this, m_vobjDispCategory, VOBJ_DISP_CATEGORY, vobjDispCategory);
+}
+
+void Property::Impl::setVobjDispSkipEmpty(bool vobjDispSkipEmpty)
+{
+    support::setScalar(*this, m_vobjDispSkipEmpty, VOBJ_DISP_SKIP_EMPTY, vobjDispSkipEmpty);
+}
+
+void Property::Impl::setIsSetOnce(bool setOnce)
+{
+    support::setScalar(*this, m_isSetOnce, IS_SET_ONCE, setOnce);
+}
+
+void Property::Impl::setIsVobjHidden(bool vobjHidden)
+{
+    support::setScalar(*this, m_isVobjHidden, IS_VOBJ_HIDDEN, vobjHidden);
+}
+
+void Property::Impl::setDefaultValue(boost::optional<ustring> const& defaultValue)
+{
+    support::setScalar(*this, m_defaultValue, DEFAULT_VALUE, defaultValue);
+}
+
+void Property::Impl::setIsQueryIndex(bool queryIndex)
+{
+    support::setScalar(*this, m_isQueryIndex, IS_QUERY_INDEX, queryIndex);
+}
+
+void Property::Impl::setName(ustring const& name)
+{
+    support::changeKey(
+        *this, getName(), name, getOwningType(), OWNING_TYPE,
+        [&] { support::requireFreeKey(getOwningType()->getOwnedAttributes(), name); },
+        [&] { TypedElement::Impl::setName(name); });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::Property::Impl, tarn::kiln::meta::TypedElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::Property::Impl, tarn::kiln::meta::TypedElement::Impl>;

@@ -1,0 +1,44 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/RealAttributeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const RealAttribute::Impl::VALUE{
+    .index = 3};
+
+RealAttribute RealAttribute::cast(ModelElement const& element)
+{
+    return support::cast<RealAttribute>(element);
+}
+
+meta::Class const& RealAttribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+RealAttribute RealAttribute::create(Model const& model, UUID const& id)
+{
+    return support::create<RealAttribute>(model, id);
+}
+
+RealAttribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+RealAttribute::Impl::~Impl() = default;
+
+void RealAttribute::Impl::setValue(double value)
+{
+    support::setScalar(*this, m_value, VALUE, value);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::RealAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::RealAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;

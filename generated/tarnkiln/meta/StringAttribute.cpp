@@ -1,0 +1,44 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/StringAttributeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const StringAttribute::Impl::VALUE{
+    .index = 3};
+
+StringAttribute StringAttribute::cast(ModelElement const& element)
+{
+    return support::cast<StringAttribute>(element);
+}
+
+meta::Class const& StringAttribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+StringAttribute StringAttribute::create(Model const& model, UUID const& id)
+{
+    return support::create<StringAttribute>(model, id);
+}
+
+StringAttribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+StringAttribute::Impl::~Impl() = default;
+
+void StringAttribute::Impl::setValue(ustring const& value)
+{
+    support::setScalar(*this, m_value, VALUE, value);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::StringAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::StringAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;

@@ -1,0 +1,99 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/StructuredTypeImpl.h"
+
+#include "tarnkiln/meta/OperationImpl.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const StructuredType::Impl::VOBJ_NAME{
+    .index = 4};
+
+constinit Slot const StructuredType::Impl::OWNED_ATTRIBUTES{
+    .index = 5, .composite = true, .single = false, .keyed = true, .opposite = &Property::Impl::OWNING_TYPE};
+
+constinit Slot const StructuredType::Impl::OWNED_OPERATIONS{
+    .index = 6, .composite = true, .single = false, .keyed = true, .opposite = &Operation::Impl::OWNING_TYPE};
+
+constinit Slot const StructuredType::Impl::VOBJ_COMPACT_DISPLAY{
+    .index = 7};
+
+constinit Slot const StructuredType::Impl::VOBJ_DISP_CATEGORIES{
+    .index = 8, .single = false};
+
+StructuredType StructuredType::cast(ModelElement const& element)
+{
+    return support::cast<StructuredType>(element);
+}
+
+meta::Class const& StructuredType::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+StructuredType StructuredType::create(Model const& model, UUID const& id)
+{
+    return support::create<StructuredType>(model, id);
+}
+
+StructuredType::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+StructuredType::Impl::~Impl() = default;
+
+void StructuredType::Impl::setVobjName(string const& vobjName)
+{
+    support::setScalar(*this, m_vobjName, VOBJ_NAME, vobjName);
+}
+
+std::unique_ptr<ElementMap<ustring, Property>> StructuredType::Impl::makeOwnedAttributes(Impl* owner)
+{
+    auto const keyOf = [](ModelElement::Impl* member) {
+        return static_cast<Property::Impl*>(member)->getName();
+    };
+    return std::make_unique<ElementMap<ustring, Property>>(owner, keyOf, OWNED_ATTRIBUTES);
+}
+
+ElementMap<ustring, Property>& StructuredType::Impl::getOwnedAttributes() const
+{
+    return support::shownCollection(*this, m_ownedAttributes, &Impl::makeOwnedAttributes);
+}
+
+std::unique_ptr<ElementMultimap<ustring, Operation>> StructuredType::Impl::makeOwnedOperations(Impl* owner)
+{
+    auto const keyOf = [](ModelElement::Impl* member) {
+        return static_cast<Operation::Impl*>(member)->getName();
+    };
+    return std::make_unique<ElementMultimap<ustring, Operation>>(owner, keyOf, OWNED_OPERATIONS);
+}
+
+ElementMultimap<ustring, Operation>& StructuredType::Impl::getOwnedOperations() const
+{
+    return support::shownCollection(*this, m_ownedOperations, &Impl::makeOwnedOperations);
+}
+
+void StructuredType::Impl::setVobjCompactDisplay(bool vobjCompactDisplay)
+{
+    support::setScalar(*this, m_vobjCompactDisplay, VOBJ_COMPACT_DISPLAY, vobjCompactDisplay);
+}
+
+std::unique_ptr<PrimitiveSequence<string>> StructuredType::Impl::makeVobjDispCategories(Impl* owner)
+{
+    return std::make_unique<PrimitiveSequence<string>>(owner, false, VOBJ_DISP_CATEGORIES);
+}
+
+PrimitiveSequence<string>& StructuredType::Impl::getVobjDispCategories() const
+{
+    return support::shownCollection(*this, m_vobjDispCategories, &Impl::makeVobjDispCategories);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::StructuredType::Impl, tarn::kiln::meta::Type::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::StructuredType::Impl, tarn::kiln::meta::Type::Impl>;

@@ -1,0 +1,80 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/TypeImpl.h"
+
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/PackageImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Keyed.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const Type::Impl::IS_VOBJ_HIDDEN{
+    .index = 2};
+
+constinit Slot const Type::Impl::OWNING_PACKAGE{
+    .index = 3, .opposite = &Package::Impl::OWNED_TYPES};
+
+Type Type::cast(ModelElement const& element)
+{
+    return support::cast<Type>(element);
+}
+
+meta::Class const& Type::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+Type Type::create(Model const& model, UUID const& id)
+{
+    return support::create<Type>(model, id);
+}
+
+Type::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+Type::Impl::~Impl() = default;
+
+void Type::Impl::setIsVobjHidden(bool vobjHidden)
+{
+    support::setScalar(*this, m_isVobjHidden, IS_VOBJ_HIDDEN, vobjHidden);
+}
+
+Package Type::Impl::getOwningPackage() const
+{
+    return Package(getOwningPackageImpl());
+}
+
+Package::Impl* Type::Impl::getOwningPackageImpl() const
+{
+    return support::containerOf<Package::Impl>(*this, OWNING_PACKAGE);
+}
+
+bool Type::Impl::hasOwningPackage() const
+{
+    return getOwningPackageImpl() && getOwningPackageImpl()->isLive();
+}
+
+void Type::Impl::setOwningPackage(Package const& owningPackage)
+{
+    support::setContainer(*this, OWNING_PACKAGE, owningPackage.getImpl(), [&] {
+        support::requireFreeKey(owningPackage->getOwnedTypes(), getName());
+    });
+}
+
+void Type::Impl::setName(ustring const& name)
+{
+    support::changeKey(
+        *this, getName(), name, getOwningPackage(), OWNING_PACKAGE,
+        [&] { support::requireFreeKey(getOwningPackage()->getOwnedTypes(), name); },
+        [&] { NamedElement::Impl::setName(name); });
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::Type::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::Type::Impl, tarn::kiln::meta::NamedElement::Impl>;

@@ -1,0 +1,79 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/TypedElementImpl.h"
+
+#include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const TypedElement::Impl::TYPE{
+    .index = 2};
+
+constinit Slot const TypedElement::Impl::LOWER{
+    .index = 3};
+
+constinit Slot const TypedElement::Impl::UPPER{
+    .index = 4};
+
+constinit Slot const TypedElement::Impl::IS_ORDERED{
+    .index = 5};
+
+TypedElement TypedElement::cast(ModelElement const& element)
+{
+    return support::cast<TypedElement>(element);
+}
+
+meta::Class const& TypedElement::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+TypedElement TypedElement::create(Model const& model, UUID const& id)
+{
+    return support::create<TypedElement>(model, id);
+}
+
+TypedElement::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+TypedElement::Impl::~Impl() = default;
+
+Type TypedElement::Impl::getType() const
+{
+    return Type(support::resolve(*this, m_type, TYPE));
+}
+
+bool TypedElement::Impl::hasType() const
+{
+    return m_type && m_type.get()->isLive();
+}
+
+void TypedElement::Impl::setType(Type const& type)
+{
+    support::setReference(*this, m_type, TYPE, type.getImpl());
+}
+
+void TypedElement::Impl::setLower(std::uint32_t lower)
+{
+    support::setScalar(*this, m_lower, LOWER, lower);
+}
+
+void TypedElement::Impl::setUpper(std::uint32_t upper)
+{
+    support::setScalar(*this, m_upper, UPPER, upper);
+}
+
+void TypedElement::Impl::setIsOrdered(bool ordered)
+{
+    support::setScalar(*this, m_isOrdered, IS_ORDERED, ordered);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::TypedElement::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::TypedElement::Impl, tarn::kiln::meta::NamedElement::Impl>;

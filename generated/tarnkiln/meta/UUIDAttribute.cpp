@@ -1,0 +1,44 @@
+// Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
+#include "tarnkiln/meta/UUIDAttributeImpl.h"
+
+#include "tarnkiln/support/DispatchSteps.h"
+#include "tarnkiln/support/Handle.h"
+#include "tarnkiln/support/Unbuilt.h"
+
+namespace tarn::kiln::meta {
+
+constinit Slot const UUIDAttribute::Impl::VALUE{
+    .index = 3};
+
+UUIDAttribute UUIDAttribute::cast(ModelElement const& element)
+{
+    return support::cast<UUIDAttribute>(element);
+}
+
+meta::Class const& UUIDAttribute::metaClass()
+{
+    return support::unbuiltClass();
+}
+
+UUIDAttribute UUIDAttribute::create(Model const& model, UUID const& id)
+{
+    return support::create<UUIDAttribute>(model, id);
+}
+
+UUIDAttribute::Impl::Impl(Model const& model, UUID const& id)
+    : Dispatched(model, id)
+{
+}
+
+UUIDAttribute::Impl::~Impl() = default;
+
+void UUIDAttribute::Impl::setValue(UUID const& value)
+{
+    support::setScalar(*this, m_value, VALUE, value);
+}
+}  // namespace tarn::kiln::meta
+
+template class tarn::kiln::support::Record<
+    tarn::kiln::meta::UUIDAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
+template class tarn::kiln::support::Dispatched<
+    tarn::kiln::meta::UUIDAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;

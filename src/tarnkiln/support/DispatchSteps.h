@@ -1,0 +1,309 @@
+/// \file
+/// The bodies of `Dispatched` and `Record`.
+///
+/// Only the source of a class includes this; see Dispatch.h.
+#pragma once
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/support/Dispatch.h"
+#include "tarnkiln/support/RowSteps.h"
+
+#include <boost/optional.hpp>
+
+#include <type_traits>
+
+namespace tarn::kiln::support {
+
+/// Calls `step(steps)` for the row whose property is at `slot`; false if there is none.
+template <class Rows, class Step> bool atSlot(Slot const& slot, Step step)
+{
+    return Rows::any([&](auto row) {
+        using Row = Steps<decltype(row)>;
+        return &Row::slot() == &slot && (step(Row()), true);
+    });
+}
+
+/// Calls `step(steps, row)` for the row of `property`; false if there is none.
+template <class Rows, class Step> bool atRow(meta::Property const& property, Step step)
+{
+    return Rows::any([&](auto row) {
+        using Row = Steps<decltype(row)>;
+        return isPropertyOf(Row::slot(), property) && (step(Row(), row), true);
+    });
+}
+
+/// Calls `step(steps)` for the row of `property`; false if there is none.
+template <class Rows, class Step> bool atProperty(meta::Property const& property, Step step)
+{
+    return atRow<Rows>(property, [&](auto steps, auto /*row*/) { step(steps); });
+}
+
+/// Whether `tag` allows to read `property`.
+inline bool mayRead(meta::Property const& property, internal::ReflectionPrivateTag const& tag)
+{
+    return property && (property->isPublicAccessor() || !(tag == ModelElement::Impl::PUBLIC_ACCESS));
+}
+
+/// Whether `tag` allows to set `property`.
+inline bool maySet(meta::Property const& property, internal::ReflectionPrivateTag const& tag)
+{
+    if (!property || !(tag == ModelElement::Impl::PUBLIC_ACCESS))
+        return static_cast<bool>(property);
+    return property->isPublicMutator() && !(property->isReadOnly() && !property->isSetOnce());
+}
+
+/// What the row `Row` keeps in `record`.
+template <class Row, class Record> auto& oldValueOf(Record& record)
+{
+    return static_cast<std::conditional_t<std::is_const_v<Record>, OldValue<Row> const,
+                                          OldValue<Row>>&>(record)
+        .old;
+}
+
+template <class Owner, class Base> Record<Owner, Base>::~Record() = default;
+
+template <class Owner, class Base>
+bool Record<Owner, Base>::revertUnchanged(ModelElement::Impl* element)
+{
+    Owner::Rows::each([&](auto row) {
+        using Row = Steps<decltype(row)>;
+        unsigned long const index = Row::slot().index;
+        if (this->isSlotChanged(index) && Row::isReverted(static_cast<Owner const&>(*element), *this,
+                                                          oldValueOf<decltype(row)>(*this)))
+            this->clearModified(index);
+    });
+    return Base::revertUnchanged(element);
+}
+
+template <class Owner, class Base>
+Value Record<Owner, Base>::getOldValue(meta::Property const& property,
+                                       internal::ReflectionPrivateTag const& tag) const
+{
+    boost::optional<Value> value;
+    atRow<typename Owner::Rows>(property, [&](auto steps, auto row) {
+        if (this->isSlotChanged(steps.slot().index))
+            value = steps.old(*this, oldValueOf<decltype(row)>(*this), property);
+        else
+            value = Value::createEmptyValue(property);
+    });
+    return value ? *value : Base::getOldValue(property, tag);
+}
+
+template <class Derived, class Base>
+meta::Class const& Dispatched<Derived, Base>::getMetaClass() const
+{
+    return Derived::Handle::metaClass();
+}
+
+template <class Derived, class Base> void Dispatched<Derived, Base>::invalidate()
+{
+    Derived::Rows::each([&](auto row) {
+        if (AbstractOwnedCollection* const made = Steps<decltype(row)>::collection(self()))
+            this->collectionInvalidated(made);
+    });
+    Base::invalidate();
+}
+
+template <class Derived, class Base>
+bool Dispatched<Derived, Base>::hasPropertyValue(meta::Property const& property,
+                                                 internal::ReflectionPrivateTag const& tag) const
+{
+    bool has = false;
+    if (mayRead(property, tag) &&
+        atProperty<typename Derived::Rows>(property, [&](auto row) { has = row.has(self()); }))
+        return has;
+    return Base::hasPropertyValue(property, tag);
+}
+
+template <class Derived, class Base>
+Value Dispatched<Derived, Base>::getPropertyValue(meta::Property const& property,
+                                                  internal::ReflectionPrivateTag const& tag) const
+{
+    boost::optional<Value> value;
+    if (mayRead(property, tag))
+        atProperty<typename Derived::Rows>(
+            property, [&](auto row) { value = row.get(self(), property, tag); });
+    return value ? *value : Base::getPropertyValue(property, tag);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::setPropertyValue(meta::Property const& property, Value const& value,
+                                                 internal::ReflectionPrivateTag const& tag)
+{
+    bool done = false;
+    if (maySet(property, tag))
+        atProperty<typename Derived::Rows>(property,
+                                           [&](auto row) { done = row.set(self(), value); });
+    if (!done)
+        Base::setPropertyValue(property, value, tag);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::doDestroy(bool keepIncoming, bool multiModel)
+{
+    Derived::Rows::each([&](auto row) {
+        Steps<decltype(row)>::destroy(self(), keepIncoming, multiModel);
+    });
+    if constexpr (!std::is_same_v<Base, ModelElement::Impl>)
+        Base::doDestroy(keepIncoming, multiModel);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::inverseAdd(ModelElement const& element,
+                                           meta::Property const& property)
+{
+    if (!atProperty<typename Derived::Rows>(
+            property, [&](auto row) { row.inverseAdd(self(), element); }))
+        Base::inverseAdd(element, property);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::inverseRemove(ModelElement const& element,
+                                              meta::Property const& property)
+{
+    if (!atProperty<typename Derived::Rows>(
+            property, [&](auto row) { row.inverseRemove(self(), element); }))
+        Base::inverseRemove(element, property);
+}
+
+template <class Derived, class Base>
+bool Dispatched<Derived, Base>::inverseContainsProxyTo(ModelElement const& element,
+                                                       meta::Property const& property) const
+{
+    bool contains = false;
+    if (atProperty<typename Derived::Rows>(
+            property, [&](auto row) { contains = row.inverseContains(self(), element); }))
+        return contains;
+    return Base::inverseContainsProxyTo(element, property);
+}
+
+template <class Derived, class Base> void Dispatched<Derived, Base>::disassociateIncoming()
+{
+    Derived::Rows::each([&](auto row) { Steps<decltype(row)>::disassociate(self()); });
+    Base::disassociateIncoming();
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::convertReferencesToProxies(bool multiModel,
+                                                           boost::optional<ProxyId>& cachedId)
+{
+    Derived::Rows::each([&](auto row) {
+        Steps<decltype(row)>::convertReferences(self(), multiModel, cachedId);
+    });
+    Base::convertReferencesToProxies(multiModel, cachedId);
+}
+
+template <class Derived, class Base> void Dispatched<Derived, Base>::basicDisassociateAll()
+{
+    Derived::Rows::each([&](auto row) { Steps<decltype(row)>::drop(self()); });
+    Base::basicDisassociateAll();
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::convertToProxy(meta::Property const& property, ProxyId const& id,
+                                               ModelElement const& element)
+{
+    if (!atProperty<typename Derived::Rows>(
+            property, [&](auto row) { row.convertToProxy(self(), id, element); }))
+        Base::convertToProxy(property, id, element);
+}
+
+template <class Derived, class Base>
+ModelElement::Impl::Changes* Dispatched<Derived, Base>::createChanges() const
+{
+    return new ModelElement::Impl::Changes(this->getUuid(), this->getModel(), this->getMetaClass(),
+                                           Derived::SLOTS);
+}
+
+template <class Derived, class Base>
+ModelElement::Impl::Storage* Dispatched<Derived, Base>::createStorage() const
+{
+    return new typename Derived::Storage(this->getUuid(), this->getModel(), this->getMetaClass(),
+                                         Derived::SLOTS);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::copyValue(ModelElement::Impl::Storage* storage,
+                                          unsigned long index) const
+{
+    auto& record = static_cast<typename Derived::Storage&>(*storage);
+    bool const found = Derived::Rows::any([&](auto row) {
+        using Row = Steps<decltype(row)>;
+        return Row::slot().index == index &&
+               (Row::copyOld(self(), oldValueOf<decltype(row)>(record)), true);
+    });
+    if (!found)
+        Base::copyValue(storage, index);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::copyStateFromStorage(ModelElement::Impl::Storage* storage)
+{
+    auto& record = static_cast<typename Derived::Storage&>(*storage);
+    Derived::Rows::each([&](auto row) {
+        using Row = Steps<decltype(row)>;
+        if (record.isSlotChanged(Row::slot().index))
+            Row::restore(self(), oldValueOf<decltype(row)>(record));
+    });
+    Base::copyStateFromStorage(storage);
+}
+
+template <class Derived, class Base>
+meta::Property Dispatched<Derived, Base>::getPropertyByIndex(unsigned long index) const
+{
+    meta::Property property;
+    bool const found = Derived::Rows::any([&](auto row) {
+        Slot const& slot = Steps<decltype(row)>::slot();
+        if (slot.index != index)
+            return false;
+        if (slot.property)
+            property = slot.property();
+        return true;
+    });
+    return found ? property : Base::getPropertyByIndex(index);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::inverseAddSlot(ModelElement const& element, Slot const& slot)
+{
+    if (!atSlot<typename Derived::Rows>(slot,
+                                        [&](auto row) { row.inverseAdd(self(), element); }))
+        Base::inverseAddSlot(element, slot);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::inverseRemoveSlot(ModelElement const& element, Slot const& slot)
+{
+    if (!atSlot<typename Derived::Rows>(slot,
+                                        [&](auto row) { row.inverseRemove(self(), element); }))
+        Base::inverseRemoveSlot(element, slot);
+}
+
+template <class Derived, class Base>
+bool Dispatched<Derived, Base>::inverseContainsProxyToSlot(ModelElement const& element,
+                                                           Slot const& slot) const
+{
+    bool contains = false;
+    if (atSlot<typename Derived::Rows>(
+            slot, [&](auto row) { contains = row.inverseContains(self(), element); }))
+        return contains;
+    return Base::inverseContainsProxyToSlot(element, slot);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::convertToProxySlot(Slot const& slot, ProxyId const& id,
+                                                   ModelElement const& element)
+{
+    if (!atSlot<typename Derived::Rows>(
+            slot, [&](auto row) { row.convertToProxy(self(), id, element); }))
+        Base::convertToProxySlot(slot, id, element);
+}
+
+template <class Derived, class Base>
+void Dispatched<Derived, Base>::visitReferences(
+    ModelElement::Impl::ReferenceVisitor const& visit) const
+{
+    Derived::Rows::each([&](auto row) { Steps<decltype(row)>::visit(self(), visit); });
+    Base::visitReferences(visit);
+}
+}  // namespace tarn::kiln::support
