@@ -1,12 +1,11 @@
 #include "tarnkiln/kernel/ElementImpl.h"
 
 #include <boost/random/mersenne_twister.hpp>
-#include <boost/random/random_device.hpp>
-#include <boost/random/seed_seq.hpp>
 #include <boost/random/uniform_int_distribution.hpp>
 
 #include <array>
 #include <cstdint>
+#include <random>
 #include <vector>
 
 namespace tarn::kiln {
@@ -27,7 +26,7 @@ thread_local Deletions deletions;
 
 boost::random::mt19937 seededGenerator()
 {
-    boost::random::random_device device;
+    std::random_device device; // Boost's would be the one thing for which we need its library
     std::array<std::uint32_t, boost::random::mt19937::state_size> words;
     for (std::uint32_t& word : words)
         word = device();

@@ -64,7 +64,7 @@ public:
 
     /// A random UUID of version 4 from the calling thread's own generator.
     ///
-    /// \throws boost::random's entropy error if the system has no random device.
+    /// \throws std::exception  if the system has no random device.
     static UUID generateNewUuid();
 
 protected:
