@@ -76,7 +76,8 @@ TEST(PrimitiveSequenceSnapshot, ErasesAtAPositionAndGoesOnBehindIt)
 
     ASSERT_EQ(next, sequence.begin());
     EXPECT_EQ(*next, 2);
-    EXPECT_EQ(sequence.erase(next), sequence.end());
+    auto const last = sequence.erase(next);
+    EXPECT_EQ(last, sequence.end());
     EXPECT_TRUE(sequence.empty());
 }
 
