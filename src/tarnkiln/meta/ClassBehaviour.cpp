@@ -16,12 +16,14 @@ bool isOnChain(Class::Impl const* from, Type::Impl const* wanted)
 {
     constexpr int USUAL_DEPTH = 64;
     Class::Impl const* at = from;
-    for (int depth = 0; at && depth < USUAL_DEPTH; ++depth, at = at->getSuperclassImpl()) {
+    for (int depth = 0; at && depth < USUAL_DEPTH; ++depth, at = at->getSuperclassImpl())
+    {
         if (at == wanted)
             return true;
     }
     std::unordered_set<Class::Impl const*> seen;
-    for (; at && seen.insert(at).second; at = at->getSuperclassImpl()) {
+    for (; at && seen.insert(at).second; at = at->getSuperclassImpl())
+    {
         if (at == wanted)
             return true;
     }
@@ -33,7 +35,8 @@ template <class Ask> auto firstOnChain(Class::Impl const* from, Ask ask) -> decl
 {
     std::unordered_set<Class::Impl const*> seen;
     Class above;
-    for (Class::Impl const* at = from; at && seen.insert(at).second; at = above.getImpl()) {
+    for (Class::Impl const* at = from; at && seen.insert(at).second; at = above.getImpl())
+    {
         if (auto answer = ask(*at); answer != decltype(answer)())
             return answer;
         above = at->getSuperclass();

@@ -8,7 +8,8 @@ namespace {
 /// The first live literal, by name, that `suits`.
 template <class Suits> EnumLiteral findLiteral(Enum::Impl const& enumeration, Suits suits)
 {
-    for (auto const& [name, literal] : enumeration.getLiterals()) {
+    for (auto const& [name, literal] : enumeration.getLiterals())
+    {
         if (literal && suits(*literal.getImpl()))
             return literal;
     }
@@ -23,8 +24,7 @@ EnumLiteral Enum::Impl::findLiteralByValue(int value) const
 
 EnumLiteral Enum::Impl::findLiteralByPublicIdentifier(ustring const& identifier) const
 {
-    return findLiteral(*this, [&](auto const& literal) {
-        return literal.getPublicIdentifier() == identifier;
-    });
+    return findLiteral(
+        *this, [&](auto const& literal) { return literal.getPublicIdentifier() == identifier; });
 }
 }  // namespace tarn::kiln::meta

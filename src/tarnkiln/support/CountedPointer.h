@@ -16,20 +16,15 @@ public:
     using Target = Impl;
 
     CountedPointer() = default;
-    explicit CountedPointer(Impl* target)
-        : m_target(target)
+    explicit CountedPointer(Impl* target) : m_target(target)
     {
         if (m_target)
             m_target->addRef();
     }
-    CountedPointer(CountedPointer const& other)
-        : CountedPointer(other.m_target)
-    {
-    }
+    CountedPointer(CountedPointer const& other) : CountedPointer(other.m_target) {}
     CountedPointer(CountedPointer&& other) noexcept
         : m_target(std::exchange(other.m_target, nullptr))
-    {
-    }
+    {}
     ~CountedPointer()
     {
         if (m_target)

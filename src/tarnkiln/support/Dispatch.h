@@ -57,6 +57,7 @@ public:
     bool inverseContainsProxyToSlot(ModelElement const& element, Slot const& slot) const override;
     void convertToProxySlot(Slot const& slot, ProxyId const& id,
                             ModelElement const& element) override;
+    ModelElement::Impl* basicGetReference(Slot const& slot) const override;
     void visitReferences(ModelElement::Impl::ReferenceVisitor const& visit) const override;
 
 private:

@@ -41,7 +41,8 @@ template <class Rows, class Step> bool atProperty(meta::Property const& property
 /// Whether `tag` allows to read `property`.
 inline bool mayRead(meta::Property const& property, internal::ReflectionPrivateTag const& tag)
 {
-    return property && (property->isPublicAccessor() || !(tag == ModelElement::Impl::PUBLIC_ACCESS));
+    return property &&
+           (property->isPublicAccessor() || !(tag == ModelElement::Impl::PUBLIC_ACCESS));
 }
 
 /// Whether `tag` allows to set `property`.
@@ -55,8 +56,9 @@ inline bool maySet(meta::Property const& property, internal::ReflectionPrivateTa
 /// What the row `Row` keeps in `record`.
 template <class Row, class Record> auto& oldValueOf(Record& record)
 {
-    return static_cast<std::conditional_t<std::is_const_v<Record>, OldValue<Row> const,
-                                          OldValue<Row>>&>(record)
+    return static_cast<
+               std::conditional_t<std::is_const_v<Record>, OldValue<Row> const, OldValue<Row>>&>(
+               record)
         .old;
 }
 
@@ -68,8 +70,8 @@ bool Record<Owner, Base>::revertUnchanged(ModelElement::Impl* element)
     Owner::Rows::each([&](auto row) {
         using Row = Steps<decltype(row)>;
         unsigned long const index = Row::slot().index;
-        if (this->isSlotChanged(index) && Row::isReverted(static_cast<Owner const&>(*element), *this,
-                                                          oldValueOf<decltype(row)>(*this)))
+        if (this->isSlotChanged(index) && Row::isReverted(static_cast<Owner const&>(*element),
+                                                          *this, oldValueOf<decltype(row)>(*this)))
             this->clearModified(index);
     });
     return Base::revertUnchanged(element);
@@ -141,9 +143,8 @@ void Dispatched<Derived, Base>::setPropertyValue(meta::Property const& property,
 template <class Derived, class Base>
 void Dispatched<Derived, Base>::doDestroy(bool keepIncoming, bool multiModel)
 {
-    Derived::Rows::each([&](auto row) {
-        Steps<decltype(row)>::destroy(self(), keepIncoming, multiModel);
-    });
+    Derived::Rows::each(
+        [&](auto row) { Steps<decltype(row)>::destroy(self(), keepIncoming, multiModel); });
     if constexpr (!std::is_same_v<Base, ModelElement::Impl>)
         Base::doDestroy(keepIncoming, multiModel);
 }
@@ -152,8 +153,8 @@ template <class Derived, class Base>
 void Dispatched<Derived, Base>::inverseAdd(ModelElement const& element,
                                            meta::Property const& property)
 {
-    if (!atProperty<typename Derived::Rows>(
-            property, [&](auto row) { row.inverseAdd(self(), element); }))
+    if (!atProperty<typename Derived::Rows>(property,
+                                            [&](auto row) { row.inverseAdd(self(), element); }))
         Base::inverseAdd(element, property);
 }
 
@@ -161,8 +162,8 @@ template <class Derived, class Base>
 void Dispatched<Derived, Base>::inverseRemove(ModelElement const& element,
                                               meta::Property const& property)
 {
-    if (!atProperty<typename Derived::Rows>(
-            property, [&](auto row) { row.inverseRemove(self(), element); }))
+    if (!atProperty<typename Derived::Rows>(property,
+                                            [&](auto row) { row.inverseRemove(self(), element); }))
         Base::inverseRemove(element, property);
 }
 
@@ -187,9 +188,8 @@ template <class Derived, class Base>
 void Dispatched<Derived, Base>::convertReferencesToProxies(bool multiModel,
                                                            boost::optional<ProxyId>& cachedId)
 {
-    Derived::Rows::each([&](auto row) {
-        Steps<decltype(row)>::convertReferences(self(), multiModel, cachedId);
-    });
+    Derived::Rows::each(
+        [&](auto row) { Steps<decltype(row)>::convertReferences(self(), multiModel, cachedId); });
     Base::convertReferencesToProxies(multiModel, cachedId);
 }
 
@@ -266,8 +266,7 @@ meta::Property Dispatched<Derived, Base>::getPropertyByIndex(unsigned long index
 template <class Derived, class Base>
 void Dispatched<Derived, Base>::inverseAddSlot(ModelElement const& element, Slot const& slot)
 {
-    if (!atSlot<typename Derived::Rows>(slot,
-                                        [&](auto row) { row.inverseAdd(self(), element); }))
+    if (!atSlot<typename Derived::Rows>(slot, [&](auto row) { row.inverseAdd(self(), element); }))
         Base::inverseAddSlot(element, slot);
 }
 
@@ -294,9 +293,18 @@ template <class Derived, class Base>
 void Dispatched<Derived, Base>::convertToProxySlot(Slot const& slot, ProxyId const& id,
                                                    ModelElement const& element)
 {
-    if (!atSlot<typename Derived::Rows>(
-            slot, [&](auto row) { row.convertToProxy(self(), id, element); }))
+    if (!atSlot<typename Derived::Rows>(slot,
+                                        [&](auto row) { row.convertToProxy(self(), id, element); }))
         Base::convertToProxySlot(slot, id, element);
+}
+
+template <class Derived, class Base>
+ModelElement::Impl* Dispatched<Derived, Base>::basicGetReference(Slot const& slot) const
+{
+    ModelElement::Impl* target = nullptr;
+    if (atSlot<typename Derived::Rows>(slot, [&](auto row) { target = row.reference(self()); }))
+        return target;
+    return Base::basicGetReference(slot);
 }
 
 template <class Derived, class Base>

@@ -91,8 +91,7 @@ void setReference(ModelElement::Impl& element, CountedPointer<Target>& field, Sl
 }
 
 /// The container, if the element is held by the property opposite of `slot`; else null.
-template <class Target>
-Target* containerOf(ModelElement::Impl const& element, Slot const& slot)
+template <class Target> Target* containerOf(ModelElement::Impl const& element, Slot const& slot)
 {
     if (!element.containerImpl() || element.getContainment() != Feature(*slot.opposite))
         return nullptr;
@@ -111,7 +110,8 @@ void setContainer(ModelElement::Impl& element, Slot const& slot, Target* contain
     Target* const present = containerOf<Target>(element, slot);
     if (container == present || !element.isLive())
         return;
-    if (container) {
+    if (container)
+    {
         refuseProxy(*container);
         requireFree();
         element.checkCircularContainment(ModelElement(container));
@@ -125,7 +125,8 @@ void setContainer(ModelElement::Impl& element, Slot const& slot, Target* contain
     JoiningTransaction transaction(element);
     element.notifyModifying(slot.index);
     element.makeUncontained();
-    if (container && container->isLive()) {
+    if (container && container->isLive())
+    {
         element.basicSetContainer(container, *slot.opposite, ModelElement::Impl::NO_INDEX);
         element._inverseAddThis(container, *slot.opposite, /*force=*/true);
     }
@@ -145,7 +146,8 @@ Collection& madeCollection(Owner const& owner, LazyCollection<Collection>& field
     if (Collection* const present = field.get())
         return *present;
     bool const first = field.publish(make(const_cast<Owner*>(&owner)));
-    if constexpr (std::is_base_of_v<ReferenceCollection, Collection>) {
+    if constexpr (std::is_base_of_v<ReferenceCollection, Collection>)
+    {
         if (first)
             owner._loadCollectionContents(field.get());
     }
@@ -162,7 +164,8 @@ Collection& shownCollection(Owner const& owner, LazyCollection<Collection>& fiel
     {
         collection.removeProxy(proxy);
     };
-    if constexpr (keepsProxiesAside) {
+    if constexpr (keepsProxiesAside)
+    {
         if (!owner.getModelImpl()->isParsing())
             collection.resolveAll();
     }

@@ -14,8 +14,7 @@ class JoiningTransaction
 public:
     explicit JoiningTransaction(ModelElement::Impl const& element)
         : m_transaction(element.getModelImpl()->beginTransaction(/*revertible=*/false))
-    {
-    }
+    {}
 
     void commit() { m_transaction.commit(); }
 

@@ -28,7 +28,8 @@ inline bool isPropertyOf(Slot const& slot, meta::Property const& property)
 template <class Target> typename Target::Impl* targetOf(ModelElement const& element)
 {
     auto* const target = dynamic_cast<typename Target::Impl*>(element.getImpl());
-    if (!target && element.getImpl()) {
+    if (!target && element.getImpl())
+    {
         meta::Class const& expected = Target::metaClass();
         reportException(tarnkiln::messages::CannotCastIncompatibleTypes(
             expected ? expected->getQualifiedName() : ustring()));
@@ -62,22 +63,22 @@ template <Slot const& SLOT> struct NoSteps
     }
     static void convertToProxy(auto& /*element*/, ProxyId const& /*id*/,
                                ModelElement const& /*other*/)
-    {
-    }
+    {}
     /// Leaves the elements that refer back.
     static void disassociate(auto& /*element*/) {}
     static void convertReferences(auto& /*element*/, bool /*multiModel*/,
                                   boost::optional<ProxyId>& /*cachedId*/)
-    {
-    }
+    {}
     /// Destroys what is contained and drops all references, each announced.
     static void destroy(auto& /*element*/, bool /*keepIncoming*/, bool /*multiModel*/) {}
     /// Drops all references without a word.
     static void drop(auto& /*element*/) {}
-    static void visit(auto const& /*element*/, ModelElement::Impl::ReferenceVisitor const& /*visit*/)
-    {
-    }
+    static void visit(auto const& /*element*/,
+                      ModelElement::Impl::ReferenceVisitor const& /*visit*/)
+    {}
     static AbstractOwnedCollection* collection(auto const& /*element*/) { return nullptr; }
+    /// The target of a single reference, unresolved.
+    static ModelElement::Impl* reference(auto const& /*element*/) { return nullptr; }
     /// Stores `value`; false if the property has no setter.
     static bool set(auto& /*element*/, Value const& /*value*/) { return false; }
 };
@@ -196,6 +197,7 @@ struct SingleReferenceSteps : FieldSteps<FIELD, SLOT>
         return true;
     }
     static void drop(Owner& element) { element.*FIELD = Pointer(); }
+    static ModelElement::Impl* reference(Owner const& element) { return (element.*FIELD).get(); }
     static void visit(Owner const& element, ModelElement::Impl::ReferenceVisitor const& visit)
     {
         if (element.*FIELD)
@@ -264,7 +266,8 @@ struct Steps<Reference<Target, FIELD, SLOT, SETTER>> : SingleReferenceSteps<Targ
                                   boost::optional<ProxyId>& cachedId)
     {
         Pointer const target = element.*FIELD;
-        if (multiModel && SLOT.opposite && leavesProxy(element, target.get())) {
+        if (multiModel && SLOT.opposite && leavesProxy(element, target.get()))
+        {
             if (!cachedId)
                 cachedId = element._getPersistentProxyId();
             element._convertToProxy(target.get(), *SLOT.opposite, *cachedId);
@@ -348,6 +351,7 @@ struct Steps<Container<Target, SLOT, SETTER>> : NoSteps<SLOT>
     {
         return true;
     }
+    static Element* reference(Element const& element) { return container(element); }
 
 private:
     static Element* container(Element const& element)
@@ -356,8 +360,8 @@ private:
     }
     static Element* oldContainer(ModelElement::Impl::Storage const& record)
     {
-        bool const wasHeld = record.isContainerChanged() &&
-                             record.getOldContainment() == Feature(*SLOT.opposite);
+        bool const wasHeld =
+            record.isContainerChanged() && record.getOldContainment() == Feature(*SLOT.opposite);
         return wasHeld ? record.getOldContainer().getImpl() : nullptr;
     }
 };
@@ -396,7 +400,10 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
         value.setReflective();
         return value;
     }
-    static bool isPlain() { return !SLOT.composite && !(SLOT.opposite && SLOT.opposite->composite); }
+    static bool isPlain()
+    {
+        return !SLOT.composite && !(SLOT.opposite && SLOT.opposite->composite);
+    }
 
     static void copyOld(Owner const& element, auto& old)
     {
@@ -432,7 +439,8 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
         ModelElement const proxy =
             ModelElement::createProxy(element.getModel(), other->getMetaClass(), id);
         GenericCollectionInterface* const shown = collection.getGenericInterface();
-        if (shown->isSequenceInterface()) {
+        if (shown->isSequenceInterface())
+        {
             int const place = static_cast<GenericSequenceInterface*>(shown)->genericIndexOf(other);
             if (place >= 0)
                 collection.replaceProxy(proxy, static_cast<unsigned long>(place));
@@ -458,7 +466,8 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
         std::vector<ModelElement> const present = members(element);
         if (!isPlain() || present.empty())
             return;
-        for (ModelElement const& member : present) {
+        for (ModelElement const& member : present)
+        {
             if (!multiModel || !SLOT.opposite || !leavesProxy(element, member.getImpl()))
                 continue;
             if (!cachedId)

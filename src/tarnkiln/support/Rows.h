@@ -28,8 +28,7 @@ template <auto FIELD> using FieldOwner = typename MemberTraits<decltype(FIELD)>:
 
 /// Stands for the old value of a row that keeps none of its own.
 struct NoOldValue
-{
-};
+{};
 
 /// A required plain value; `SETTER` takes it.
 template <auto FIELD, Slot const& SLOT, auto SETTER> struct Scalar
@@ -85,11 +84,13 @@ template <class... Rows> struct RowList
 {
     /// What all rows keep in the record of a transaction.
     struct OldValues : OldValue<Rows>...
-    {
-    };
+    {};
 
     /// Whether `step(row)` is true for a row; asks no further ones.
-    template <class Step> static bool any([[maybe_unused]] Step step) { return (step(Rows{}) || ...); }
+    template <class Step> static bool any([[maybe_unused]] Step step)
+    {
+        return (step(Rows{}) || ...);
+    }
     /// Calls `step(row)` for each row.
     template <class Step> static void each([[maybe_unused]] Step step) { (step(Rows{}), ...); }
 };
