@@ -38,5 +38,8 @@ public:
 
 protected:
     using AbstractOwnedCollection::AbstractOwnedCollection;
+
+    /// The type that the property declares; empty while there is no property.
+    meta::Type getPropertyType() const;
 };
 }  // namespace tarn::kiln

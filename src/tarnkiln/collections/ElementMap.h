@@ -83,4 +83,8 @@ public:
 private:
     ElementMap& m_map;
 };
+
+#define TARNKILN_DECLARE(K) extern template class ElementMap<K, ModelElement>;
+TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
+#undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

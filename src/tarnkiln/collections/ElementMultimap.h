@@ -85,4 +85,8 @@ public:
 private:
     ElementMultimap& m_map;
 };
+
+#define TARNKILN_DECLARE(K) extern template class ElementMultimap<K, ModelElement>;
+TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
+#undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

@@ -486,5 +486,6 @@ template <class T> void ElementSequence<T>::countOut(ModelElement const& element
         m_filter->remove(element.getImpl()->getUuid());
 }
 
+extern template class TypedReferenceCollection<ModelElement, std::vector<ModelElement>>;
 extern template class ElementSequence<ModelElement>;
 }  // namespace tarn::kiln

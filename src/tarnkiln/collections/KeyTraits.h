@@ -2,7 +2,7 @@
 /// How the keys of keyed collections travel in a `Value`.
 #pragma once
 #include "tarnkiln/Export.h"
-#include "tarnkiln/collections/TotalLess.h"
+#include "tarnkiln/collections/KeyTypes.h"
 #include "tarnkiln/kernel/Types.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/meta/Property.h"
@@ -10,8 +10,8 @@
 
 namespace tarn::kiln::internal {
 
-/// Keys of the type `K` as values. Defined for the integers, `double`, `ustring`, `string` and
-/// `UUID`; a further key type needs a specialisation.
+/// Keys of the type `K` as values. Defined for the types of `KeyTypes.h`; a further one needs
+/// a specialisation.
 template <class K> struct TARNKILN_EXPORT KeyTraits
 {
     /// An enumeration value is a key of type `unsigned long`.
@@ -29,18 +29,7 @@ template <class K> struct TARNKILN_EXPORT KeyTraits
 /// The type of the property that qualifies `collectionProperty`; empty if that is not known.
 TARNKILN_EXPORT meta::Type qualifierTypeOf(meta::Property const& collectionProperty);
 
-#define TARNKILN_KEY_TRAITS(K) extern template struct KeyTraits<K>
-TARNKILN_KEY_TRAITS(int);
-TARNKILN_KEY_TRAITS(signed char);
-TARNKILN_KEY_TRAITS(short);
-TARNKILN_KEY_TRAITS(long);
-TARNKILN_KEY_TRAITS(unsigned int);
-TARNKILN_KEY_TRAITS(unsigned char);
-TARNKILN_KEY_TRAITS(unsigned short);
-TARNKILN_KEY_TRAITS(unsigned long);
-TARNKILN_KEY_TRAITS(double);
-TARNKILN_KEY_TRAITS(ustring);
-TARNKILN_KEY_TRAITS(string);
-TARNKILN_KEY_TRAITS(UUID);
-#undef TARNKILN_KEY_TRAITS
+#define TARNKILN_DECLARE(K) extern template struct KeyTraits<K>;
+TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
+#undef TARNKILN_DECLARE
 }  // namespace tarn::kiln::internal

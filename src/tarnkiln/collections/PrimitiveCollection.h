@@ -11,7 +11,7 @@ namespace tarn::kiln {
 
 /// Holds the container.
 ///
-/// \tparam T  a type with `internal::PrimitiveTraits`.
+/// \tparam T  a type with `internal::PrimitiveTraits`; those of `PrimitiveTypes.h` have it.
 template <class T, class Container>
 class TARNKILN_EXPORT PrimitiveCollection : public AbstractPrimitiveCollection
 {
@@ -31,6 +31,13 @@ public:
 
 protected:
     using AbstractPrimitiveCollection::AbstractPrimitiveCollection;
+
+    /// The type of the property, or that of the collection where the property is not known.
+    meta::Type getEntryType() const
+    {
+        meta::Type const declared = getPropertyType();
+        return declared ? declared : getCollectionType();
+    }
 
     Container m_entries;
 };

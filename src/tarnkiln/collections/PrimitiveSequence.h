@@ -3,6 +3,7 @@
 #pragma once
 #include "tarnkiln/collections/GenericPrimitiveSequenceInterface.h"
 #include "tarnkiln/collections/PrimitiveCollection.h"
+#include "tarnkiln/collections/PrimitiveTypes.h"
 #include "tarnkiln/collections/SequenceIteratorPrimitive.h"
 
 #include <algorithm>
@@ -78,8 +79,7 @@ public:
     // GenericPrimitiveSequenceInterface
     Value genericAt(unsigned long index) override
     {
-        return Traits::toValue(m_sequence[index],
-                               internal::entryTypeOf(m_sequence.getCollectionProperty()));
+        return Traits::toValue(m_sequence[index], m_sequence.getEntryType());
     }
     void genericInsert(Value const& value, unsigned long index) override
     {
@@ -183,4 +183,10 @@ template <class T> GenericPrimitiveInterface* PrimitiveSequence<T>::getGenericIn
 {
     return m_generic.get();
 }
+
+#define TARNKILN_DECLARE(T)                                                                        \
+    extern template class PrimitiveCollection<T, std::vector<T>>;                                  \
+    extern template class PrimitiveSequence<T>;
+TARNKILN_FOR_EACH_PRIMITIVE_TYPE(TARNKILN_DECLARE)
+#undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

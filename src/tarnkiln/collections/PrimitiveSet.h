@@ -2,6 +2,7 @@
 /// An unordered property's collection of plain values.
 #pragma once
 #include "tarnkiln/collections/PrimitiveCollection.h"
+#include "tarnkiln/collections/PrimitiveTypes.h"
 #include "tarnkiln/collections/TotalLess.h"
 
 #include <set>
@@ -69,4 +70,10 @@ template <class T> void PrimitiveSet<T>::erase(T const& value)
     m_entries.erase(removed);
     operation.commit();
 }
+
+#define TARNKILN_DECLARE(T)                                                                        \
+    extern template class PrimitiveCollection<T, std::set<T, internal::TotalLess<T>>>;             \
+    extern template class PrimitiveSet<T>;
+TARNKILN_FOR_EACH_PRIMITIVE_TYPE(TARNKILN_DECLARE)
+#undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

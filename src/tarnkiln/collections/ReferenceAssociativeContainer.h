@@ -2,6 +2,7 @@
 /// What maps and multimaps of elements share.
 #pragma once
 #include "tarnkiln/collections/KeyTraits.h"
+#include "tarnkiln/collections/TotalLess.h"
 #include "tarnkiln/collections/TypedReferenceCollectionWithProxies.h"
 
 #include <functional>

@@ -1,9 +1,9 @@
 #include "tarnkiln/collections/ReferenceCollection.h"
 
-#include "tarnkiln/collections/internal/QualifiedName.h"
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 
@@ -39,8 +39,8 @@ void ReferenceCollection::checkElementClass(ModelElement const& element) const
 {
     if (!acceptsElement(element))
         reportException(tarnkiln::messages::CannotAddIncompatibleTypes(
-            internal::qualifiedNameOf(getElementClass()),
-            internal::qualifiedNameOf(element->getMetaClass())));
+            internal::qualifiedName(getElementClass()),
+            internal::qualifiedName(element->getMetaClass())));
 }
 
 void ReferenceCollection::checkCompatibleModel(ModelElement::Impl* element) const

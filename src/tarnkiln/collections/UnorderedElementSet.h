@@ -174,5 +174,9 @@ UnorderedElementSet<T>::find(ModelElement const& element) const
     return std::find_if(begin(), end(), [&](T const& entry) { return entry == element; });
 }
 
+extern template class TypedReferenceCollection<ModelElement,
+                                               internal::ElementHashSet<ModelElement>>;
+extern template class TypedReferenceCollectionWithProxies<ModelElement,
+                                                          internal::ElementHashSet<ModelElement>>;
 extern template class UnorderedElementSet<ModelElement>;
 }  // namespace tarn::kiln

@@ -55,6 +55,13 @@ public:
     /// Whether there is an object and it is not destroyed.
     explicit operator bool() const noexcept { return m_impl && m_impl->isLive(); }
     bool operator==(ElementHandle const& other) const noexcept { return m_impl == other.m_impl; }
+    /// By UUID, the empty handle first; two objects with one UUID by address.
+    bool operator<(ElementHandle const& other) const noexcept
+    {
+        if (!m_impl || !other.m_impl || m_impl->getUuid() == other.m_impl->getUuid())
+            return std::less<ElementImpl*>()(m_impl, other.m_impl);
+        return m_impl->getUuid() < other.m_impl->getUuid();
+    }
 
     /// The object, alive or dead; null for the empty handle.
     ElementImpl* getElementImpl() const noexcept { return m_impl; }

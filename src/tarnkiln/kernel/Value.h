@@ -15,6 +15,7 @@
 
 #include <boost/optional.hpp>
 
+#include <cstddef>
 #include <vector>
 
 namespace tarn::kiln {

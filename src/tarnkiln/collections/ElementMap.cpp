@@ -1,0 +1,11 @@
+#include "tarnkiln/collections/ElementMap.h"
+
+namespace tarn::kiln {
+
+#define TARNKILN_DEFINE(K)                                                                         \
+    template class ReferenceAssociativeContainer<                                                  \
+        K, ModelElement, std::map<K, ModelElement, internal::TotalLess<K>>>;                       \
+    template class ElementMap<K, ModelElement>;
+TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DEFINE)
+#undef TARNKILN_DEFINE
+}  // namespace tarn::kiln

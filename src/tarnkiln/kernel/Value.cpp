@@ -1,0 +1,224 @@
+#include "tarnkiln/kernel/Value.h"
+
+#include "tarnkiln/Assert.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/internal/TypeKind.h"
+#include "tarnkiln/kernel/internal/ValuePayload.h"
+#include "tarnkiln/kernel/internal/qualifiedName.h"
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/Enum.h"
+#include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/EnumLiteralImpl.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/StandardTypes.h"
+
+#include <exception>
+#include <memory>
+#include <utility>
+
+namespace tarn::kiln {
+
+using internal::qualifiedName;
+using tarnkiln::messages::CannotCastIncompatibleTypes;
+using tarnkiln::messages::InvalidValue;
+
+Value Value::createEnumValue(meta::EnumLiteral const& literal)
+{
+    TARNKILN_ASSERT(literal.getElementImpl(), "only a literal has a value");
+    return Value(literal->getParentEnum(), static_cast<long>(literal->getValue()));
+}
+
+Value Value::createOptionalEnumValue(meta::Property const& property,
+                                     boost::optional<long> const& number)
+{
+    Value result(ValueMeta(typeOf(property), ValueFlags::OptionalSingle), nullptr);
+    if (!internal::isEnumType(result.m_type))
+        result.failCast();
+    result.setPayload(number ? new unsigned long(static_cast<unsigned long>(*number)) : nullptr);
+    return result;
+}
+
+Value Value::createCollectionValue(meta::Property const& property,
+                                   AbstractOwnedCollection* collection)
+{
+    Value result(ValueMeta(property), nullptr);
+    result.m_data = collection;
+    return result;
+}
+
+Value Value::createEmptyValue(meta::Type const& type, bool /*required*/)
+{
+    if (!internal::classImpl(type))
+        reportException(InvalidValue());
+    Value result(ValueMeta(type), nullptr);
+    result.storeElement(ModelElement());
+    return result;
+}
+
+Value Value::createEmptyValue(meta::Property const& property)
+{
+    if (!property.getElementImpl())
+        reportException(InvalidValue());
+    if (property->getUpper() > 1)
+        reportException(CannotCastIncompatibleTypes(qualifiedName(property->getType())));
+    return createEmptyValue(property->getType(), property->getLower() == 1);
+}
+
+Value::Value(ValueMeta const& meta, std::nullptr_t) : ValueMeta(meta) {}
+
+Value::Value(Value const& other)
+    : ValueMeta(other),
+      m_data(other.m_cloner ? other.m_cloner(other.m_data) : other.m_data),
+      m_deleter(other.m_deleter),
+      m_cloner(other.m_cloner),
+      m_comparator(other.m_comparator),
+      m_extractor(other.m_extractor)
+{}
+
+Value::Value(Value&& other) noexcept
+    : ValueMeta(other),
+      m_data(std::exchange(other.m_data, nullptr)),
+      m_deleter(other.m_deleter),
+      m_cloner(other.m_cloner),
+      m_comparator(other.m_comparator),
+      m_extractor(other.m_extractor)
+{}
+
+Value::~Value()
+{
+    if (m_deleter)
+        m_deleter(m_data);
+}
+
+Value& Value::operator=(Value const& other)
+{
+    if (this != &other)
+        *this = Value(other);
+    return *this;
+}
+
+// Leaves the extractor alone, so that the copy assignment does too.
+Value& Value::operator=(Value&& other) noexcept
+{
+    if (this != &other)
+    {
+        ValueMeta::operator=(other);
+        std::swap(m_data, other.m_data);
+        std::swap(m_deleter, other.m_deleter);
+        std::swap(m_cloner, other.m_cloner);
+        std::swap(m_comparator, other.m_comparator);
+    }
+    return *this;
+}
+
+bool Value::operator==(Value const& other) const
+{
+    if (m_type != other.m_type || m_flags != other.m_flags)
+        return false;
+    if (!m_comparator)
+        return m_data == other.m_data;
+    // A collection of an element is never equal to a container, and must not be read as one.
+    if (m_data && other.m_data && m_comparator != other.m_comparator)
+        return false;
+    return m_comparator(m_data, other.m_data);
+}
+
+boost::optional<long> Value::getEnumNumber() const
+{
+    if (m_flags != ValueFlags::Single && m_flags != ValueFlags::OptionalSingle)
+        failCast();
+
+    if (internal::isEnumType(m_type))
+    {
+        auto const* const number = payload<unsigned long>();
+        return number ? boost::optional<long>(static_cast<long>(*number)) : boost::none;
+    }
+    meta::StandardTypes::ensureInitialized();
+    if (m_type != meta::StandardTypes::integerMeta)
+        failCast();
+    auto const* const number = payload<int>();
+    return number ? boost::optional<long>(*number) : boost::none;
+}
+
+void Value::checkCompatibleWithProperty(meta::Property const& property) const
+{
+    if (!property)
+        reportException(InvalidValue());
+    meta::Type const type = property->getType();
+    if (!type)
+        reportException(InvalidValue());
+
+    ValueFlags const flags = doGetFlags(property);
+    bool const isClearedEnum = internal::isEnumType(type) && isAbsent() &&
+                               flags == ValueFlags::OptionalSingle &&
+                               m_flags == ValueFlags::OptionalSingle;
+    auto const* const own = internal::classImpl(m_type);
+    bool const isTypeSuitable =
+        own && internal::classImpl(type) ? own->isA(type) : m_type == type || isClearedEnum;
+    if (!isTypeSuitable)
+        reportException(CannotCastIncompatibleTypes(qualifiedName(type)));
+
+    bool const isGivenForOptional =
+        flags == ValueFlags::OptionalSingle && m_flags == ValueFlags::Single;
+    if (flags != m_flags && !isGivenForOptional)
+        reportException(InvalidValue());
+}
+
+bool Value::isCompatibleWithProperty(meta::Property const& property) const
+{
+    try
+    {
+        checkCompatibleWithProperty(property);
+    }
+    catch (std::exception const&)
+    {
+        return false;
+    }
+    return true;
+}
+
+meta::Type const& Value::started(meta::Type const& type)
+{
+    meta::StandardTypes::ensureInitialized();
+    return type;
+}
+
+meta::Type Value::typeOf(meta::Property const& property)
+{
+    TARNKILN_ASSERT(property.getElementImpl(), "only a property has values");
+    return property->getType();
+}
+
+void Value::failCast() const
+{
+    reportException(CannotCastIncompatibleTypes(qualifiedName(m_type)));
+}
+
+void Value::storeElement(ModelElement const& element)
+{
+    setPayload(new ModelElement(element));
+}
+
+void Value::checkElement(meta::Class const& required, IsInstance isInstance) const
+{
+    auto const* const own = internal::classImpl(m_type);
+    if (m_flags > ValueFlags::Single || !own || !own->isLive())
+        failCast();
+
+    if (required)
+    {
+        if (!own->isA(required))
+            failCast();
+        return;
+    }
+    // No metaclass, no inheritance to ask about: the object has to tell.
+    ModelElement const* const held = element();
+    if (held && held->getElementImpl() && !isInstance(*held))
+        failCast();
+}
+
+ModelElement const* Value::element() const
+{
+    return payload<ModelElement>();
+}
+}  // namespace tarn::kiln
