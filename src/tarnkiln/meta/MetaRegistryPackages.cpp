@@ -1,0 +1,72 @@
+/// \file
+/// The registry's root packages and families.
+#include "tarnkiln/meta/MetaRegistry.h"
+#include "tarnkiln/meta/PackageImpl.h"
+#include "tarnkiln/meta/internal/MetaUri.h"
+#include "tarnkiln/services/internal/LoadMetamodelFamily.h"
+
+namespace tarn::kiln::meta {
+namespace {
+
+Package findPackage(std::map<ustring, Package> const& packages, ustring const& key)
+{
+    auto const position = packages.find(key);
+    return position != packages.end() ? position->second : Package();
+}
+}  // namespace
+
+void MetaRegistry::registerRootPackage(Package const& package)
+{
+    ustring const uri = package->getUri();
+    m_rootPackages[uri] = package;
+    if (boost::optional<ustring> const family = internal::familyOfUri(uri))
+        m_families[*family] = package;
+}
+
+void MetaRegistry::unregisterRootPackage(ustring const& uri)
+{
+    m_rootPackages.erase(uri);
+    if (boost::optional<ustring> const family = internal::familyOfUri(uri))
+        m_families.erase(*family);
+}
+
+Package MetaRegistry::getRootPackage(ustring const& uri) const
+{
+    LockedConstModel const locked(*this);
+    return findPackage(m_rootPackages, uri);
+}
+
+Package MetaRegistry::getRootPackage(ustring const& uri, bool load)
+{
+    Package const found = getRootPackage(uri);
+    if (found || !load)
+        return found;
+    boost::optional<ustring> const family = internal::familyOfUri(uri);
+    if (!family)
+        return found;
+    internal::loadMetamodelFamily(*family);
+    return getRootPackage(uri);
+}
+
+Package MetaRegistry::getPackageForFamily(ustring const& family)
+{
+    auto const find = [&] {
+        LockedConstModel const locked(*this);
+        return findPackage(m_families, family);
+    };
+    // A dead package counts as found: only one that was never registered is loaded.
+    if (Package const found = find(); found.getImpl())
+        return found;
+    internal::loadMetamodelFamily(family);
+    return find();
+}
+
+bool MetaRegistry::isVersionCurrentForFamily(ustring const& uri)
+{
+    boost::optional<ustring> const family = internal::familyOfUri(uri);
+    if (!family)
+        return false;
+    Package const current = getPackageForFamily(*family);
+    return current && internal::versionOfUri(uri) == internal::versionOfUri(current->getUri());
+}
+}  // namespace tarn::kiln::meta

@@ -1,0 +1,134 @@
+/// \file
+/// The registry's table of types.
+#include "tarnkiln/Assert.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/ModelElementBuilder.h"
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/DataType.h"
+#include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/MetaRegistry.h"
+#include "tarnkiln/meta/PrimitiveType.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/StructuredTypeImpl.h"
+#include "tarnkiln/meta/TypeImpl.h"
+
+namespace tarn::kiln::meta {
+namespace {
+
+/// Makes the collections of `type` that are otherwise made at their first use, which may come from
+/// several threads at once and finds the model frozen.
+///
+/// The kind of type is told by its C++ class: while the metamodel of metamodels is being built the
+/// classes have no superclasses yet.
+void materialise(Type const& type)
+{
+    if (StructuredType const structured = StructuredType::cast(type))
+    {
+        structured->getOwnedAttributes();
+        structured->getOwnedOperations();
+    }
+    if (Enum const enumeration = Enum::cast(type))
+        enumeration->getLiterals();
+}
+}  // namespace
+
+void MetaRegistry::registerType(Type const& type, ustring const& name,
+                                CollectionInstantiator collection, BuilderInstantiator builder)
+{
+    LockedModel const locked(*this);
+    TypeEntry const entry{builder, collection, type};
+    auto const [position, inserted] = m_types.emplace(name, entry);
+    if (!inserted)
+    {
+        // What a rolled back metamodel leaves behind must not keep it from being built again.
+        if (position->second.type)
+            reportException(tarnkiln::messages::DuplicateTypeInRegistry(name));
+        position->second = entry;
+    }
+    if (m_initialised && type)
+        materialise(type);
+}
+
+void MetaRegistry::registerType(Type const& type, CollectionInstantiator collection,
+                                BuilderInstantiator builder)
+{
+    registerType(type, type->getQualifiedName(), collection, builder);
+}
+
+void MetaRegistry::registerType(Type const& type, BuilderInstantiator builder)
+{
+    registerType(type, /*collection=*/nullptr, builder);
+}
+
+void MetaRegistry::unregisterType(Type const& type, ustring const& name)
+{
+    auto const position = m_types.find(name);
+    if (position != m_types.end() && position->second.type == type)
+        m_types.erase(position);
+}
+
+void MetaRegistry::updateCollectionInstantiator(Type const& type, CollectionInstantiator collection)
+{
+    LockedModel const locked(*this);
+    auto const position = m_types.find(type->getQualifiedName());
+    TARNKILN_ASSERT(position != m_types.end(), "only a registered type can be updated");
+    position->second.collectionInstantiator = collection;
+}
+
+Type MetaRegistry::getType(ustring const& name) const
+{
+    LockedConstModel const locked(*this);
+    auto const position = m_types.find(name);
+    if (position != m_types.end())
+        return position->second.type;
+    // Metamodels of old spell these two names so.
+    if (name == u"meta.Model")
+        return Model::metaClass();
+    if (name == u"meta.ModelElement")
+        return ModelElement::metaClass();
+    return {};
+}
+
+Class MetaRegistry::getClass(ustring const& name) const
+{
+    return Class::cast(getType(name));
+}
+
+PrimitiveType MetaRegistry::getPrimitiveType(ustring const& name) const
+{
+    return PrimitiveType::cast(getType(name));
+}
+
+std::unique_ptr<ModelElement::Builder> MetaRegistry::instantiateBuilder(Class const& metaClass,
+                                                                        Model const& model) const
+{
+    LockedConstModel const locked(*this);
+    if (!metaClass)
+        return nullptr;
+    TypeEntry const* const entry = findEntry(metaClass);
+    return entry && entry->builderInstantiator ? entry->builderInstantiator(model) : nullptr;
+}
+
+AbstractOwnedCollection* MetaRegistry::instantiateDynamicCollection(ModelElement const& owner,
+                                                                    Property const& property) const
+{
+    LockedConstModel const locked(*this);
+    Type const type = property->getType();
+    if (!type)
+        return nullptr;
+    bool const isDataType = DataType::cast(type).getImpl() != nullptr;
+    bool const isOurs = type->getModelImpl() == m_model.getImpl();
+    if (isDataType && (!isOurs || property->getQualifiedBy()))
+        return nullptr;
+    TypeEntry const* const entry = findEntry(type);
+    return entry && entry->collectionInstantiator ? entry->collectionInstantiator(owner, property)
+                                                  : nullptr;
+}
+
+MetaRegistry::TypeEntry const* MetaRegistry::findEntry(Type const& type) const
+{
+    auto const position = m_types.find(type->getQualifiedName());
+    bool const found = position != m_types.end() && position->second.type == type;
+    return found ? &position->second : nullptr;
+}
+}  // namespace tarn::kiln::meta
