@@ -171,11 +171,11 @@ template <class T> T ValueAccess<T>::read(Value const& value)
 }
 
 #define TARNKILN_VALUE_CONTAINERS(T)                                                               \
-    template struct ValueAccess<std::vector<T>>;                                                   \
-    template struct ValueAccess<std::set<T>>;
+    template struct TARNKILN_EXPORT ValueAccess<std::vector<T>>;                                   \
+    template struct TARNKILN_EXPORT ValueAccess<std::set<T>>;
 #define TARNKILN_VALUE_ACCESS(T)                                                                   \
-    template struct ValueAccess<T>;                                                                \
-    template struct ValueAccess<boost::optional<T>>;                                               \
+    template struct TARNKILN_EXPORT ValueAccess<T>;                                                \
+    template struct TARNKILN_EXPORT ValueAccess<boost::optional<T>>;                               \
     TARNKILN_VALUE_CONTAINERS(T)
 
 TARNKILN_VALUE_ACCESS(bool)

@@ -53,9 +53,9 @@ template <class Collection> Collection& ValueAccess<Collection&>::read(Value con
     return *collection;
 }
 
-template struct ValueAccess<ReferenceCollection&>;
-template struct ValueAccess<AbstractPrimitiveCollection&>;
-template struct ValueAccess<StringToStringMap&>;
+template struct TARNKILN_EXPORT ValueAccess<ReferenceCollection&>;
+template struct TARNKILN_EXPORT ValueAccess<AbstractPrimitiveCollection&>;
+template struct TARNKILN_EXPORT ValueAccess<StringToStringMap&>;
 }  // namespace internal
 
 std::vector<Value> Value::extractEntryValues() const
