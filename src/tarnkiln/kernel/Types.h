@@ -1,7 +1,10 @@
 /// \file
 /// The texts and identifiers of the whole library.
 #pragma once
+// Else the templates that the library instantiates for UUIDs would be as hidden as their argument.
+#pragma GCC visibility push(default)
 #include <boost/uuid/uuid.hpp>
+#pragma GCC visibility pop
 
 #include <string>
 
