@@ -19,14 +19,14 @@ void MetaRegistry::registerRootPackage(Package const& package)
 {
     ustring const uri = package->getUri();
     m_rootPackages[uri] = package;
-    if (boost::optional<ustring> const family = internal::familyOfUri(uri))
+    if (std::optional<ustring> const family = internal::familyOfUri(uri))
         m_families[*family] = package;
 }
 
 void MetaRegistry::unregisterRootPackage(ustring const& uri)
 {
     m_rootPackages.erase(uri);
-    if (boost::optional<ustring> const family = internal::familyOfUri(uri))
+    if (std::optional<ustring> const family = internal::familyOfUri(uri))
         m_families.erase(*family);
 }
 
@@ -41,7 +41,7 @@ Package MetaRegistry::getRootPackage(ustring const& uri, bool load)
     Package const found = getRootPackage(uri);
     if (found || !load)
         return found;
-    boost::optional<ustring> const family = internal::familyOfUri(uri);
+    std::optional<ustring> const family = internal::familyOfUri(uri);
     if (!family)
         return found;
     internal::loadMetamodelFamily(*family);
@@ -63,7 +63,7 @@ Package MetaRegistry::getPackageForFamily(ustring const& family)
 
 bool MetaRegistry::isVersionCurrentForFamily(ustring const& uri)
 {
-    boost::optional<ustring> const family = internal::familyOfUri(uri);
+    std::optional<ustring> const family = internal::familyOfUri(uri);
     if (!family)
         return false;
     Package const current = getPackageForFamily(*family);

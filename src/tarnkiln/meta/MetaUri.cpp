@@ -12,7 +12,7 @@ namespace tarn::kiln::meta {
 
 std::pair<ustring, ustring> MetaRegistry::parseUri(ustring const& uri)
 {
-    boost::optional<ustring> const family = internal::familyOfUri(uri);
+    std::optional<ustring> const family = internal::familyOfUri(uri);
     if (!family)
         return {};
     return {*internal::versionOfUri(uri), *family};
@@ -42,19 +42,19 @@ std::size_t endOfFamily(ustring const& uri)
 }
 }  // namespace
 
-boost::optional<ustring> familyOfUri(ustring const& uri)
+std::optional<ustring> familyOfUri(ustring const& uri)
 {
     std::size_t const end = endOfFamily(uri);
     if (end == ustring::npos)
-        return boost::none;
+        return std::nullopt;
     return uri.substr(meta::SchemaBase.size(), end - meta::SchemaBase.size());
 }
 
-boost::optional<ustring> versionOfUri(ustring const& uri)
+std::optional<ustring> versionOfUri(ustring const& uri)
 {
     std::size_t const familyEnd = endOfFamily(uri);
     if (familyEnd == ustring::npos)
-        return boost::none;
+        return std::nullopt;
     std::size_t const begin = familyEnd + 1;
     return uri.substr(begin, uri.find(u'/', begin) - begin);
 }

@@ -1,0 +1,166 @@
+/// \file
+/// The collections that the registry makes for properties.
+#include "tarnkiln/collections/AbstractOwnedCollection.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/DataTypeImpl.h"
+#include "tarnkiln/meta/MetaRegistry.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/StandardTypes.h"
+#include "tests/meta/RegistrySession.h"
+
+namespace tarn::kiln::meta {
+namespace {
+
+using tarnkiln::tests::RegistryElement;
+using tarnkiln::tests::RegistrySession;
+
+MetaRegistry& registry()
+{
+    return MetaRegistry::getInstance();
+}
+
+/// Holds nothing; tells who asked for it.
+class IdleCollection : public AbstractOwnedCollection
+{
+public:
+    IdleCollection(ModelElement const& owner, Property const& property)
+        : AbstractOwnedCollection(owner.getImpl(), property)
+    {}
+
+    Type getCollectionType() const override { return {}; }
+    void copyContents(AbstractOwnedCollection const&) override {}
+};
+
+class OtherIdleCollection final : public IdleCollection
+{
+public:
+    using IdleCollection::IdleCollection;
+};
+
+template <class Collection>
+AbstractOwnedCollection* make(ModelElement const& owner, Property const& property)
+{
+    return new Collection(owner, property);
+}
+
+/// A type and a property of that type, in the registry for the length of a test.
+template <class Handle> class DynamicCollection : public ::testing::Test
+{
+protected:
+    using Collection = std::unique_ptr<AbstractOwnedCollection>;
+
+    DynamicCollection()
+    {
+        RegistrySession session;
+        property->setType(type.get());
+        session.commit();
+    }
+
+    Collection instantiate(ModelElement const& owner = {}) const
+    {
+        return Collection(registry().instantiateDynamicCollection(owner, property));
+    }
+
+    RegistryElement<Handle> type{u"Listed"};
+    RegistryElement<Property> property{u"list"};
+};
+
+using CollectionOfAClass = DynamicCollection<Class>;
+using CollectionOfADataType = DynamicCollection<DataType>;
+
+TEST_F(CollectionOfAClass, IsMadeForTheGivenOwner)
+{
+    registry().registerType(type.get(), make<IdleCollection>, nullptr);
+
+    Collection const collection = instantiate(type.get());
+
+    ASSERT_NE(dynamic_cast<IdleCollection*>(collection.get()), nullptr);
+    EXPECT_EQ(collection->getOwner(), type.get().getImpl());
+    EXPECT_EQ(collection->getCollectionProperty(), property.get());
+}
+
+TEST_F(CollectionOfAClass, IsASnapshotWithoutAnOwner)
+{
+    registry().registerType(type.get(), make<IdleCollection>, nullptr);
+
+    Collection const collection = instantiate();
+
+    ASSERT_NE(collection, nullptr);
+    EXPECT_EQ(collection->getOwner(), nullptr);
+}
+
+TEST_F(CollectionOfAClass, IsNullWithoutAnEntry)
+{
+    EXPECT_EQ(instantiate(), nullptr);
+}
+
+TEST_F(CollectionOfAClass, IsNullForAnEntryWithoutInstantiator)
+{
+    registry().registerType(type.get(), nullptr);
+
+    EXPECT_EQ(instantiate(), nullptr);
+}
+
+TEST_F(CollectionOfAClass, IsNullIfTheEntryIsOfANamesake)
+{
+    RegistryElement<Class> const namesake(u"Listed");
+    registry().registerType(namesake.get(), make<IdleCollection>, nullptr);
+
+    EXPECT_EQ(instantiate(), nullptr);
+}
+
+TEST_F(CollectionOfAClass, IsNullForAPropertyWithoutType)
+{
+    RegistryElement<Property> const untyped(u"untyped");
+
+    EXPECT_EQ(registry().instantiateDynamicCollection(ModelElement(), untyped.get()), nullptr);
+}
+
+TEST_F(CollectionOfAClass, ComesFromTheUpdatedInstantiator)
+{
+    registry().registerType(type.get(), make<IdleCollection>, nullptr);
+    registry().updateCollectionInstantiator(type.get(), make<OtherIdleCollection>);
+
+    Collection const collection = instantiate();
+
+    EXPECT_NE(dynamic_cast<OtherIdleCollection*>(collection.get()), nullptr);
+}
+
+TEST_F(CollectionOfADataType, IsMadeByTheInstantiatorOfATypeOfTheRegistry)
+{
+    registry().registerType(type.get(), make<IdleCollection>, nullptr);
+
+    Collection const collection = instantiate();
+
+    EXPECT_NE(dynamic_cast<IdleCollection*>(collection.get()), nullptr);
+}
+
+TEST_F(CollectionOfADataType, IsNullForATypeOfAnotherModel)
+{
+    registry().registerType(type.get(), make<IdleCollection>, nullptr);
+    Model const model = Model::createRegistryModel(u"test://types");
+    DataType const foreign = DataType::create(model);
+    foreign->setName(u"Listed");
+    Property const list = Property::create(model);
+    list->setType(foreign);
+
+    EXPECT_EQ(registry().instantiateDynamicCollection(ModelElement(), list), nullptr);
+}
+
+TEST_F(CollectionOfADataType, IsNullForAQualifiedProperty)
+{
+    registry().registerType(type.get(), make<IdleCollection>, nullptr);
+    RegistryElement<Property> const key(u"key");
+    {
+        RegistrySession session;
+        key->setType(StandardTypes::stringMeta);
+        key->setUpper(1);
+        property->setQualifiedBy(key);
+        session.commit();
+    }
+
+    EXPECT_EQ(instantiate(), nullptr);
+}
+}  // namespace
+}  // namespace tarn::kiln::meta
