@@ -47,14 +47,14 @@ public:
     /// `long`.
     /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  (qualified name of `type`) if such
     ///     values are not of that type.
-    template <internal::Payload T> Value(meta::Type const& type, T const& payload);
+    template <support::Payload T> Value(meta::Type const& type, T const& payload);
 
     /// The same, of the property's type. The shape does not depend on the property.
-    template <internal::PlainPayload T>
+    template <support::PlainPayload T>
     static Value createPrimitiveValue(meta::Property const& property, T const& payload);
     /// The same for an element. The type is the property's, not the class of the element, so that
     /// two values of a property that hold the same element are equal.
-    template <internal::ElementReference T>
+    template <support::ElementReference T>
     static Value createElementValue(meta::Property const& property, T const& element);
     /// A `Single` value of the enumeration that has the literal.
     static Value createEnumValue(meta::EnumLiteral const& literal);
@@ -99,7 +99,7 @@ public:
     ///     type) as `checkCompatible` does, if a collection is asked for and there is none, and if
     ///     the element held is not a `T`.
     template <class T>
-    requires internal::Payload<T> || internal::CollectionReference<T> T getValue()
+    requires support::Payload<T> || support::CollectionReference<T> T getValue()
     const;
 
     /// Fails unless the value may be read as a `T`, its payload aside.
@@ -119,7 +119,7 @@ public:
     /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  (qualified name of the value's
     ///     type)
     template <class T>
-    requires internal::Payload<T> || internal::CollectionReference<T>
+    requires support::Payload<T> || support::CollectionReference<T>
     void checkCompatible() const;
 
     /// The number that stands for a literal: the payload of an enumeration value or of an `Integer`
@@ -157,7 +157,7 @@ public:
     /// @}
 
 private:
-    template <class T> friend struct internal::ValueAccess;
+    template <class T> friend struct support::ValueAccess;
 
     using Deleter = void (*)(void*);
     using Cloner = void* (*)(void*);
@@ -188,46 +188,46 @@ private:
     Extractor m_extractor = nullptr;    ///< Not null only for an unmanaged collection.
 };
 
-template <internal::Payload T>
+template <support::Payload T>
 Value::Value(meta::Type const& type, T const& payload) : Value(ValueMeta(started(type)), nullptr)
 {
-    if constexpr (internal::ElementReference<T>)
+    if constexpr (support::ElementReference<T>)
         storeElement(payload);
     else
-        internal::ValueAccess<T>::store(*this, payload);
+        support::ValueAccess<T>::store(*this, payload);
     checkCompatible<T>();
 }
 
-template <internal::PlainPayload T>
+template <support::PlainPayload T>
 Value Value::createPrimitiveValue(meta::Property const& property, T const& payload)
 {
     return Value(typeOf(property), payload);
 }
 
-template <internal::ElementReference T>
+template <support::ElementReference T>
 Value Value::createElementValue(meta::Property const& property, T const& element)
 {
     return Value(typeOf(property), element);
 }
 
 template <class T>
-requires internal::Payload<T> || internal::CollectionReference<T>
+requires support::Payload<T> || support::CollectionReference<T>
 void Value::checkCompatible() const
 {
-    if constexpr (internal::ElementReference<T>)
+    if constexpr (support::ElementReference<T>)
         checkElement(T::metaClass(), [](ModelElement const& element) {
             return T::cast(element).getElementImpl() != nullptr;
         });
     else
-        internal::ValueAccess<T>::check(*this);
+        support::ValueAccess<T>::check(*this);
 }
 
 template <class T>
-requires internal::Payload<T> || internal::CollectionReference<T> T Value::getValue()
+requires support::Payload<T> || support::CollectionReference<T> T Value::getValue()
 const
 {
     checkCompatible<T>();
-    if constexpr (internal::ElementReference<T>)
+    if constexpr (support::ElementReference<T>)
     {
         ModelElement const* const held = element();
         if (!held || !held->getElementImpl())
@@ -238,6 +238,6 @@ const
         return result;
     }
     else
-        return internal::ValueAccess<T>::read(*this);
+        return support::ValueAccess<T>::read(*this);
 }
 }  // namespace tarn::kiln

@@ -13,7 +13,7 @@
 
 #include <utility>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 namespace {
 
 template <class T> bool isStandardTypeOf(meta::Type const& type)
@@ -25,13 +25,13 @@ template <class T> bool isStandardTypeOf(meta::Type const& type)
 template <class T> bool suits(meta::Type const& type)
 {
     if constexpr (std::same_as<T, long>)
-        return isStandardTypeOf<long>(type) || isEnumType(type);
+        return isStandardTypeOf<long>(type) || internal::isEnumType(type);
     else if constexpr (std::same_as<T, Model>)
         return isStandardTypeOf<Model>(type) ||
                (type.getElementImpl() && type == Model::metaClass());
     else if constexpr (std::same_as<T, meta::Operation>)
     {
-        auto const* const own = classImpl(type);
+        auto const* const own = internal::classImpl(type);
         return own && own->isLive() &&
                (!meta::Operation::metaClass() || own->isA(meta::Operation::metaClass()));
     }
@@ -48,7 +48,7 @@ bool isSingle(Value const& value)
 template <class T> bool isKeptAsLiteral([[maybe_unused]] meta::Type const& type)
 {
     if constexpr (std::same_as<T, long>)
-        return isEnumType(type);
+        return internal::isEnumType(type);
     else
         return std::same_as<T, meta::Language>;
 }
@@ -119,7 +119,7 @@ template <class T> struct Kept<boost::optional<T>> : Kept<T>
 template <class T> void ValueAccess<T>::store(Value& value, T const& payload)
 {
     value.m_flags = PlainAccess<T>::FLAGS;
-    if constexpr (isOptional<T>)
+    if constexpr (isOptionalPayload<T>)
     {
         using Entry = typename T::value_type;
         using Type = typename Kept<Entry>::Type;
@@ -136,7 +136,7 @@ template <class T> void ValueAccess<T>::store(Value& value, T const& payload)
     else
         value.setPayload(new T(payload));
 
-    if constexpr (isContainer<T>)
+    if constexpr (isContainerPayload<T>)
     {
         value.m_managed = false;
         value.m_extractor = typeMapperBasedExtractor<T>;
@@ -151,7 +151,7 @@ template <class T> void ValueAccess<T>::check(Value const& value)
 
 template <class T> T ValueAccess<T>::read(Value const& value)
 {
-    if constexpr (isOptional<T>)
+    if constexpr (isOptionalPayload<T>)
     {
         using Entry = typename T::value_type;
         auto const* const payload = value.payload<typename Kept<Entry>::Type>();
@@ -197,4 +197,4 @@ TARNKILN_VALUE_ACCESS(meta::ExtensionPrototype)
 TARNKILN_VALUE_ACCESS(meta::Language)
 TARNKILN_VALUE_ACCESS(Model)
 TARNKILN_VALUE_CONTAINERS(meta::Operation)
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

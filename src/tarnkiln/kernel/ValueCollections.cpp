@@ -8,7 +8,7 @@
 #include "tarnkiln/meta/StandardTypes.h"
 
 namespace tarn::kiln {
-namespace internal {
+namespace support {
 namespace {
 
 bool isManagedCollection(Value const& value)
@@ -20,12 +20,12 @@ template <class Collection> bool suits(Value const& value);
 
 template <> bool suits<ReferenceCollection>(Value const& value)
 {
-    return isManagedCollection(value) && classImpl(value.getType());
+    return isManagedCollection(value) && internal::classImpl(value.getType());
 }
 
 template <> bool suits<AbstractPrimitiveCollection>(Value const& value)
 {
-    return isManagedCollection(value) && !classImpl(value.getType());
+    return isManagedCollection(value) && !internal::classImpl(value.getType());
 }
 
 template <> bool suits<StringToStringMap>(Value const& value)
@@ -56,7 +56,7 @@ template <class Collection> Collection& ValueAccess<Collection&>::read(Value con
 template struct TARNKILN_EXPORT ValueAccess<ReferenceCollection&>;
 template struct TARNKILN_EXPORT ValueAccess<AbstractPrimitiveCollection&>;
 template struct TARNKILN_EXPORT ValueAccess<StringToStringMap&>;
-}  // namespace internal
+}  // namespace support
 
 std::vector<Value> Value::extractEntryValues() const
 {

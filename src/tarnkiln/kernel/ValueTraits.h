@@ -18,14 +18,14 @@ namespace boost::posix_time {
 class ptime;
 }
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 template <class T, class... Types>
 concept OneOf = (std::same_as<T, Types> || ...);
 
 /// Plain values.
 template <class T>
-concept Scalar =
+concept PlainScalar =
     OneOf<T, bool, signed char, unsigned char, short, unsigned short, int, unsigned int, long,
           unsigned long, double, ustring, string, UUID, boost::posix_time::ptime,
           meta::TransactionOrigin, meta::ExtensionPrototype, meta::Language>;
@@ -35,19 +35,22 @@ template <class T>
 concept ElementReference = std::derived_from<T, ModelElement>;
 
 /// The containers that a value can own. Those of handles are ordered by UUID.
-template <class T> inline constexpr bool isContainer = false;
+template <class T> inline constexpr bool isContainerPayload = false;
 template <class T>
-inline constexpr bool isContainer<std::vector<T>> = Scalar<T> || OneOf<T, Model, meta::Operation>;
+inline constexpr bool isContainerPayload<std::vector<T>> =
+    PlainScalar<T> || OneOf<T, Model, meta::Operation>;
 template <class T>
-inline constexpr bool isContainer<std::set<T>> = Scalar<T> || OneOf<T, Model, meta::Operation>;
+inline constexpr bool isContainerPayload<std::set<T>> =
+    PlainScalar<T> || OneOf<T, Model, meta::Operation>;
 
-template <class T> inline constexpr bool isOptional = false;
+template <class T> inline constexpr bool isOptionalPayload = false;
 template <class T>
-inline constexpr bool isOptional<boost::optional<T>> = Scalar<T> || OneOf<T, Model>;
+inline constexpr bool isOptionalPayload<boost::optional<T>> = PlainScalar<T> || OneOf<T, Model>;
 
 /// What a value can hold besides elements.
 template <class T>
-concept PlainPayload = Scalar<T> || OneOf<T, Model> || isOptional<T> || isContainer<T>;
+concept PlainPayload =
+    PlainScalar<T> || OneOf<T, Model> || isOptionalPayload<T> || isContainerPayload<T>;
 
 /// What a value can be made from.
 template <class T>
@@ -73,4 +76,4 @@ template <class Collection> struct TARNKILN_EXPORT ValueAccess<Collection&>
     static void check(Value const& value);
     static Collection& read(Value const& value);
 };
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support
