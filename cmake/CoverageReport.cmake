@@ -14,7 +14,7 @@ if(TARNKILN_GCOVR)
             --exclude-throw-branches
             --exclude-unreachable-branches
             --exclude-lines-by-pattern ".*TARNKILN_ASSERT\\(.*"
-            --txt --txt-metric branch
+            --txt
             --print-summary
             ${PROJECT_BINARY_DIR}
         WORKING_DIRECTORY ${PROJECT_BINARY_DIR}
