@@ -58,6 +58,8 @@ void ModelElement::Impl::announceContainerChange()
 
 void ModelElement::Impl::recordOldContainer(Storage& storage) const
 {
+    if (isTopLevel() && !storage.isContainerChanged())
+        m_model->m_topLevelElements.reserveReturn();
     storage.setOldContainer(container(), m_containmentFeature);
 }
 
@@ -87,7 +89,7 @@ void ModelElement::Impl::basicSetContainer(Storage const* storage)
 {
     Feature const& feature = storage->getOldContainment();
     if (!feature) {
-        m_model->elementMadeTopLevel(this);
+        m_model->m_topLevelElements.insertReturning(this);
         storeLink(nullptr, Feature());
         return;
     }

@@ -116,7 +116,7 @@ void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)
     model->basicSetModelConstellation(this);
     for (ConstellationListenerHolder const& holder : m_listeners)
         holder.getListener()->modelAdded(ModelConstellation(this), Model(model));
-    if (m_group)
+    if (m_group && !model->getCurrentTransaction())
         model->doBeginTransaction(m_group.get(), m_group->getOrigin());
     m_uriHistory[model->getModelURI()] = UriRecord{model, ustring()};
 }
@@ -214,6 +214,14 @@ void ModelConstellation::Impl::removeConstellationListener(ConstellationListener
 void ModelConstellation::Impl::createTransactionGroup(bool deep,
                                                       meta::TransactionOrigin const& origin)
 {
+    if (m_group) {
+        // a listener begins on a model that is just being added: it joins now
+        for (auto const& [location, model] : m_models) {
+            if (!model->getCurrentTransaction())
+                model->doBeginTransaction(m_group.get(), m_group->getOrigin());
+        }
+        return;
+    }
     m_group = std::make_unique<internal::TransactionGroup>(
         this, deep || isMultiModelConstellation(), origin);
     try {

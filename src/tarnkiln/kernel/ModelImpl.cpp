@@ -103,9 +103,19 @@ void Model::Impl::elementCreated(ModelElement::Impl* element, bool topLevel)
         element->m_uuid = UUID{}; // its destructor must not find the other element
         reportException(tarnkiln::messages::UUIDConflict());
     }
-    if (isRecording())
+    if (topLevel)
+        m_topLevelElements.reserve();
+    bool const recording = isRecording();
+    if (recording)
         m_currentTransaction->elementCreated(element);
-    m_usageProvider->elementCreated(element);
+    try {
+        m_usageProvider->elementCreated(element);
+    }
+    catch (...) {
+        if (recording)
+            m_currentTransaction->forgetCreation(element);
+        throw;
+    }
     if (topLevel)
         m_topLevelElements.insert(element);
 }
@@ -114,8 +124,11 @@ void Model::Impl::elementDestroying(ModelElement::Impl* element)
 {
     validateTransaction();
     if (isRecording()) {
-        if (m_currentTransaction->isDeep())
+        if (m_currentTransaction->isDeep()) {
             m_elements.reserveReturn();
+            if (element->isTopLevel())
+                m_topLevelElements.reserveReturn();
+        }
         m_currentTransaction->elementDestroying(element);
     }
     m_usageProvider->elementDestroying(element);
@@ -158,7 +171,7 @@ void Model::Impl::resurrectElement(ModelElement::Impl* element)
     element->unpinContainer();
     m_elements.insertReturning(element);
     if (element->isTopLevel())
-        m_topLevelElements.insert(element);
+        m_topLevelElements.insertReturning(element);
 }
 
 // ---------------------------------------------------------------------------- listeners
@@ -196,7 +209,7 @@ void Model::Impl::removeListenerFromTransaction(ListenerHolderBase* holder)
 {
     if (m_currentTransaction)
         m_currentTransaction->removeListener(holder);
-    for (auto* telling = m_notifying; telling; telling = telling->getPreviousNotifying())
+    for (auto* telling = m_telling; telling; telling = telling->getPreviousTelling())
         telling->removeListener(holder);
 }
 
@@ -375,6 +388,8 @@ void Model::Impl::destroy()
 {
     if (m_validity == ElementValidity::Invalid || m_validity == ElementValidity::ModelDestroying)
         return;
+    if (m_currentTransaction && m_currentTransaction->isProhibited())
+        reportException(tarnkiln::messages::ChangesProhibited());
     m_validity = ElementValidity::ModelDestroying;
     Transaction const transaction = beginTransaction(/*revertible=*/false);
     removeAllListeners();

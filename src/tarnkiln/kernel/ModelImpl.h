@@ -240,7 +240,7 @@ private:
     support::ElementRegistry m_elements;          ///< Everything the model holds, by UUID; weak.
     std::unordered_set<ModelElement::Impl*> m_proxies; ///< Stand-ins that point to this model.
     internal::TransactionImpl* m_currentTransaction = nullptr;
-    internal::TransactionImpl* m_notifying = nullptr; ///< The innermost that is telling listeners.
+    internal::TransactionImpl* m_telling = nullptr; ///< The last to end of those telling listeners.
     std::vector<std::unique_ptr<ListenerHolderBase>> m_listeners;
     signed char m_transactionDepth = 1; ///< 0 ask the listeners, 1 shallow, 2 deep.
     bool m_freezeOnNotify = false;

@@ -88,5 +88,6 @@ void Model::Impl::transactionEnded()
     m_currentTransaction = nullptr;
     ++m_endedTransactions;
     m_elements.forgetReturns();
+    m_topLevelElements.forgetReturns();
 }
 } // namespace tarn::kiln

@@ -3,11 +3,13 @@
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
 
+#include <algorithm>
 #include <vector>
 
 namespace tarn::kiln::support {
 
-/// A set of handles; each element knows its place in it, so that none is searched.
+/// A set of handles; each element knows its place in it, so that none is searched. Room is kept for
+/// elements that left and may come back, so that their return allocates nothing.
 class TopLevelElements
 {
 public:
@@ -15,9 +17,27 @@ public:
     {
         if (contains(element))
             return;
-        m_elements.emplace_back(element);
-        element->m_topLevelIndex = static_cast<std::uint32_t>(m_elements.size() - 1);
+        reserveFor(m_elements.size() + m_mayReturn + 1);
+        place(element);
     }
+    /// Keeps room for one more element, which is about to be inserted.
+    void reserve() { reserveFor(m_elements.size() + m_mayReturn + 1); }
+    /// Keeps room for one more element, which is about to leave.
+    void reserveReturn()
+    {
+        reserveFor(m_elements.size() + m_mayReturn + 1);
+        ++m_mayReturn;
+    }
+    /// Inserts an element for whose return room was kept.
+    void insertReturning(ModelElement::Impl* element)
+    {
+        if (contains(element))
+            return;
+        place(element);
+        --m_mayReturn;
+    }
+    /// Nothing that left comes back any more.
+    void forgetReturns() { m_mayReturn = 0; }
     /// Drops the handle; the element may die by that.
     void erase(ModelElement::Impl* element)
     {
@@ -47,6 +67,18 @@ public:
     std::size_t size() const { return m_elements.size(); }
 
 private:
+    void place(ModelElement::Impl* element)
+    {
+        m_elements.emplace_back(element);
+        element->m_topLevelIndex = static_cast<std::uint32_t>(m_elements.size() - 1);
+    }
+    void reserveFor(std::size_t count)
+    {
+        if (count > m_elements.capacity())
+            m_elements.reserve(std::max(count, 2 * m_elements.capacity()));
+    }
+
     std::vector<ModelElement> m_elements;
+    std::size_t m_mayReturn = 0;
 };
 } // namespace tarn::kiln::support

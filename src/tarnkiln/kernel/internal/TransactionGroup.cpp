@@ -18,6 +18,29 @@ TransactionImpl& memberOf(Transaction const& pin)
 
 } // namespace
 
+/// The members of a group that has ended; each model knows its own until all listeners are told.
+class TransactionGroup::Ended
+{
+public:
+    explicit Ended(Pins&& pins)
+        : m_pins(std::move(pins))
+    {
+    }
+    Ended(Ended const&) = delete;
+    Ended& operator=(Ended const&) = delete;
+    ~Ended() { forEach(&TransactionImpl::finishTelling); }
+
+    template <class... Arguments>
+    void forEach(void (TransactionImpl::*step)(Arguments...), Arguments... arguments) const
+    {
+        for (Transaction const& pin : m_pins)
+            (memberOf(pin).*step)(arguments...);
+    }
+
+private:
+    Pins const m_pins;
+};
+
 TransactionGroup::TransactionGroup(ModelConstellation::Impl* constellation, bool deep,
                                    meta::TransactionOrigin const& origin)
     : m_constellation(constellation)
@@ -31,7 +54,7 @@ TransactionGroup::~TransactionGroup() = default;
 void TransactionGroup::addMember(TransactionImpl* member)
 {
     m_members.reserve(m_members.size() + 1);
-    m_pins.reserve(m_members.size() + 1);
+    m_pins.reserve(std::max(m_members.size(), m_pins.size()) + 1);
     m_members.push_back(member);
     if (m_ending)
         m_pins.emplace_back(member);
@@ -91,15 +114,15 @@ TransactionResult TransactionGroup::finishCommit(boost::optional<Value> const& m
         m_ending = false;
         return rollBack();
     }
-    Pins const pins = endAll(); // this object may be gone
-    for (Transaction const& pin : pins)
-        memberOf(pin).checkInvariants();
-    for (Transaction const& pin : pins)
-        memberOf(pin).notifyCommitted(message);
-    for (Transaction const& pin : pins)
-        memberOf(pin).runDeferredInvocations();
+    Ended const ended = endAll(); // this object may be gone
+    ended.forEach(&TransactionImpl::checkInvariants);
+    ended.forEach<boost::optional<Value> const&>(&TransactionImpl::notifyCommitted, message);
+    ended.forEach(&TransactionImpl::runDeferredInvocations);
     return TransactionResult::Committed;
 }
+
+// Listeners may destroy models, whose transactions leave the members, and create others. The pins
+// only grow.
 
 bool TransactionGroup::prepareAll(boost::optional<Value> const& message)
 {
@@ -136,12 +159,18 @@ void TransactionGroup::pinMembers()
         m_pins.emplace_back(m_members[i]);
 }
 
-TransactionGroup::Pins TransactionGroup::endAll()
+TransactionGroup::Ended TransactionGroup::endAll()
 {
-    Pins const pins = std::move(m_pins);
     for (TransactionImpl* const member : m_members)
         member->end();
     m_members.clear();
+    return Ended(takePins());
+}
+
+/// Lets the constellation delete this object.
+TransactionGroup::Pins TransactionGroup::takePins()
+{
+    Pins pins = std::move(m_pins);
     if (m_constellation)
         m_constellation->transactionGroupCompleted();
     return pins;
@@ -162,11 +191,9 @@ TransactionResult TransactionGroup::rollBack()
         if (undone != TransactionResult::NotCompleted)
             result = undone;
     }
-    Pins const pins = endAll(); // this object may be gone
-    for (Transaction const& pin : pins)
-        memberOf(pin).checkInvariants();
-    for (Transaction const& pin : pins)
-        memberOf(pin).notifyRolledBack();
+    Ended const ended = endAll(); // this object may be gone
+    ended.forEach(&TransactionImpl::checkInvariants);
+    ended.forEach(&TransactionImpl::notifyRolledBack);
     return result;
 }
 

@@ -29,6 +29,7 @@ public:
     meta::TransactionOrigin const& getOrigin() const { return m_origin; }
 
     void addMember(TransactionImpl* member);
+    bool isEmpty() const { return m_members.empty(); }
     /// The departure may make the rest ready.
     void removeMember(TransactionImpl* member);
 
@@ -40,6 +41,7 @@ public:
     void markRollBackOnly();
 
 private:
+    class Ended;
     using Members = boost::container::small_vector<TransactionImpl*, 2>;
     using Pins = boost::container::small_vector<Transaction, 2>;
 
@@ -51,7 +53,8 @@ private:
     void prohibitChanges();
     void pinMembers();
     /// Ends all members and lets the constellation delete this object.
-    Pins endAll();
+    Ended endAll();
+    Pins takePins();
 
     ModelConstellation::Impl* m_constellation;
     Members m_members; ///< Not owned; those without handles are kept by the group's being open.

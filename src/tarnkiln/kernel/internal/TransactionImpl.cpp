@@ -1,5 +1,6 @@
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 
+#include "tarnkiln/Assert.h"
 #include "tarnkiln/kernel/Listener.h"
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/internal/TransactionGroup.h"
@@ -8,32 +9,53 @@
 
 namespace tarn::kiln::internal {
 
-/// While it lives, listeners that are removed from the model are skipped, although the transaction
-/// is no longer the model's; the model is frozen, if it is to be.
-class TransactionImpl::Notifying
+/// Freezes the model for as long as its listeners are told, if it is to be.
+class TransactionImpl::FrozenForListeners
 {
 public:
-    explicit Notifying(TransactionImpl& transaction)
-        : m_model(*transaction.m_model.getImpl())
-        , m_freezes(transaction.has(FREEZE_ON_NOTIFY))
+    explicit FrozenForListeners(TransactionImpl const& transaction)
+        : m_model(transaction.has(FREEZE_ON_NOTIFY) ? transaction.m_model.getImpl() : nullptr)
     {
-        transaction.m_previousNotifying = m_model.m_notifying;
-        m_model.m_notifying = &transaction;
-        if (m_freezes)
-            ++m_model.m_freezeCount;
+        if (m_model)
+            ++m_model->m_freezeCount;
     }
-    Notifying(Notifying const&) = delete;
-    Notifying& operator=(Notifying const&) = delete;
-    ~Notifying()
+    FrozenForListeners(FrozenForListeners const&) = delete;
+    FrozenForListeners& operator=(FrozenForListeners const&) = delete;
+    ~FrozenForListeners()
     {
-        m_model.m_notifying = m_model.m_notifying->m_previousNotifying;
-        if (m_freezes)
-            --m_model.m_freezeCount;
+        if (m_model)
+            --m_model->m_freezeCount;
     }
 
 private:
-    Model::Impl& m_model;
-    bool m_freezes;
+    Model::Impl* m_model;
+};
+
+/// The group that ends a transaction which stands alone. While it lives, calls from listeners find
+/// it running.
+class TransactionImpl::LocalGroup
+{
+public:
+    explicit LocalGroup(TransactionImpl& transaction)
+        : m_group(nullptr, /*deep=*/false, transaction.m_origin)
+        , m_transaction(&transaction)
+    {
+        m_group.addMember(&transaction);
+        transaction.m_group = &m_group;
+    }
+    LocalGroup(LocalGroup const&) = delete;
+    LocalGroup& operator=(LocalGroup const&) = delete;
+    ~LocalGroup()
+    {
+        if (!m_group.isEmpty()) // otherwise the transaction has ended and may be gone
+            m_transaction->m_group = nullptr;
+    }
+
+    TransactionGroup* operator->() { return &m_group; }
+
+private:
+    TransactionGroup m_group;
+    TransactionImpl* m_transaction;
 };
 
 TransactionImpl::TransactionImpl(Model const& model, TransactionGroup* group,
@@ -64,17 +86,27 @@ bool TransactionImpl::startRecording()
     return true;
 }
 
+/// The callback may replace itself, and may end this transaction, which may be gone then.
 void TransactionImpl::announceFirstChange()
 {
     if (has(HAS_CHANGES) || !m_firstChangeCallback || m_inFirstChangeCallback)
         return;
     struct Guard
     {
-        bool& flag;
-        ~Guard() { flag = false; }
-    } const guard{m_inFirstChangeCallback};
+        TransactionImpl* transaction;
+        Model model;
+        bool isCurrent() const { return model->getCurrentTransaction() == transaction; }
+        ~Guard()
+        {
+            if (isCurrent())
+                transaction->m_inFirstChangeCallback = false;
+        }
+    } const guard{this, m_model};
+    std::function<void()> const callback = m_firstChangeCallback;
     m_inFirstChangeCallback = true;
-    m_firstChangeCallback();
+    callback();
+    if (!guard.isCurrent())
+        reportException(tarnkiln::messages::NoOpenTransaction());
 }
 
 ChangesHolder TransactionImpl::makeRecord(ModelElement::Impl const& element) const
@@ -105,23 +137,30 @@ ModelElement::Impl::Changes* TransactionImpl::findRecord(ModelElement::Impl cons
     return found == m_changes->byUuid.end() ? nullptr : found->second.get();
 }
 
-ModelElement::Impl::Changes& TransactionImpl::addRecord(ModelElement::Impl* element)
+void TransactionImpl::insertRecord(ModelElement::Impl* element, ChangesHolder record)
 {
-    ChangesHolder record = makeRecord(*element);
-    ModelElement::Impl::Changes& result = *record;
     if (has(DEEP) && m_pins.capacity() <= m_changes->byUuid.size())
         m_pins.reserve(2 * m_changes->byUuid.size() + 8);
     if (isDestroyedPredecessor(element))
         m_changes->newcomers.emplace_back(ModelElement(element), std::move(record));
     else
-        m_changes->byUuid.emplace(element->getUuid(), std::move(record));
-    return result;
+        m_changes->byUuid.insert_or_assign(element->getUuid(), std::move(record));
 }
 
-ModelElement::Impl::Changes& TransactionImpl::recordOf(ModelElement::Impl* element)
+/// Lets `fill` write the element's record. A new one is entered last, so that a failure leaves the
+/// transaction as it was.
+template <class Fill>
+void TransactionImpl::record(ModelElement::Impl* element, Fill const& fill)
 {
-    ModelElement::Impl::Changes* const found = findRecord(element);
-    return found ? *found : addRecord(element);
+    if (ModelElement::Impl::Changes* const known = findRecord(element)) {
+        fill(*known);
+    }
+    else {
+        ChangesHolder const made = makeRecord(*element);
+        fill(*made);
+        insertRecord(element, made);
+    }
+    m_flags |= HAS_CHANGES | REPORT_STALE;
 }
 
 void TransactionImpl::elementCreated(ModelElement::Impl* element)
@@ -131,8 +170,20 @@ void TransactionImpl::elementCreated(ModelElement::Impl* element)
     if (has(DESTROY_ALL))
         reportException(tarnkiln::messages::CreateWithDestroyAll());
     announceFirstChange();
-    addRecord(element).setCreated();
-    finishRecording();
+    ChangesHolder const made = makeRecord(*element);
+    made->setCreated();
+    insertRecord(element, made);
+    m_flags |= HAS_CHANGES | REPORT_STALE;
+}
+
+void TransactionImpl::forgetCreation(ModelElement::Impl const* element)
+{
+    if (isDestroyedPredecessor(element))
+        std::erase_if(m_changes->newcomers, [&](auto const& newcomer) {
+            return newcomer.first.getImpl() == element;
+        });
+    else
+        m_changes->byUuid.erase(element->getUuid());
 }
 
 void TransactionImpl::elementDestroying(ModelElement::Impl* element)
@@ -143,10 +194,16 @@ void TransactionImpl::elementDestroying(ModelElement::Impl* element)
     if (!m_destroyedElements)
         m_destroyedElements =
             std::make_unique<std::unordered_map<UUID, ModelElement, UUIDHasher>>();
-    ModelElement::Impl::Changes& record = recordOf(element);
-    m_destroyedElements->emplace(element->getUuid(), ModelElement(element));
-    record.setDestroyed();
-    finishRecording();
+    bool const kept =
+        m_destroyedElements->emplace(element->getUuid(), ModelElement(element)).second;
+    try {
+        record(element, [](ModelElement::Impl::Changes& changes) { changes.setDestroyed(); });
+    }
+    catch (...) {
+        if (kept)
+            m_destroyedElements->erase(element->getUuid());
+        throw;
+    }
 }
 
 void TransactionImpl::allElementsDestroying()
@@ -154,8 +211,7 @@ void TransactionImpl::allElementsDestroying()
     if (!startRecording())
         return;
     announceFirstChange();
-    set(DESTROY_ALL);
-    finishRecording();
+    m_flags |= DESTROY_ALL | HAS_CHANGES | REPORT_STALE;
 }
 
 void TransactionImpl::elementModifying(ModelElement::Impl* element, unsigned long index)
@@ -163,14 +219,14 @@ void TransactionImpl::elementModifying(ModelElement::Impl* element, unsigned lon
     if (index == 0 || !startRecording())
         return;
     announceFirstChange();
-    ModelElement::Impl::Changes& record = recordOf(element);
-    if (!record.isCreated() && (has(DEEP) || !record.isDestroyed())
-        && !record.isSlotChanged(index)) {
+    record(element, [&](ModelElement::Impl::Changes& changes) {
+        if (changes.isCreated() || (!has(DEEP) && changes.isDestroyed())
+            || changes.isSlotChanged(index))
+            return;
         if (has(DEEP))
-            element->copyValue(static_cast<ModelElement::Impl::Storage*>(&record), index);
-        record.setModified(index);
-    }
-    finishRecording();
+            element->copyValue(static_cast<ModelElement::Impl::Storage*>(&changes), index);
+        changes.setModified(index);
+    });
 }
 
 void TransactionImpl::containerChanging(ModelElement::Impl* element)
@@ -178,10 +234,10 @@ void TransactionImpl::containerChanging(ModelElement::Impl* element)
     if (!has(DEEP) || !startRecording())
         return;
     announceFirstChange();
-    ModelElement::Impl::Changes& record = recordOf(element);
-    if (!record.isCreated())
-        element->recordOldContainer(static_cast<ModelElement::Impl::Storage&>(record));
-    finishRecording();
+    record(element, [&](ModelElement::Impl::Changes& changes) {
+        if (!changes.isCreated())
+            element->recordOldContainer(static_cast<ModelElement::Impl::Storage&>(changes));
+    });
 }
 
 void TransactionImpl::addFirstChangeCallback(std::function<void()> const& callback)
@@ -203,20 +259,14 @@ void TransactionImpl::eventEmitted(std::unique_ptr<meta::AbstractDeferredInvocat
 
 // ---------------------------------------------------------------------------- ending
 
+// A listener may drop the last handle: once the group has ended, this object may be gone.
+
 TransactionResult TransactionImpl::commit(boost::optional<Value> const& message)
 {
     if (has(ROLLED_BACK) || has(ENDED))
         return TransactionResult::NotCompleted;
     ++m_commitCount;
-    if (!m_group) {
-        TransactionGroup alone(nullptr, /*deep=*/false, m_origin);
-        alone.addMember(this);
-        return alone.tryCommit(message);
-    }
-    TransactionResult const result = m_group->tryCommit(message);
-    if (result != TransactionResult::NotCompleted)
-        set(ENDED);
-    return result;
+    return m_group ? m_group->tryCommit(message) : LocalGroup(*this)->tryCommit(message);
 }
 
 TransactionResult TransactionImpl::rollBack()
@@ -224,11 +274,7 @@ TransactionResult TransactionImpl::rollBack()
     if (has(ROLLED_BACK) || has(ENDED))
         return TransactionResult::NotCompleted;
     set(ROLL_BACK_ONLY);
-    if (m_group)
-        return m_group->rollBack();
-    TransactionGroup alone(nullptr, /*deep=*/false, m_origin);
-    alone.addMember(this);
-    return alone.rollBack();
+    return m_group ? m_group->rollBack() : LocalGroup(*this)->rollBack();
 }
 
 TransactionResult TransactionImpl::nestedFailed()
@@ -237,15 +283,8 @@ TransactionResult TransactionImpl::nestedFailed()
         return TransactionResult::NotCompleted;
     ++m_commitCount;
     set(ROLL_BACK_ONLY);
-    if (!m_group) {
-        TransactionGroup alone(nullptr, /*deep=*/false, m_origin);
-        alone.addMember(this);
-        return alone.commitIfComplete(boost::none);
-    }
-    TransactionResult const result = m_group->commitIfComplete(boost::none);
-    if (result != TransactionResult::NotCompleted)
-        set(ENDED);
-    return result;
+    return m_group ? m_group->commitIfComplete(boost::none)
+                   : LocalGroup(*this)->commitIfComplete(boost::none);
 }
 
 void TransactionImpl::removeRef()
@@ -282,6 +321,17 @@ void TransactionImpl::end()
         return;
     set(ENDED);
     m_model->transactionEnded();
+    m_previousTelling = std::exchange(m_model->m_telling, this);
+    m_isTelling = true;
+}
+
+void TransactionImpl::finishTelling()
+{
+    if (!std::exchange(m_isTelling, false))
+        return;
+    TARNKILN_ASSERT(m_model->m_telling == this, "transactions tell their listeners inside one "
+                                                "another");
+    m_model->m_telling = m_previousTelling;
 }
 
 void TransactionImpl::abandon()
@@ -328,11 +378,11 @@ std::shared_ptr<ReportData> TransactionImpl::createReport(boost::optional<Value>
                                                has(DEEP), m_deferredInvocations, has(DESTROY_ALL),
                                                m_origin);
     for (auto const& [id, record] : m_changes->byUuid) {
-        if (record->isDestroyed())
-            report->processElement(m_destroyedElements->at(id), record.get());
-        else
-            report->processElement(m_model->findElement(id, FindElementBehavior::Fetch),
-                                   record.get());
+        ModelElement const element = record->isDestroyed()
+                                         ? m_destroyedElements->at(id)
+                                         : m_model->findElement(id, FindElementBehavior::Fetch);
+        if (element.getImpl()) // a listener of another model may have destroyed it since
+            report->processElement(element, record.get());
     }
     for (auto const& [element, record] : m_changes->newcomers)
         report->processElement(element, record.get());
@@ -379,7 +429,7 @@ void TransactionImpl::notifyCommitted(boost::optional<Value> const& message)
 {
     if (!hasNews() || !anyListener(ReportKind::Notify))
         return;
-    Notifying const notifying(*this);
+    FrozenForListeners const frozen(*this);
     std::shared_ptr<ReportData> report;
     for (std::size_t i = 0; i < m_listeners.size(); ++i) {
         if (!m_listeners[i] || !m_listeners[i]->wantsNotify())
@@ -424,7 +474,7 @@ void TransactionImpl::notifyRolledBack()
 {
     if (!m_rollBackReport || !anyListener(ReportKind::Notify))
         return;
-    Notifying const notifying(*this);
+    FrozenForListeners const frozen(*this);
     for (std::size_t i = 0; i < m_listeners.size(); ++i) {
         if (!m_listeners[i] || !m_listeners[i]->wantsNotify())
             continue;

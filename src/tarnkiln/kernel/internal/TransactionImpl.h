@@ -48,6 +48,8 @@ public:
     virtual void elementModifying(ModelElement::Impl* element, unsigned long index);
     /// Keeps the present link to the container, in a deep transaction.
     void containerChanging(ModelElement::Impl* element);
+    /// Takes back what `elementCreated` recorded, when the creation has failed after all.
+    void forgetCreation(ModelElement::Impl const* element);
     /// @}
 
     /// Which listeners a report is built for.
@@ -68,7 +70,9 @@ public:
     void prepare(boost::optional<Value> const& message);
     void prohibitChanges() { set(CHANGES_PROHIBITED); }
     bool validate(boost::optional<Value> const& message);
+    /// From here to `finishTelling`, a listener that leaves the model is also skipped here.
     void end();
+    void finishTelling();
     void notifyCommitted(boost::optional<Value> const& message);
     void runDeferredInvocations();
     void prepareRollBackReport();
@@ -91,11 +95,13 @@ public:
     bool hasEnded() const { return has(ENDED); }
     bool isDeep() const { return has(DEEP); }
     bool isRolledBack() const { return has(ROLLED_BACK); }
+    bool isProhibited() const { return has(CHANGES_PROHIBITED); }
     TransactionGroup* getGroup() const { return m_group; }
-    TransactionImpl* getPreviousNotifying() const { return m_previousNotifying; }
+    TransactionImpl* getPreviousTelling() const { return m_previousTelling; }
 
 private:
-    class Notifying;
+    class FrozenForListeners;
+    class LocalGroup;
 
     enum Flag : unsigned
     {
@@ -116,18 +122,18 @@ private:
 
     bool startRecording();
     void announceFirstChange();
-    void finishRecording() { m_flags |= HAS_CHANGES | REPORT_STALE; }
+    template <class Fill>
+    void record(ModelElement::Impl* element, Fill const& fill);
     ChangesHolder makeRecord(ModelElement::Impl const& element) const;
-    ModelElement::Impl::Changes& recordOf(ModelElement::Impl* element);
     ModelElement::Impl::Changes* findRecord(ModelElement::Impl const* element) const;
-    ModelElement::Impl::Changes& addRecord(ModelElement::Impl* element);
+    void insertRecord(ModelElement::Impl* element, ChangesHolder record);
     bool isDestroyedPredecessor(ModelElement::Impl const* element) const;
     bool hasNews() const;
     bool anyListener(ReportKind kind) const;
     void pinElements();
 
     Model m_model;
-    TransactionGroup* m_group; ///< Null when the transaction stands alone, or has ended.
+    TransactionGroup* m_group; ///< Null after the end, and for one that stands alone until then.
     std::function<void()> m_firstChangeCallback;
     bool m_inFirstChangeCallback = false;
     std::shared_ptr<ChangeRecords> m_changes;
@@ -139,6 +145,7 @@ private:
     std::vector<ModelElement> m_pins; ///< Room is kept for an element of each record.
     unsigned m_flags;
     std::uint32_t m_commitCount = 0;
-    TransactionImpl* m_previousNotifying = nullptr;
+    bool m_isTelling = false;
+    TransactionImpl* m_previousTelling = nullptr;
 };
 } // namespace tarn::kiln::internal
