@@ -173,6 +173,7 @@ bool ControlFile::fillBuffer()
         fail("cannot be read");
     auto const count = static_cast<std::size_t>(m_stream.gcount());
     m_end += count;
+    m_bytesRead += count;
     return count != 0;
 }
 

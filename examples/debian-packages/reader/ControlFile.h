@@ -62,6 +62,8 @@ public:
 
     /// The name as given, for errors of those who understand the paragraphs.
     std::string const& name() const { return m_name; }
+    /// How much of the file was read so far, which may be more than the paragraphs took.
+    std::size_t bytesRead() const { return m_bytesRead; }
 
 private:
     bool readLine(std::string_view& line);
@@ -77,6 +79,7 @@ private:
     std::size_t m_begin = 0;  // of the bytes in the buffer that are not yet used
     std::size_t m_end = 0;
     std::size_t m_line = 0;  // number of the line read last
+    std::size_t m_bytesRead = 0;
     bool m_hadParagraph = false;
 };
 

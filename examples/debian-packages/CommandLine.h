@@ -1,0 +1,35 @@
+/// \file
+/// What the user asks of the program.
+#pragma once
+#include <optional>
+#include <stdexcept>
+#include <string>
+#include <vector>
+
+namespace debian {
+
+/// The arguments make no sense; `what()` says why.
+class UsageError : public std::runtime_error
+{
+public:
+    using std::runtime_error::runtime_error;
+};
+
+struct CommandLine
+{
+    static std::string const STANDARD_INPUT;  ///< "-"
+
+    std::string file = "/var/lib/dpkg/status";
+    std::optional<std::string> available;
+    bool wantsHelp = false;
+};
+
+/// Reads the arguments, the name of the program not among them.
+///
+/// \throws UsageError  for an unknown option, a third file, and standard input given twice.
+CommandLine parseCommandLine(std::vector<std::string> const& arguments);
+
+/// What `--help` prints.
+std::string const& helpText();
+
+}  // namespace debian

@@ -1,0 +1,186 @@
+#include "Demonstration.h"
+
+#include "AllocatedBytes.h"
+#include "AvailableModel.h"
+#include "ChangeReport.h"
+#include "ElementText.h"
+#include "EssentialGuard.h"
+#include "ModelSnapshot.h"
+#include "PackageGraph.h"
+#include "ProgressBar.h"
+#include "Removal.h"
+#include "Resolution.h"
+#include "Undo.h"
+#include "model/PackageIndexImpl.h"
+#include "reader/ControlFile.h"
+#include "tarnkiln/kernel/ModelConstellationImpl.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/Transaction.h"
+
+#include <filesystem>
+#include <iostream>
+#include <memory>
+#include <system_error>
+
+namespace debian {
+
+using namespace tarn::kiln;
+
+namespace {
+
+constexpr std::size_t MAX_REPORT_LINES = 16;
+constexpr std::size_t MAX_DIFFERENCES = 10;
+
+std::unique_ptr<ControlFile> open(std::string const& file)
+{
+    if (file == CommandLine::STANDARD_INPUT)
+        return std::make_unique<ControlFile>(std::cin, "standard input");
+    return std::make_unique<ControlFile>(file);
+}
+
+/// 0 for what has no size, such as a pipe.
+std::uintmax_t sizeOf(std::string const& file)
+{
+    std::error_code error;
+    std::uintmax_t const size = std::filesystem::file_size(file, error);
+    return error ? 0 : size;
+}
+
+}  // namespace
+
+Demonstration::Demonstration(std::ostream& output, std::ostream& progress, bool progressIsTerminal)
+    : m_output(output),
+      m_progress(progress),
+      m_progressIsTerminal(progressIsTerminal)
+{}
+
+bool Demonstration::run(CommandLine const& commandLine)
+{
+    m_model = Model::create(ModelConstellation());
+    m_index = load(m_model, commandLine.file, "").index;
+    if (commandLine.available)
+        resolve(*commandLine.available);
+
+    EssentialGuard guard(m_index);
+    ChangeRecorder recorder;
+    m_model->addListener(&guard);
+    m_model->addListener(&recorder);
+    bool equal = removeNeeded(guard);
+    equal = removeLeaf(recorder) && equal;
+    m_model->removeListener(&recorder);
+    m_model->removeListener(&guard);
+
+    m_output << "\nFigures\n";
+    m_figures.print(m_output);
+    return equal;
+}
+
+LoadResult Demonstration::load(Model const& model, std::string const& file,
+                               std::string const& prefix)
+{
+    auto const input = open(file);
+    std::size_t const bytesBefore = allocatedBytes();
+    Stopwatch const stopwatch;
+    LoadResult const loaded = [&] {
+        ProgressBar bar(m_progress, m_progressIsTerminal, "Reading " + file, sizeOf(file));
+        return Loader(model).load(*input, [&](std::size_t bytes) { bar.update(bytes); });
+    }();
+    auto const time = stopwatch.elapsed();
+    std::size_t const elements = model->getElementCount();
+
+    m_output << input->name() << ": " << loaded.index->getPackages().size() << " packages with "
+             << loaded.releases << " releases, " << loaded.groups << " dependencies with "
+             << loaded.alternatives << " alternatives\n"
+             << "  passed over: " << loaded.notInstalled << " that are not installed, "
+             << loaded.repeated << " repeated\n"
+             << "  named, but not in the file: " << loaded.missing.size() << '\n';
+    m_figures.addCount(prefix + "elements", elements);
+    m_figures.addCount(prefix + "bytes per element", (allocatedBytes() - bytesBefore) / elements);
+    m_figures.addTime(prefix + "load", time);
+    return loaded;
+}
+
+void Demonstration::resolve(std::string const& file)
+{
+    Model const available = Model::create(m_model->getModelConstellation());
+    available->setModelURI(AVAILABLE_URI);
+    load(available, file, "available: ");
+
+    Stopwatch const stopwatch;
+    Resolution const resolution = resolveTargets(m_index);
+    m_figures.addTime("resolution", stopwatch.elapsed());
+    m_output << "  of the missing packages of the first file " << resolution.found << " are here, "
+             << resolution.notFound << " are not\n";
+}
+
+bool Demonstration::removeNeeded(EssentialGuard const& guard)
+{
+    model::Package const needed = neededByEssential(m_index);
+    if (!needed)
+    {
+        m_output << "\nNo essential package needs another: nothing to refuse\n";
+        return true;
+    }
+    ModelSnapshot const before(m_model);
+    m_output << "\nRemoving " << textOf(needed) << ", which an essential package needs\n";
+
+    Stopwatch const stopwatch;
+    Transaction const transaction = m_model->beginTransaction(/*revertible=*/true);
+    removePackages({needed});
+    bool const refused = transaction.commit() == TransactionResult::RolledBack;
+    m_figures.addTime("refused removal and rollback", stopwatch.elapsed());
+
+    m_output << (refused ? "  refused: " + guard.reason() : std::string("  was not refused"))
+             << '\n';
+    return checkEqual(before, "rollback") && refused;
+}
+
+bool Demonstration::removeLeaf(ChangeRecorder const& recorder)
+{
+    PackageGraph const graph(m_index);
+    model::Package const leaf = graph.chooseLeaf();
+    if (!leaf)
+    {
+        m_output << "\nAll packages are used by others: nothing to remove\n";
+        return true;
+    }
+    ModelSnapshot const before(m_model);
+    auto const packages = graph.removableWith(leaf);
+    m_output << "\nRemoving " << textOf(leaf) << " with what only it needs: " << packages.size()
+             << " packages\n";
+
+    Stopwatch const removal;
+    Transaction const transaction = m_model->beginTransaction(/*revertible=*/true);
+    removePackages(packages);
+    bool const committed = transaction.commit() == TransactionResult::Committed;
+    m_figures.addTime("removal and commit", removal.elapsed());
+    if (!committed)
+    {
+        m_output << "  was refused\n";
+        return false;
+    }
+    ReportData const report = *recorder.last();
+    printReport(m_output, report, MAX_REPORT_LINES);
+
+    Stopwatch const back;
+    undo(report);
+    m_figures.addTime("undo", back.elapsed());
+    return checkEqual(before, "undo");
+}
+
+bool Demonstration::checkEqual(ModelSnapshot const& before, std::string const& occasion)
+{
+    ModelSnapshot const now(m_model);
+    if (now == before)
+    {
+        m_output << "  after the " << occasion << " all " << now.elementCount()
+                 << " elements are as they were\n";
+        return true;
+    }
+    m_output << "  after the " << occasion << " the model differs:\n";
+    for (std::string const& line : before.differences(now, MAX_DIFFERENCES))
+        m_output << "    " << line << '\n';
+    return false;
+}
+
+}  // namespace debian

@@ -1,0 +1,19 @@
+/// \file
+/// What the essential releases of an index lack.
+#pragma once
+#include "model/DependencyGroup.h"
+#include "model/PackageIndex.h"
+
+#include <vector>
+
+namespace debian {
+
+/// The strict dependencies that are to blame if an essential release does not work: its own, and,
+/// if nothing that satisfies one works itself, those of the releases that would satisfy it.
+///
+/// A release works if each of its strict dependencies is satisfied by a release that works, and
+/// releases that need one another in a circle work together. What could satisfy a dependency
+/// beside something that works is blamed for nothing.
+std::vector<model::DependencyGroup> lackingDependencies(model::PackageIndex const& index);
+
+}  // namespace debian

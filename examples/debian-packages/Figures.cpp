@@ -1,0 +1,37 @@
+#include "Figures.h"
+
+#include <algorithm>
+#include <array>
+#include <cstdio>
+#include <iomanip>
+#include <ostream>
+
+namespace debian {
+
+void Figures::addCount(std::string name, std::size_t count)
+{
+    m_rows.emplace_back(std::move(name), std::to_string(count));
+}
+
+void Figures::addTime(std::string name, std::chrono::duration<double> time)
+{
+    std::array<char, 32> text{};
+    std::snprintf(text.data(), text.size(), "%.3f ms", time.count() * 1000);
+    m_rows.emplace_back(std::move(name), text.data());
+}
+
+void Figures::print(std::ostream& output) const
+{
+    std::size_t nameWidth = 0;
+    std::size_t valueWidth = 0;
+    for (auto const& [name, value] : m_rows)
+    {
+        nameWidth = std::max(nameWidth, name.size());
+        valueWidth = std::max(valueWidth, value.size());
+    }
+    for (auto const& [name, value] : m_rows)
+        output << "  " << std::left << std::setw(static_cast<int>(nameWidth)) << name << "  "
+               << std::right << std::setw(static_cast<int>(valueWidth)) << value << '\n';
+}
+
+}  // namespace debian

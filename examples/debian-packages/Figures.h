@@ -1,0 +1,37 @@
+/// \file
+/// The table of measurements at the end of a run.
+#pragma once
+#include <chrono>
+#include <iosfwd>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace debian {
+
+/// Measures the time since it was made.
+class Stopwatch
+{
+public:
+    std::chrono::duration<double> elapsed() const { return Clock::now() - m_begin; }
+
+private:
+    using Clock = std::chrono::steady_clock;
+
+    Clock::time_point m_begin = Clock::now();
+};
+
+/// Rows of a name and a measured value, printed in two columns.
+class Figures
+{
+public:
+    void addCount(std::string name, std::size_t count);
+    void addTime(std::string name, std::chrono::duration<double> time);
+
+    void print(std::ostream& output) const;
+
+private:
+    std::vector<std::pair<std::string, std::string>> m_rows;
+};
+
+}  // namespace debian
