@@ -109,7 +109,8 @@ void Model::Impl::elementCreated(ModelElement::Impl* element, bool topLevel)
     if (recording)
         m_currentTransaction->elementCreated(element);
     try {
-        m_usageProvider->elementCreated(element);
+        if (m_usageProvider)
+            m_usageProvider->elementCreated(element);
     }
     catch (...) {
         if (recording)
@@ -131,7 +132,8 @@ void Model::Impl::elementDestroying(ModelElement::Impl* element)
         }
         m_currentTransaction->elementDestroying(element);
     }
-    m_usageProvider->elementDestroying(element);
+    if (m_usageProvider)
+        m_usageProvider->elementDestroying(element);
     remove(element);
 }
 

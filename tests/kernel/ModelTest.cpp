@@ -1,0 +1,920 @@
+#include "tarnkiln/kernel/ModelImpl.h"
+
+#include "tarnkiln/kernel/Freezer.h"
+#include "tarnkiln/kernel/ModelConstellationImpl.h"
+#include "tarnkiln/kernel/ProgressIndicators.h"
+#include "tarnkiln/meta/DataModelUsageProvider.h"
+#include "tarnkiln/meta/Package.h"
+#include "tests/support/ExpectRaises.h"
+#include "tests/support/FakeDataSource.h"
+#include "tests/support/PlainChange.h"
+#include "tests/support/ScriptedListener.h"
+#include "tests/support/Uuids.h"
+
+#include <gmock/gmock.h>
+
+namespace {
+
+using namespace tarn::kiln;
+using namespace testkit;
+using ::testing::ElementsAre;
+using ::testing::IsEmpty;
+using ::testing::UnorderedElementsAre;
+using Validity = ElementImpl::ElementValidity;
+
+ustring memoryUriOf(Model const& model)
+{
+    std::string const digits = std::to_string(model->getModelCounter());
+    return u"memory://" + ustring(digits.begin(), digits.end());
+}
+
+// ---------------------------------------------------------------------------- creation
+
+TEST(AModel, LivesInAConstellationOfItsOwnIfNoneIsGiven)
+{
+    Model const model = Model::create(ModelConstellation());
+
+    ModelConstellation const home = model->getModelConstellation();
+    ASSERT_TRUE(home);
+    EXPECT_THAT(home->getModels(), ElementsAre(model));
+    EXPECT_FALSE(home->isMultiModelConstellation());
+    EXPECT_FALSE(model->isMultiModel());
+}
+
+TEST(AModel, LivesInAConstellationOfItsOwnIfTheGivenOneIsDead)
+{
+    ModelConstellation const dead = ModelConstellation::create();
+    dead->destroy();
+
+    Model const model = Model::create(dead);
+
+    EXPECT_TRUE(model->getModelConstellation());
+    EXPECT_NE(model->getModelConstellation(), dead);
+}
+
+TEST(AModel, JoinsTheConstellationItIsCreatedIn)
+{
+    ModelConstellation const home = ModelConstellation::create();
+    Model const first = Model::create(home);
+    Model const second = Model::create(home);
+
+    EXPECT_EQ(first->getModelConstellation(), home);
+    EXPECT_THAT(home->getModels(), UnorderedElementsAre(first, second));
+    EXPECT_TRUE(first->isMultiModel());
+}
+
+TEST(AModel, IsNamedAfterTheCounterOfTheProcess)
+{
+    Model const first = Model::create(ModelConstellation());
+    Model const second = Model::create(ModelConstellation());
+
+    EXPECT_EQ(second->getModelCounter(), first->getModelCounter() + 1);
+    EXPECT_EQ(first->getModelURI(), memoryUriOf(first));
+    EXPECT_EQ(first->getLocationModelId(), memoryUriOf(first));
+    EXPECT_EQ(second->getModelURI(), memoryUriOf(second));
+}
+
+TEST(AModel, CountsModelsOutsideConstellationsToo)
+{
+    Model const first = Model::createTransientModel();
+    Model const second = Model::createRegistryModel(u"registry://counted");
+
+    EXPECT_EQ(second->getModelCounter(), first->getModelCounter() + 1);
+}
+
+TEST(AModel, KeepsItsUuidAndTakesAFreshOneForTheNilOne)
+{
+    EXPECT_EQ(Model::create(uuidOf(4), ModelConstellation())->getUuid(), uuidOf(4));
+    EXPECT_EQ(Model::createTransientModel(uuidOf(5))->getUuid(), uuidOf(5));
+    EXPECT_EQ(Model::createRegistryModel(u"registry://id", uuidOf(6))->getUuid(), uuidOf(6));
+    EXPECT_FALSE(Model::create(UUID{}, ModelConstellation())->getUuid().is_nil());
+    EXPECT_FALSE(Model::create(ModelConstellation())->getUuid().is_nil());
+}
+
+TEST(AModel, IsValidFromItsConstructionAndItsOwnModel)
+{
+    Model const model = Model::create(ModelConstellation());
+
+    EXPECT_EQ(model->getValidity(), Validity::Valid);
+    EXPECT_EQ(model->getModel(), model);
+    EXPECT_EQ(model->getRefCount(), 1u);
+}
+
+TEST(AModel, IsOfOneOfThreeKinds)
+{
+    Model const ordinary = Model::create(ModelConstellation());
+    Model const registry = Model::createRegistryModel(u"some@registry://model");
+    Model const transient = Model::createTransientModel();
+
+    EXPECT_FALSE(ordinary->isRegistryModel());
+    EXPECT_FALSE(ordinary->isTransientModel());
+    EXPECT_TRUE(registry->isRegistryModel());
+    EXPECT_FALSE(registry->isTransientModel());
+    EXPECT_FALSE(transient->isRegistryModel());
+    EXPECT_TRUE(transient->isTransientModel());
+}
+
+TEST(ARegistryModel, KeepsItsUriAsItIsAndLiesInNoConstellation)
+{
+    Model const model = Model::createRegistryModel(u"some@registry://model");
+
+    EXPECT_EQ(model->getModelURI(), u"some@registry://model");
+    EXPECT_EQ(model->getLocationModelId(), u"some@registry://model");
+    EXPECT_FALSE(model->getModelConstellation());
+    EXPECT_FALSE(model->isMultiModel());
+}
+
+TEST(ARegistryModel, WithoutAUriIsATransientModel)
+{
+    EXPECT_TRUE(Model::createRegistryModel(u"")->isTransientModel());
+}
+
+TEST(ATransientModel, HasNoUri)
+{
+    Model const model = Model::createTransientModel();
+
+    EXPECT_EQ(model->getModelURI(), u"");
+    EXPECT_EQ(model->getLocationModelId(), u"");
+}
+
+// ---------------------------------------------------------------------------- registry
+
+class AnElement : public ::testing::Test
+{
+protected:
+    Model const model = Model::create(ModelConstellation());
+};
+
+TEST_F(AnElement, IsConstructingUntilItsModelIsTold)
+{
+    Plain const element(new Plain::Impl(model, uuidOf(1)));
+    EXPECT_EQ(element->getValidity(), Validity::Constructing);
+    EXPECT_FALSE(model->findElement(uuidOf(1)));
+
+    element->notifyCreated();
+
+    EXPECT_EQ(element->getValidity(), Validity::Valid);
+    EXPECT_EQ(model->findElement(uuidOf(1)), element);
+}
+
+TEST_F(AnElement, IsBornTopLevelAndKeptByItsModel)
+{
+    Plain::Impl* const impl = Plain::create(model, uuidOf(1)).getImpl();
+
+    EXPECT_EQ(impl->getRefCount(), 1u);
+    EXPECT_TRUE(impl->isTopLevel());
+    EXPECT_THAT(model->getTopLevelElements(), ElementsAre(ModelElement(impl)));
+    EXPECT_EQ(model->findElementImpl(uuidOf(1)), impl);
+    EXPECT_EQ(model->getElementCount(), 1u);
+}
+
+TEST_F(AnElement, IsFoundByItsUuidOnly)
+{
+    Plain const element = Plain::create(model, uuidOf(1));
+
+    EXPECT_EQ(model->findElement(uuidOf(1)), element);
+    EXPECT_FALSE(model->findElement(uuidOf(2)));
+    EXPECT_FALSE(model->findElement(UUID{}));
+    EXPECT_EQ(model->findElementImpl(uuidOf(2)), nullptr);
+}
+
+TEST_F(AnElement, IsFoundInItsOwnModelOnly)
+{
+    Model const other = Model::create(ModelConstellation());
+    Plain const here = Plain::create(model, uuidOf(1));
+    Plain const there = Plain::create(other, uuidOf(1));
+
+    EXPECT_EQ(model->findElement(uuidOf(1)), here);
+    EXPECT_EQ(other->findElement(uuidOf(1)), there);
+}
+
+TEST_F(AnElement, NeedsAModelThatLives)
+{
+    Model const dead = Model::create(ModelConstellation());
+    dead->destroy();
+
+    EXPECT_RAISES_WITH(messages::CannotCreateWithoutModel, Plain::create(Model()));
+    EXPECT_RAISES_WITH(messages::CannotCreateWithoutModel, Plain::create(dead));
+}
+
+TEST_F(AnElement, ThatCouldNotBeConstructedLeavesNothingBehind)
+{
+    ExpectNoLeakedElements const noLeaks;
+
+    EXPECT_RAISES(messages::CannotCreateWithoutModel, Plain::create(Model()));
+}
+
+TEST_F(AnElement, IsToldLastOfItsCreation)
+{
+    bool registered = false;
+    bool topLevel = false;
+    Plain::Impl::whenCreated = [&](Plain::Impl& element) {
+        registered = model->findElementImpl(element.getUuid()) == &element;
+        topLevel = !model->getTopLevelElements().empty();
+    };
+
+    Plain::create(model);
+    Plain::Impl::whenCreated = nullptr;
+
+    EXPECT_TRUE(registered);
+    EXPECT_TRUE(topLevel);
+}
+
+TEST_F(AnElement, IsInTheListOfTopLevelElementsThatWasAskedForBeforeItLeftIt)
+{
+    Plain const parent = Plain::create(model);
+    Plain const child = Plain::create(model);
+    std::vector<ModelElement> const before = model->getTopLevelElements();
+
+    parent->addChild(child);
+
+    EXPECT_THAT(before, UnorderedElementsAre(parent, child));
+    EXPECT_THAT(model->getTopLevelElements(), ElementsAre(ModelElement(parent)));
+}
+
+class ATakenUuid : public AnElement
+{
+protected:
+    Plain const occupant = Plain::create(model, uuidOf(1));
+};
+
+TEST_F(ATakenUuid, RefusesANewcomerAndTakesItsUuidAway)
+{
+    Plain newcomer(new Plain::Impl(model, uuidOf(1)));
+
+    EXPECT_RAISES_WITH(messages::UUIDConflict, newcomer->notifyCreated());
+
+    EXPECT_TRUE(newcomer->getUuid().is_nil());
+    EXPECT_EQ(model->findElement(uuidOf(1)), occupant);
+    EXPECT_FALSE(model->findElement(UUID{}));
+    EXPECT_THAT(model->getTopLevelElements(), ElementsAre(ModelElement(occupant)));
+    newcomer = Plain();
+    EXPECT_EQ(model->findElement(uuidOf(1)), occupant);
+}
+
+TEST_F(ATakenUuid, LeavesNoTraceOfTheNewcomerInTheTransaction)
+{
+    ScriptedListener listener;
+    listen(model, listener);
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+
+    EXPECT_RAISES(messages::UUIDConflict, Plain::create(model, uuidOf(1)));
+    transaction.commit();
+
+    EXPECT_THAT(listener.committed, IsEmpty());
+    model->removeListener(&listener);
+}
+
+TEST_F(ATakenUuid, IsFreeAgainWhenTheOccupantIsDestroyed)
+{
+    occupant->destroy();
+
+    Plain const successor = Plain::create(model, uuidOf(1));
+
+    EXPECT_EQ(model->findElement(uuidOf(1)), successor);
+}
+
+TEST_F(ATakenUuid, StaysTheOccupantsWhenTheNewcomerFailsBeforeTheConflictIsSeen)
+{
+    {
+        Model::Freezer const freezer = model->freeze();
+        EXPECT_RAISES(messages::ModelFrozen, Plain::create(model, uuidOf(1)));
+    }
+    {
+        Plain(new Plain::Impl(model, uuidOf(1)));  // never announced
+    }
+
+    EXPECT_EQ(model->findElement(uuidOf(1)), occupant);
+    EXPECT_THAT(model->getTopLevelElements(), ElementsAre(ModelElement(occupant)));
+}
+
+TEST_F(AnElement, ThatWasNeverAnnouncedDiesWithItsLastHandle)
+{
+    ExpectNoLeakedElements const noLeaks;
+    Plain(new Plain::Impl(model, uuidOf(1)));
+
+    EXPECT_FALSE(model->findElement(uuidOf(1)));
+}
+
+TEST_F(AnElement, WhoseTransactionRefusesItIsForgotten)
+{
+    ExpectNoLeakedElements const noLeaks;
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+    model->allElementsDestroying();
+
+    EXPECT_RAISES_WITH(messages::CreateWithDestroyAll, Plain::create(model, uuidOf(1)));
+
+    EXPECT_FALSE(model->findElement(uuidOf(1)));
+    EXPECT_THAT(model->getTopLevelElements(), IsEmpty());
+}
+
+// ---------------------------------------------------------------------------- data source
+
+class AModelWithADataSource : public AnElement
+{
+protected:
+    FakeDataSource& source = FakeDataSource::installIn(model);
+};
+
+TEST_F(AModelWithADataSource, AsksItForAUuidThatIsNotInMemory)
+{
+    Plain const loaded = Plain::create(model);
+    source.onFetch = [&](UUID const& id) {
+        EXPECT_EQ(id, uuidOf(9));
+        return loaded;
+    };
+
+    EXPECT_EQ(model->findElement(uuidOf(9), FindElementBehavior::Fetch), loaded);
+    EXPECT_THAT(source.calls, ElementsAre("fetchElement"));
+}
+
+TEST_F(AModelWithADataSource, DoesNotAskItForWhatIsInMemory)
+{
+    Plain const element = Plain::create(model, uuidOf(1));
+
+    EXPECT_EQ(model->findElement(uuidOf(1), FindElementBehavior::Fetch), element);
+    EXPECT_THAT(source.calls, IsEmpty());
+}
+
+TEST_F(AModelWithADataSource, DoesNotAskItUnlessTold)
+{
+    EXPECT_FALSE(model->findElement(uuidOf(9)));
+    EXPECT_FALSE(model->findElement(uuidOf(9), FindElementBehavior::InMemory));
+    EXPECT_THAT(source.calls, IsEmpty());
+}
+
+TEST_F(AModelWithADataSource, OwnsItAndLetsItGoWhenTold)
+{
+    int deaths = 0;
+    source.onDeath = [&] { ++deaths; };
+    EXPECT_EQ(model->getDataSource(), &source);
+
+    model->resetDataSource();
+
+    EXPECT_EQ(deaths, 1);
+    EXPECT_EQ(model->getDataSource(), nullptr);
+    EXPECT_FALSE(model->findElement(uuidOf(9), FindElementBehavior::Fetch));
+}
+
+TEST(FindElementBehavior, FetchesByTheValueOneOnly)
+{
+    EXPECT_EQ(static_cast<int>(FindElementBehavior::Fetch), 1);
+    EXPECT_NE(static_cast<int>(FindElementBehavior::InMemory), 1);
+}
+
+// ---------------------------------------------------------------------------- usage
+
+/// Notes what it is told, and what the model knew at that moment.
+class UsageLog : public meta::DataModelUsageProvider
+{
+public:
+    std::vector<meta::Package> getUsedPackages() const override { return {}; }
+    std::vector<ustring> getUsedPackageUris() const override { return {u"one", u"two"}; }
+    void elementCreated(ModelElement::Impl* element) override
+    {
+        created.push_back(element);
+        Model const model = element->getModel();
+        knownWhenCreated = model->findElementImpl(element->getUuid()) == element;
+        topLevelWhenCreated = !model->getTopLevelElements().empty();
+        if (refuses)
+            throw std::runtime_error("refused");
+    }
+    void elementDestroying(ModelElement::Impl* element) override
+    {
+        destroying.push_back(element);
+        knownWhenDestroying = element->getModel()->findElementImpl(element->getUuid()) == element;
+    }
+
+    std::vector<ModelElement::Impl*> created;
+    std::vector<ModelElement::Impl*> destroying;
+    bool knownWhenCreated = false;
+    bool topLevelWhenCreated = false;
+    bool knownWhenDestroying = false;
+    bool refuses = false;
+};
+
+class AUsageProvider : public AnElement
+{
+protected:
+    UsageLog& install()
+    {
+        auto log = std::make_unique<UsageLog>();
+        UsageLog& result = *log;
+        model->setUsageProvider(std::move(log));
+        return result;
+    }
+};
+
+TEST_F(AUsageProvider, IsToldOfACreationBetweenRegistryAndTopLevel)
+{
+    UsageLog const& log = install();
+
+    Plain const element = Plain::create(model);
+
+    EXPECT_THAT(log.created, ElementsAre(element.getImpl()));
+    EXPECT_TRUE(log.knownWhenCreated);
+    EXPECT_FALSE(log.topLevelWhenCreated);
+}
+
+TEST_F(AUsageProvider, IsToldOfADestructionBeforeTheElementLeavesTheRegistry)
+{
+    UsageLog const& log = install();
+    Plain const element = Plain::create(model);
+
+    element->destroy();
+
+    EXPECT_THAT(log.destroying, ElementsAre(element.getImpl()));
+    EXPECT_TRUE(log.knownWhenDestroying);
+    EXPECT_FALSE(model->findElement(element->getUuid()));
+}
+
+TEST_F(AUsageProvider, IsNotToldWhenARollbackBringsAnElementBackOrTakesOneAway)
+{
+    UsageLog const& log = install();
+    Plain const old = Plain::create(model);
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+    old->destroy();
+    Plain const fresh = Plain::create(model);
+
+    EXPECT_EQ(transaction.rollBack(), TransactionResult::RolledBack);
+
+    EXPECT_TRUE(old);
+    EXPECT_FALSE(fresh);
+    EXPECT_EQ(log.created.size(), 2u);
+    EXPECT_THAT(log.destroying, ElementsAre(old.getImpl()));
+}
+
+TEST_F(AUsageProvider, IsAskedForTheUrisOfUsedPackages)
+{
+    install();
+
+    EXPECT_THAT(model->getUsedPackages(), IsEmpty());
+    EXPECT_THAT(model->getUsedPackageUris(), ElementsAre(u"one", u"two"));
+}
+
+TEST_F(AUsageProvider, MayBeMissing)
+{
+    model->setUsageProvider(nullptr);
+
+    Plain const element = Plain::create(model);
+    element->destroy();
+
+    EXPECT_THAT(model->getUsedPackages(), IsEmpty());
+    EXPECT_THAT(model->getUsedPackageUris(), IsEmpty());
+}
+
+TEST_F(AUsageProvider, OfTheModelToleratesElementsWithoutAMetaclass)
+{
+    Plain const element = Plain::create(model);
+    EXPECT_THAT(model->getUsedPackages(), IsEmpty());
+
+    element->destroy();
+
+    EXPECT_THAT(model->getUsedPackages(), IsEmpty());
+    EXPECT_THAT(model->getDescriptivePackageURIClosure(), IsEmpty());
+}
+
+// ---------------------------------------------------------------------------- URI
+
+TEST(TheUriOfAModel, MayBeSetToItselfEvenWithoutAConstellation)
+{
+    Model const transient = Model::createTransientModel();
+    Model const registry = Model::createRegistryModel(u"registry://fixed");
+
+    transient->setModelURI(u"");
+    registry->setModelURI(u"registry://fixed");
+
+    EXPECT_EQ(transient->getModelURI(), u"");
+    EXPECT_EQ(registry->getModelURI(), u"registry://fixed");
+}
+
+TEST(TheUriOfAModel, IsFixedWithoutAConstellation)
+{
+    Model const transient = Model::createTransientModel();
+    Model const registry = Model::createRegistryModel(u"registry://fixed");
+
+    EXPECT_RAISES_WITH(messages::InvalidValue, transient->setModelURI(u"file://a"));
+    EXPECT_RAISES_WITH(messages::InvalidValue, registry->setModelURI(u"file://a"));
+
+    EXPECT_TRUE(transient->isTransientModel());
+    EXPECT_EQ(registry->getModelURI(), u"registry://fixed");
+}
+
+TEST(TheUriOfAModel, IsWhereItsConstellationFindsIt)
+{
+    Model const model = Model::create(ModelConstellation());
+    ModelConstellation const home = model->getModelConstellation();
+    ustring const before = model->getModelURI();
+
+    model->setModelURI(u"file://a");
+
+    EXPECT_EQ(model->getModelURI(), u"file://a");
+    EXPECT_EQ(model->getLocationModelId(), u"file://a");
+    EXPECT_EQ(home->peekModel(u"file://a"), model);
+    EXPECT_FALSE(home->peekModel(before));
+}
+
+TEST(TheUriOfAModel, MayNotBeThatOfAnotherModelOfItsConstellation)
+{
+    ModelConstellation const home = ModelConstellation::create();
+    Model const first = Model::create(home);
+    Model const second = Model::create(home);
+    first->setModelURI(u"file://a");
+    second->setModelURI(u"file://b");
+
+    EXPECT_RAISES_WITH(messages::UniquenessConstraint, second->setModelURI(u"file://a"));
+
+    EXPECT_EQ(second->getModelURI(), u"file://b");
+    EXPECT_EQ(home->peekModel(u"file://a"), first);
+    EXPECT_EQ(home->peekModel(u"file://b"), second);
+}
+
+TEST(TheUriOfAModel, MayBeThatOfAModelOfAnotherConstellation)
+{
+    Model const first = Model::create(ModelConstellation());
+    Model const second = Model::create(ModelConstellation());
+
+    first->setModelURI(u"file://a");
+    second->setModelURI(u"file://a");
+
+    EXPECT_EQ(first->getModelURI(), second->getModelURI());
+}
+
+TEST(TheUriOfAModel, ChangesInNoTransactionAndStaysAfterARollback)
+{
+    Model const model = Model::create(ModelConstellation());
+    Model::Freezer const freezer = model->freeze();
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+
+    model->setModelURI(u"file://a");
+    transaction.rollBack();
+
+    EXPECT_EQ(model->getModelURI(), u"file://a");
+}
+
+// ---------------------------------------------------------------------------- freezing
+
+class AFrozenModel : public AnElement
+{
+protected:
+    Plain const element = Plain::create(model, uuidOf(1));
+};
+
+TEST_F(AFrozenModel, RefusesEveryKindOfChange)
+{
+    Model::Freezer const freezer = model->freeze();
+
+    EXPECT_TRUE(model->isFrozen());
+    EXPECT_RAISES_WITH(messages::ModelFrozen, Plain::create(model));
+    EXPECT_RAISES_WITH(messages::ModelFrozen, element->setValue(1));
+    EXPECT_RAISES_WITH(messages::ModelFrozen, element->destroy());
+    EXPECT_RAISES_WITH(messages::ModelFrozen, model->destroyAllContents());
+    EXPECT_RAISES_WITH(messages::ModelFrozen, change(element, 1));
+    EXPECT_EQ(element->getValue(), 0);
+    EXPECT_TRUE(element);
+    EXPECT_EQ(model->getElementCount(), 1u);
+}
+
+TEST_F(AFrozenModel, CanBeRead)
+{
+    Model::Freezer const freezer = model->freeze();
+
+    EXPECT_EQ(model->findElement(uuidOf(1)), element);
+    EXPECT_THAT(model->getTopLevelElements(), ElementsAre(ModelElement(element)));
+    EXPECT_EQ(element->getValue(), 0);
+}
+
+TEST_F(AFrozenModel, BeginsTransactionsButRefusesTheirFirstChange)
+{
+    Model::Freezer const freezer = model->freeze();
+
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+    EXPECT_RAISES(messages::ModelFrozen, change(element, 1));
+
+    EXPECT_EQ(transaction.commit(), TransactionResult::Committed);
+}
+
+TEST_F(AFrozenModel, IsFrozenUntilItsLastFreezerGoes)
+{
+    auto first = std::make_unique<Model::Freezer>(model->freeze());
+    auto second = std::make_unique<Model::Freezer>(model->freeze());
+
+    first.reset();
+    EXPECT_RAISES(messages::ModelFrozen, element->setValue(1));
+    second.reset();
+
+    EXPECT_FALSE(model->isFrozen());
+    element->setValue(1);
+    EXPECT_EQ(element->getValue(), 1);
+}
+
+TEST_F(AFrozenModel, IsThawedEarlyByDeactivationOnce)
+{
+    Model::Freezer first = model->freeze();
+    Model::Freezer const second = model->freeze();
+
+    first.deactivate();
+    first.deactivate();
+
+    EXPECT_TRUE(model->isFrozen());
+}
+
+TEST_F(AFrozenModel, StaysFrozenWhenItsFreezerIsMoved)
+{
+    {
+        Model::Freezer first = model->freeze();
+        Model::Freezer const second(std::move(first));
+        EXPECT_TRUE(model->isFrozen());
+    }
+    EXPECT_FALSE(model->isFrozen());
+}
+
+TEST_F(AFrozenModel, IsLetGoByAFreezerThatIsAssignedAnother)
+{
+    Model const other = Model::create(ModelConstellation());
+    Model::Freezer freezer = model->freeze();
+
+    freezer = other->freeze();
+
+    EXPECT_FALSE(model->isFrozen());
+    EXPECT_TRUE(other->isFrozen());
+    freezer.deactivate();
+    EXPECT_FALSE(other->isFrozen());
+}
+
+TEST_F(AFrozenModel, SurvivesTheAssignmentOfItsFreezerToItself)
+{
+    Model::Freezer freezer = model->freeze();
+    Model::Freezer& same = freezer;
+
+    freezer = std::move(same);
+
+    EXPECT_TRUE(model->isFrozen());
+}
+
+TEST_F(AFrozenModel, IsKeptInMemoryByItsFreezer)
+{
+    auto freezer = std::make_unique<Model::Freezer>(Model::createTransientModel()->freeze());
+
+    freezer.reset();  // would touch a model that is gone, did the freezer not hold it
+}
+
+TEST_F(AFrozenModel, MayBeDestroyed)
+{
+    Model::Freezer freezer = model->freeze();
+
+    model->destroy();
+    freezer.deactivate();
+
+    EXPECT_FALSE(model);
+    EXPECT_FALSE(element);
+}
+
+TEST_F(AFrozenModel, IsWritableUntilTheLastOfNestedThawersGoes)
+{
+    Model::Freezer freezer = model->freeze();
+    auto outer = std::make_unique<Model::Thawer>(freezer.thaw());
+    auto inner = std::make_unique<Model::Thawer>(freezer.thaw());
+
+    element->setValue(1);
+    outer.reset();
+    element->setValue(2);
+    inner->deactivate();
+    inner->deactivate();
+
+    EXPECT_RAISES(messages::ModelFrozen, element->setValue(3));
+    EXPECT_EQ(element->getValue(), 2);
+    inner.reset();
+    EXPECT_TRUE(model->isFrozen());
+}
+
+TEST_F(AFrozenModel, IsThawedForOneFreezerOnly)
+{
+    Model::Freezer first = model->freeze();
+    Model::Freezer const second = model->freeze();
+
+    Model::Thawer const thawer = first.thaw();
+
+    EXPECT_RAISES(messages::ModelFrozen, element->setValue(1));
+}
+
+TEST_F(AFrozenModel, CanBeThawedAgainAndAgain)
+{
+    Model::Freezer freezer = model->freeze();
+    for (int value = 1; value < 4; ++value)
+    {
+        {
+            Model::Thawer const thawer = freezer.thaw();
+            element->setValue(value);
+        }
+        EXPECT_RAISES(messages::ModelFrozen, element->setValue(-1));
+    }
+    EXPECT_EQ(element->getValue(), 3);
+}
+
+TEST_F(AFrozenModel, StaysThawedWhenItsThawerIsMoved)
+{
+    Model::Freezer freezer = model->freeze();
+    {
+        Model::Thawer first = freezer.thaw();
+        Model::Thawer second(std::move(first));
+        EXPECT_FALSE(model->isFrozen());
+        Model::Thawer third = freezer.thaw();
+        third = std::move(second);
+        EXPECT_FALSE(model->isFrozen());
+    }
+    EXPECT_TRUE(model->isFrozen());
+}
+
+TEST_F(AFrozenModel, IsFrozenByANewFreezerAfterOneDiedThawed)
+{
+    auto freezer = std::make_unique<Model::Freezer>(model->freeze());
+    auto thawer = std::make_unique<Model::Thawer>(freezer->thaw());
+
+    freezer.reset();
+    EXPECT_FALSE(model->isFrozen());
+    thawer.reset();
+    EXPECT_FALSE(model->isFrozen());
+    Model::Freezer const next = model->freeze();
+
+    EXPECT_TRUE(model->isFrozen());
+}
+
+TEST_F(AFrozenModel, IsThawedByAFreezerThatMovedMeanwhile)
+{
+    auto freezer = std::make_unique<Model::Freezer>(model->freeze());
+    auto thawer = std::make_unique<Model::Thawer>(freezer->thaw());
+    Model::Freezer const moved(std::move(*freezer));
+    freezer.reset();
+
+    EXPECT_FALSE(model->isFrozen());
+    thawer.reset();
+
+    EXPECT_TRUE(model->isFrozen());
+}
+
+// ---------------------------------------------------------------------------- progress
+
+TEST(AParseIndicator, CountsWhileItLives)
+{
+    Model const model = Model::create(ModelConstellation());
+    EXPECT_FALSE(model->isParsing());
+    {
+        Model::ParseInProgressIndicator const outer = model->startParse();
+        {
+            Model::ParseInProgressIndicator const inner = model->startParse();
+            EXPECT_TRUE(model->isParsing());
+        }
+        EXPECT_TRUE(model->isParsing());
+    }
+    EXPECT_FALSE(model->isParsing());
+}
+
+TEST(AParseIndicator, CountsOnceWhenItMoves)
+{
+    Model const model = Model::create(ModelConstellation());
+    Model const other = Model::create(ModelConstellation());
+    {
+        Model::ParseInProgressIndicator first = model->startParse();
+        Model::ParseInProgressIndicator second(std::move(first));
+        EXPECT_TRUE(model->isParsing());
+        Model::ParseInProgressIndicator third = other->startParse();
+        third = std::move(second);
+        EXPECT_TRUE(model->isParsing());
+    }
+    EXPECT_FALSE(model->isParsing());
+    EXPECT_FALSE(other->isParsing());
+}
+
+TEST(AParseIndicator, OutlivesItsModel)
+{
+    Model model = Model::createTransientModel();
+    Model::ParseInProgressIndicator const indicator = model->startParse();
+
+    model->destroy();
+    model = Model();
+}
+
+class ALoadingIndicator : public AnElement
+{
+protected:
+    ALoadingIndicator() { listen(model, listener); }
+    ~ALoadingIndicator() override { model->removeListener(&listener); }
+
+    ScriptedListener listener;
+};
+
+TEST_F(ALoadingIndicator, CountsWhileItLivesAndOnceWhenItMoves)
+{
+    {
+        Model::DataSourceLoadingInProgressIndicator outer = model->startDataSourceLoading();
+        {
+            Model::DataSourceLoadingInProgressIndicator const inner =
+                model->startDataSourceLoading();
+        }
+        Model::DataSourceLoadingInProgressIndicator const moved(std::move(outer));
+        EXPECT_TRUE(model->isDataSourceLoading());
+    }
+    EXPECT_FALSE(model->isDataSourceLoading());
+}
+
+TEST_F(ALoadingIndicator, HidesCreationChangeAndDestructionFromTheTransaction)
+{
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+    {
+        Model::DataSourceLoadingInProgressIndicator const loading = model->startDataSourceLoading();
+        Plain const element = Plain::create(model);
+        change(element, 1);
+        Plain::create(model)->destroy();
+        Plain::create(model)->setParent(element);
+    }
+    EXPECT_EQ(transaction.commit(), TransactionResult::Committed);
+
+    EXPECT_THAT(listener.committed, IsEmpty());
+    EXPECT_EQ(model->getElementCount(), 2u);
+}
+
+TEST_F(ALoadingIndicator, KeepsWhatWasLoadedWhenTheTransactionIsRolledBack)
+{
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+    Plain loaded;
+    {
+        Model::DataSourceLoadingInProgressIndicator const loading = model->startDataSourceLoading();
+        loaded = Plain::create(model);
+    }
+
+    transaction.rollBack();
+
+    EXPECT_TRUE(loaded);
+    EXPECT_EQ(model->findElement(loaded->getUuid()), loaded);
+}
+
+TEST_F(ALoadingIndicator, DoesNotHideAFreeze)
+{
+    Transaction const transaction = model->beginTransaction(/*revertible=*/false);
+    Model::Freezer const freezer = model->freeze();
+    Model::DataSourceLoadingInProgressIndicator const loading = model->startDataSourceLoading();
+
+    EXPECT_RAISES(messages::ModelFrozen, Plain::create(model));
+}
+
+TEST_F(ALoadingIndicator, DoesNotReplaceATransaction)
+{
+    Model::DataSourceLoadingInProgressIndicator const loading = model->startDataSourceLoading();
+
+    EXPECT_RAISES(messages::NoOpenTransaction, Plain::create(model));
+}
+
+// ---------------------------------------------------------------------------- outside transactions
+
+TEST(AChangeWithoutATransaction, IsAllowedInALoneModelThatNobodyListensTo)
+{
+    for (Model const& model : {Model::create(ModelConstellation()), Model::createTransientModel(),
+                               Model::createRegistryModel(u"registry://lone")})
+    {
+        Plain const element = Plain::create(model);
+        change(element, 3);
+        EXPECT_EQ(element->getValue(), 3);
+        EXPECT_EQ(model->getCurrentTransaction(), nullptr);
+    }
+}
+
+TEST(AChangeWithoutATransaction, IsRefusedWhereSomebodyListens)
+{
+    Model const model = Model::create(ModelConstellation());
+    Plain const element = Plain::create(model);
+    ScriptedListener listener;
+    listen(model, listener, {.shallow = true});
+
+    EXPECT_RAISES_WITH(messages::NoOpenTransaction, change(element, 1));
+    EXPECT_RAISES_WITH(messages::NoOpenTransaction, Plain::create(model));
+    model->removeListener(&listener);
+
+    change(element, 1);
+    EXPECT_EQ(element->getValue(), 1);
+}
+
+TEST(AChangeWithoutATransaction, IsRefusedInAConstellationOfSeveralModels)
+{
+    Model const model = Model::create(ModelConstellation());
+    Plain const element = Plain::create(model);
+    Model const second = Model::create(model->getModelConstellation());
+
+    EXPECT_RAISES(messages::NoOpenTransaction, change(element, 1));
+    EXPECT_RAISES(messages::NoOpenTransaction, Plain::create(second));
+    second->destroy();
+
+    change(element, 1);
+    EXPECT_EQ(element->getValue(), 1);
+}
+
+TEST(AChangeWithoutATransaction, IsRefusedAsFrozenFirst)
+{
+    Model const model = Model::create(ModelConstellation());
+    Plain const element = Plain::create(model);
+    Model const second = Model::create(model->getModelConstellation());
+    Model::Freezer const freezer = model->freeze();
+
+    EXPECT_RAISES(messages::ModelFrozen, change(element, 1));
+}
+}  // namespace
