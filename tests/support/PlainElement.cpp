@@ -490,6 +490,20 @@ Plain Plain::Builder::make(Orchestrator& orchestrator, UUID const& id)
     return result;
 }
 
+Plain addChain(Plain const& root, int length)
+{
+    Plain last = root;
+    for (int i = 0; i < length; ++i)
+    {
+        // past the search for circles, whose time grows with the depth
+        Plain const next = Plain::create(root->getModel());
+        last->fields.parts.push_back(next);
+        last->_setContainedByThis(next.getImpl(), Plain::Impl::PARTS_SLOT);
+        last = next;
+    }
+    return last;
+}
+
 // ---------------------------------------------------------------------------- leaks
 
 ExpectNoLeakedElements::ExpectNoLeakedElements() = default;

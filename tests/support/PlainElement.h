@@ -174,6 +174,9 @@ inline Plain::Impl* Plain::operator->() const
     return static_cast<Impl*>(m_impl);
 }
 
+/// A chain of elements below `root`, each a part of the one before; returns the last.
+Plain addChain(Plain const& root, int length);
+
 /// Expects that at its end as many elements are in memory as at its beginning.
 class ExpectNoLeakedElements
 {

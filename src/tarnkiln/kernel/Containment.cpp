@@ -6,7 +6,77 @@
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/services/datasource/DataSource.h"
 
+#include <utility>
+#include <vector>
+
 namespace tarn::kiln {
+
+namespace {
+
+/// How many levels of a tree are destroyed inside one another before deeper ones wait.
+constexpr int MAX_DESTRUCTION_DEPTH = 100;
+
+/// The levels of one tree that are being destroyed, and what waits for the outermost of them, so
+/// that a tree of any depth needs little stack.
+struct Destructions
+{
+    struct Waiting
+    {
+        ModelElement element;
+        ModelElement container; ///< To which the element still points.
+        bool keepIncoming;
+        bool multiModel;
+    };
+
+    int depth = 0;
+    std::vector<Waiting> waiting;
+};
+
+thread_local Destructions destructions;
+
+/// One level.
+class DestructionLevel
+{
+public:
+    DestructionLevel() { ++destructions.depth; }
+    DestructionLevel(DestructionLevel const&) = delete;
+    DestructionLevel& operator=(DestructionLevel const&) = delete;
+    ~DestructionLevel()
+    {
+        if (--destructions.depth == 0)
+            destructions.waiting.clear(); // not empty after a failure only
+    }
+
+    static bool isDeepest() { return destructions.depth == MAX_DESTRUCTION_DEPTH; }
+    /// Destroys what waits, if this is the outermost level.
+    void finish() const
+    {
+        while (destructions.depth == 1 && !destructions.waiting.empty()) {
+            Destructions::Waiting const next = std::move(destructions.waiting.back());
+            destructions.waiting.pop_back();
+            next.element->destroyRecursively(next.keepIncoming, /*removeFromContainer=*/false,
+                                             next.multiModel);
+        }
+    }
+};
+
+/// Lets a tree that is destroyed by a hook in the middle of another one count its own levels.
+class SeparateDestruction
+{
+public:
+    SeparateDestruction()
+        : m_outer(std::exchange(destructions, {}))
+    {
+    }
+    SeparateDestruction(SeparateDestruction const&) = delete;
+    SeparateDestruction& operator=(SeparateDestruction const&) = delete;
+    ~SeparateDestruction() { destructions = std::move(m_outer); }
+
+private:
+    Destructions m_outer;
+};
+
+} // namespace
 
 ModelElement ModelElement::Impl::container() const
 {
@@ -159,7 +229,12 @@ void ModelElement::Impl::destroy()
         return;
     ModelElement const keep(this);
     Model const model = getModel();
+    if (!model) {
+        invalidate(); // a proxy that outlived its model
+        return;
+    }
     bool const multiModel = model->isMultiModel();
+    SeparateDestruction const separate;
     Transaction const transaction = model->beginTransaction(/*revertible=*/false);
     if (model->getDataSource())
         model->getDataSource()->loadElementSubtree(keep);
@@ -172,7 +247,13 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
 {
     if (!isLive())
         return;
+    if (DestructionLevel::isDeepest() && !isProxy() && !removeFromContainer) {
+        destructions.waiting.push_back(
+            {ModelElement(this), container(), keepIncoming, multiModel});
+        return;
+    }
     ModelElement const keep(this);
+    DestructionLevel const level;
     if (!isProxy()) {
         aboutToDestroy();
         notifyDestroying();
@@ -181,6 +262,7 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
         if (removeFromContainer && !isTopLevel())
             _callInverseRemove(*m_container, m_containmentFeature);
         doDestroy(keepIncoming, multiModel);
+        level.finish();
     }
     invalidate();
 }
