@@ -64,7 +64,7 @@ private:
 };
 
 using AHandle = HandleTest;
-using ADestroyedElement = HandleTest;
+using AnInvalidatedObject = HandleTest;
 using AReleasedChain = HandleTest;
 using AnElementImpl = HandleTest;
 using AnInvalidateCallback = HandleTest;
@@ -281,7 +281,7 @@ TEST_F(AnElementImpl, LivesUntilItsLastReferenceIsGivenBack)
     EXPECT_EQ(Probe::inMemory, 0);
 }
 
-TEST_F(ADestroyedElement, StaysInMemoryWithItsUuidAndCounts)
+TEST_F(AnInvalidatedObject, StaysInMemoryWithItsUuidAndCounts)
 {
     Handle const handle(new Probe(uuidOf(3)));
 
@@ -296,7 +296,7 @@ TEST_F(ADestroyedElement, StaysInMemoryWithItsUuidAndCounts)
     EXPECT_EQ(Probe::inMemory, 1);
 }
 
-TEST_F(ADestroyedElement, TestsTrueAgainInOldHandlesWhenItIsBroughtBack)
+TEST_F(AnInvalidatedObject, TestsTrueAgainInOldHandlesWhenItIsBroughtBack)
 {
     Handle const handle(new Probe);
     handle->invalidate();
