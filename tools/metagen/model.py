@@ -24,6 +24,23 @@ def comment(text, indent=0):
     return "\n".join((prefix + line).rstrip() for line in lines)
 
 
+def fill(head, items, tail, indent):
+    """A list on one line if it fits; else on lines of its own, `indent` deep, each as full as may
+    be."""
+    line = head + ", ".join(items) + tail
+    if len(line) <= WIDTH:
+        return line
+    lines, current = [head.rstrip()], " " * indent
+    for position, item in enumerate(items):
+        piece = item + (tail if position == len(items) - 1 else ",")
+        gap = "" if current.isspace() else " "
+        if len(current) + len(gap) + len(piece) > WIDTH and gap:
+            lines.append(current)
+            current, gap = " " * indent, ""
+        current += gap + piece
+    return "\n".join(lines + [current])
+
+
 def spoken(name):
     """`EnumLiteral` as a reader says it: "enum literal"."""
     words = re.findall(r"[A-Z]+(?=[A-Z][a-z])|[A-Z][a-z]*|[A-Z]+", name)
@@ -160,14 +177,21 @@ class Property:
 
     @property
     def is_unique(self):
-        return "true" if self.facts["unique"] else "false"
+        return "/*unique=*/" + ("true" if self.facts["unique"] else "false")
+
+    def maker_head(self, scope, indent, end):
+        """The head of the function that makes the collection, in or outside the class."""
+        result = " " * indent + f"{'' if scope else 'static '}std::unique_ptr<{self.collection}>"
+        name = f"{scope}{self.maker}(Impl* owner){end}"
+        gap = " " if len(result) + 1 + len(name) <= WIDTH else "\n" + " " * indent
+        return result + gap + name
 
     @property
     def key_expression(self):
         return f"static_cast<{self.target.name}::Impl*>(member)->{self.qualifier.getter}()"
 
     @property
-    def slot_initializer(self):
+    def slot_definition(self):
         parts = [f".index = {self.index}"]
         if self.composite:
             parts.append(".composite = true")
@@ -177,22 +201,41 @@ class Property:
             parts.append(".keyed = true")
         if self.opposite:
             parts.append(f".opposite = &{self.opposite.owner.name}::Impl::{self.opposite.constant}")
-        return ", ".join(parts)
+        head = f"constinit Slot const {self.owner.name}::Impl::{self.constant}{{"
+        return fill(head, parts, "};", 4)
+
+    def row(self, end):
+        """Its row in the table of the class; `end` closes the line."""
+        kind, *arguments = {
+            "scalar": ["Scalar", self.field_pointer, self.constant, self.setter_pointer],
+            "optional": ["Optional", self.field_pointer, self.constant, self.setter_pointer],
+            "reference": ["Reference", self.facts["type"], self.field_pointer, self.constant,
+                          self.setter_pointer],
+            "composite reference": ["CompositeReference", self.facts["type"], self.field_pointer,
+                                    self.constant, self.setter_pointer],
+            "container": ["Container", self.facts["type"], self.constant, self.setter_pointer],
+            "references": ["References", self.field_pointer, self.constant, self.maker_pointer,
+                           f"&Impl::{self.getter}"],
+            "values": ["Values", self.field_pointer, self.constant, self.maker_pointer,
+                       f"&Impl::{self.getter}"],
+        }[self.kind]
+        return fill(f"        support::{kind}<", arguments, ">" + end, 12)
 
     @property
-    def row(self):
-        own = f"&Impl::{self.field}, {self.constant}"
-        setter = f"&Impl::{self.setter}"
-        return {
-            "scalar": f"Scalar<{own}, {setter}>",
-            "optional": f"Optional<{own}, {setter}>",
-            "reference": f"Reference<{self.type}, {own}, {setter}>" if self.is_element else "",
-            "composite reference":
-                f"CompositeReference<{self.type}, {own}, {setter}>" if self.is_element else "",
-            "container": f"Container<{self.type}, {self.constant}, {setter}>",
-            "references": f"References<{own}, &Impl::{self.maker}, &Impl::{self.getter}>",
-            "values": f"Values<{own}, &Impl::{self.maker}, &Impl::{self.getter}>",
-        }[self.kind]
+    def field_pointer(self):
+        return f"&Impl::{self.field}"
+
+    @property
+    def setter_pointer(self):
+        return f"&Impl::{self.setter}"
+
+    @property
+    def maker_pointer(self):
+        return f"&Impl::{self.maker}"
+
+    def call(self, head, *arguments):
+        """A call as a statement in a function body."""
+        return fill(f"    {head}(", arguments, ");", 8)
 
     @property
     def doc(self):
@@ -369,6 +412,15 @@ class Class:
     @property
     def base_impl(self):
         return f"{self.superclass}::Impl"
+
+    @property
+    def class_head(self):
+        return fill(f"class {self.package.export} {self.name}::Impl ",
+                    [f": public support::Dispatched<{self.name}::Impl, {self.base_impl}>"], "", 4)
+
+    def instantiation(self, word, template, base):
+        head = f"{word}template class tarn::kiln::support::{template}<"
+        return fill(head, [self.qualified_impl, base], ">;", 4)
 
     @property
     def qualified_impl(self):

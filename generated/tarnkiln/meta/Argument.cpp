@@ -8,11 +8,8 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Argument::Impl::OPERATION{
-    .index = 6, .opposite = &Operation::Impl::ARGUMENTS};
-
-constinit Slot const Argument::Impl::IS_INPUT{
-    .index = 7};
+constinit Slot const Argument::Impl::OPERATION{.index = 6, .opposite = &Operation::Impl::ARGUMENTS};
+constinit Slot const Argument::Impl::IS_INPUT{.index = 7};
 
 Argument Argument::cast(ModelElement const& element)
 {
@@ -29,10 +26,7 @@ Argument Argument::create(Model const& model, UUID const& id)
     return support::create<Argument>(model, id);
 }
 
-Argument::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Argument::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Argument::Impl::~Impl() = default;
 

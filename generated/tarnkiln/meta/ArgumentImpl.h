@@ -51,10 +51,7 @@ public:
         support::Scalar<&Impl::m_isInput, IS_INPUT, &Impl::setIsInput>>;
 };
 
-inline Argument::Argument(Impl* impl)
-    : TypedElement(impl)
-{
-}
+inline Argument::Argument(Impl* impl) : TypedElement(impl) {}
 inline Argument::Impl* Argument::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

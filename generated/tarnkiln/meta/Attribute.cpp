@@ -10,9 +10,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Attribute::Impl::KEY{
-    .index = 1};
-
+constinit Slot const Attribute::Impl::KEY{.index = 1};
 constinit Slot const Attribute::Impl::OWNER{
     .index = 2, .opposite = &AttributeMap::Impl::ATTRIBUTES};
 
@@ -26,19 +24,17 @@ meta::Class const& Attribute::metaClass()
     return support::unbuiltClass();
 }
 
-Attribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Attribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Attribute::Impl::~Impl() = default;
 
 void Attribute::Impl::setKey(ustring const& key)
 {
-    support::changeKey(
-        *this, getKey(), key, getOwner(), OWNER,
-        [&] { support::requireFreeKey(getOwner()->getAttributes(), key); },
-        [&] { support::setScalar(*this, m_key, KEY, key); });
+    auto const requireFree = [&] {
+        support::requireFreeKey(getOwner()->getAttributes(), key);
+    };
+    auto const store = [&] { support::setScalar(*this, m_key, KEY, key); };
+    support::changeKey(*this, getKey(), key, getOwner(), OWNER, requireFree, store);
 }
 
 AttributeMap Attribute::Impl::getOwner() const
@@ -58,9 +54,10 @@ bool Attribute::Impl::hasOwner() const
 
 void Attribute::Impl::setOwner(AttributeMap const& owner)
 {
-    support::setContainer(*this, OWNER, owner.getImpl(), [&] {
+    auto const requireFree = [&] {
         support::requireFreeKey(owner->getAttributes(), getKey());
-    });
+    };
+    support::setContainer(*this, OWNER, owner.getImpl(), requireFree);
 }
 }  // namespace tarn::kiln::meta
 

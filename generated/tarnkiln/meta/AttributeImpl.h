@@ -51,10 +51,7 @@ public:
         support::Container<AttributeMap, OWNER, &Impl::setOwner>>;
 };
 
-inline Attribute::Attribute(Impl* impl)
-    : ModelElement(impl)
-{
-}
+inline Attribute::Attribute(Impl* impl) : ModelElement(impl) {}
 inline Attribute::Impl* Attribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -9,7 +9,8 @@
 namespace tarn::kiln::meta {
 
 constinit Slot const AttributeMap::Impl::ATTRIBUTES{
-    .index = 1, .composite = true, .single = false, .keyed = true, .opposite = &Attribute::Impl::OWNER};
+    .index = 1, .composite = true, .single = false, .keyed = true,
+    .opposite = &Attribute::Impl::OWNER};
 
 AttributeMap AttributeMap::cast(ModelElement const& element)
 {
@@ -26,10 +27,7 @@ AttributeMap AttributeMap::create(Model const& model, UUID const& id)
     return support::create<AttributeMap>(model, id);
 }
 
-AttributeMap::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+AttributeMap::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 AttributeMap::Impl::~Impl() = default;
 

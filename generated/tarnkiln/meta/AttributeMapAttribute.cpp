@@ -8,8 +8,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const AttributeMapAttribute::Impl::VALUE{
-    .index = 3, .composite = true};
+constinit Slot const AttributeMapAttribute::Impl::VALUE{.index = 3, .composite = true};
 
 AttributeMapAttribute AttributeMapAttribute::cast(ModelElement const& element)
 {
@@ -26,10 +25,7 @@ AttributeMapAttribute AttributeMapAttribute::create(Model const& model, UUID con
     return support::create<AttributeMapAttribute>(model, id);
 }
 
-AttributeMapAttribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+AttributeMapAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 AttributeMapAttribute::Impl::~Impl() = default;
 

@@ -46,10 +46,7 @@ public:
         support::CompositeReference<AttributeMap, &Impl::m_value, VALUE, &Impl::setValue>>;
 };
 
-inline AttributeMapAttribute::AttributeMapAttribute(Impl* impl)
-    : Attribute(impl)
-{
-}
+inline AttributeMapAttribute::AttributeMapAttribute(Impl* impl) : Attribute(impl) {}
 inline AttributeMapAttribute::Impl* AttributeMapAttribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -47,13 +47,11 @@ private:
 
 public:
     using Rows = support::RowList<
-        support::References<&Impl::m_attributes, ATTRIBUTES, &Impl::makeAttributes, &Impl::getAttributes>>;
+        support::References<
+            &Impl::m_attributes, ATTRIBUTES, &Impl::makeAttributes, &Impl::getAttributes>>;
 };
 
-inline AttributeMap::AttributeMap(Impl* impl)
-    : ModelElement(impl)
-{
-}
+inline AttributeMap::AttributeMap(Impl* impl) : ModelElement(impl) {}
 inline AttributeMap::Impl* AttributeMap::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -7,8 +7,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const BooleanAttribute::Impl::VALUE{
-    .index = 3};
+constinit Slot const BooleanAttribute::Impl::VALUE{.index = 3};
 
 BooleanAttribute BooleanAttribute::cast(ModelElement const& element)
 {
@@ -25,10 +24,7 @@ BooleanAttribute BooleanAttribute::create(Model const& model, UUID const& id)
     return support::create<BooleanAttribute>(model, id);
 }
 
-BooleanAttribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+BooleanAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 BooleanAttribute::Impl::~Impl() = default;
 

@@ -41,10 +41,7 @@ public:
         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>>;
 };
 
-inline BooleanAttribute::BooleanAttribute(Impl* impl)
-    : Attribute(impl)
-{
-}
+inline BooleanAttribute::BooleanAttribute(Impl* impl) : Attribute(impl) {}
 inline BooleanAttribute::Impl* BooleanAttribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

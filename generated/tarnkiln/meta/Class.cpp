@@ -8,14 +8,11 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Class::Impl::SUPERCLASS{
-    .index = 9};
-
+constinit Slot const Class::Impl::SUPERCLASS{.index = 9};
 constinit Slot const Class::Impl::EXTENSIONS{
-    .index = 10, .composite = true, .single = false, .keyed = true, .opposite = &DynamicExtensions::Impl::OWNING_CLASS};
-
-constinit Slot const Class::Impl::IS_ABSTRACT{
-    .index = 11};
+    .index = 10, .composite = true, .single = false, .keyed = true,
+    .opposite = &DynamicExtensions::Impl::OWNING_CLASS};
+constinit Slot const Class::Impl::IS_ABSTRACT{.index = 11};
 
 Class Class::cast(ModelElement const& element)
 {
@@ -32,10 +29,7 @@ Class Class::create(Model const& model, UUID const& id)
     return support::create<Class>(model, id);
 }
 
-Class::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Class::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Class::Impl::~Impl() = default;
 
@@ -54,7 +48,8 @@ void Class::Impl::setSuperclass(Class const& superclass)
     support::setReference(*this, m_superclass, SUPERCLASS, superclass.getImpl());
 }
 
-std::unique_ptr<ElementMap<unsigned long, DynamicExtensions>> Class::Impl::makeExtensions(Impl* owner)
+std::unique_ptr<ElementMap<unsigned long, DynamicExtensions>>
+Class::Impl::makeExtensions(Impl* owner)
 {
     auto const keyOf = [](ModelElement::Impl* member) {
         return static_cast<DynamicExtensions::Impl*>(member)->getModelID();

@@ -21,8 +21,7 @@ namespace tarn::kiln::meta {
 /// changes nothing.
 ///
 /// Threads: as the handle.
-class TARNKILN_EXPORT Class::Impl
-    : public support::Dispatched<Class::Impl, StructuredType::Impl>
+class TARNKILN_EXPORT Class::Impl : public support::Dispatched<Class::Impl, StructuredType::Impl>
 {
 public:
     using Handle = Class;
@@ -66,7 +65,8 @@ public:
     ModelElement instantiate(Model const& model, UUID const& id) const;
 
 private:
-    static std::unique_ptr<ElementMap<unsigned long, DynamicExtensions>> makeExtensions(Impl* owner);
+    static std::unique_ptr<ElementMap<unsigned long, DynamicExtensions>>
+    makeExtensions(Impl* owner);
 
     mutable support::CountedPointer<Class::Impl> m_superclass;
     mutable support::LazyCollection<ElementMap<unsigned long, DynamicExtensions>> m_extensions;
@@ -75,14 +75,12 @@ private:
 public:
     using Rows = support::RowList<
         support::Reference<Class, &Impl::m_superclass, SUPERCLASS, &Impl::setSuperclass>,
-        support::References<&Impl::m_extensions, EXTENSIONS, &Impl::makeExtensions, &Impl::getExtensions>,
+        support::References<
+            &Impl::m_extensions, EXTENSIONS, &Impl::makeExtensions, &Impl::getExtensions>,
         support::Scalar<&Impl::m_isAbstract, IS_ABSTRACT, &Impl::setIsAbstract>>;
 };
 
-inline Class::Class(Impl* impl)
-    : StructuredType(impl)
-{
-}
+inline Class::Class(Impl* impl) : StructuredType(impl) {}
 inline Class::Impl* Class::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -22,10 +22,7 @@ DataType DataType::create(Model const& model, UUID const& id)
     return support::create<DataType>(model, id);
 }
 
-DataType::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+DataType::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 DataType::Impl::~Impl() = default;
 }  // namespace tarn::kiln::meta

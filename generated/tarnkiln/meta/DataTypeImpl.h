@@ -33,10 +33,7 @@ public:
     using Rows = support::RowList<>;
 };
 
-inline DataType::DataType(Impl* impl)
-    : StructuredType(impl)
-{
-}
+inline DataType::DataType(Impl* impl) : StructuredType(impl) {}
 inline DataType::Impl* DataType::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -7,8 +7,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const DateTimeAttribute::Impl::VALUE{
-    .index = 3};
+constinit Slot const DateTimeAttribute::Impl::VALUE{.index = 3};
 
 DateTimeAttribute DateTimeAttribute::cast(ModelElement const& element)
 {
@@ -25,10 +24,7 @@ DateTimeAttribute DateTimeAttribute::create(Model const& model, UUID const& id)
     return support::create<DateTimeAttribute>(model, id);
 }
 
-DateTimeAttribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+DateTimeAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 DateTimeAttribute::Impl::~Impl() = default;
 

@@ -43,10 +43,7 @@ public:
         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>>;
 };
 
-inline DateTimeAttribute::DateTimeAttribute(Impl* impl)
-    : Attribute(impl)
-{
-}
+inline DateTimeAttribute::DateTimeAttribute(Impl* impl) : Attribute(impl) {}
 inline DateTimeAttribute::Impl* DateTimeAttribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

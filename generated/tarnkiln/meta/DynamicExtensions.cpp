@@ -11,12 +11,10 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const DynamicExtensions::Impl::MODEL_ID{
-    .index = 1};
-
+constinit Slot const DynamicExtensions::Impl::MODEL_ID{.index = 1};
 constinit Slot const DynamicExtensions::Impl::EXTENSIONS{
-    .index = 2, .composite = true, .single = false, .keyed = true, .opposite = &Extension::Impl::OWNER};
-
+    .index = 2, .composite = true, .single = false, .keyed = true,
+    .opposite = &Extension::Impl::OWNER};
 constinit Slot const DynamicExtensions::Impl::OWNING_CLASS{
     .index = 3, .opposite = &Class::Impl::EXTENSIONS};
 
@@ -35,10 +33,7 @@ DynamicExtensions DynamicExtensions::create(Model const& model, UUID const& id)
     return support::create<DynamicExtensions>(model, id);
 }
 
-DynamicExtensions::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+DynamicExtensions::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 DynamicExtensions::Impl::~Impl() = default;
 
@@ -72,9 +67,10 @@ bool DynamicExtensions::Impl::hasOwningClass() const
 
 void DynamicExtensions::Impl::setOwningClass(Class const& owningClass)
 {
-    support::setContainer(*this, OWNING_CLASS, owningClass.getImpl(), [&] {
+    auto const requireFree = [&] {
         support::requireFreeKey(owningClass->getExtensions(), getModelID());
-    });
+    };
+    support::setContainer(*this, OWNING_CLASS, owningClass.getImpl(), requireFree);
 }
 }  // namespace tarn::kiln::meta
 

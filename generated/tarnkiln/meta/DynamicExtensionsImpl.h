@@ -61,14 +61,12 @@ private:
 public:
     using Rows = support::RowList<
         support::Scalar<&Impl::m_modelID, MODEL_ID, &Impl::setModelID>,
-        support::References<&Impl::m_extensions, EXTENSIONS, &Impl::makeExtensions, &Impl::getExtensions>,
+        support::References<
+            &Impl::m_extensions, EXTENSIONS, &Impl::makeExtensions, &Impl::getExtensions>,
         support::Container<Class, OWNING_CLASS, &Impl::setOwningClass>>;
 };
 
-inline DynamicExtensions::DynamicExtensions(Impl* impl)
-    : ModelElement(impl)
-{
-}
+inline DynamicExtensions::DynamicExtensions(Impl* impl) : ModelElement(impl) {}
 inline DynamicExtensions::Impl* DynamicExtensions::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -10,10 +10,9 @@
 namespace tarn::kiln::meta {
 
 constinit Slot const Enum::Impl::LITERALS{
-    .index = 4, .composite = true, .single = false, .keyed = true, .opposite = &EnumLiteral::Impl::PARENT_ENUM};
-
-constinit Slot const Enum::Impl::UNDERLYING_TYPE{
-    .index = 5};
+    .index = 4, .composite = true, .single = false, .keyed = true,
+    .opposite = &EnumLiteral::Impl::PARENT_ENUM};
+constinit Slot const Enum::Impl::UNDERLYING_TYPE{.index = 5};
 
 Enum Enum::cast(ModelElement const& element)
 {
@@ -30,10 +29,7 @@ Enum Enum::create(Model const& model, UUID const& id)
     return support::create<Enum>(model, id);
 }
 
-Enum::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Enum::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Enum::Impl::~Impl() = default;
 

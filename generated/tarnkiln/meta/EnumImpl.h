@@ -21,8 +21,7 @@ namespace tarn::kiln::meta {
 /// changes nothing.
 ///
 /// Threads: as the handle.
-class TARNKILN_EXPORT Enum::Impl
-    : public support::Dispatched<Enum::Impl, Type::Impl>
+class TARNKILN_EXPORT Enum::Impl : public support::Dispatched<Enum::Impl, Type::Impl>
 {
 public:
     using Handle = Enum;
@@ -63,13 +62,11 @@ private:
 public:
     using Rows = support::RowList<
         support::References<&Impl::m_literals, LITERALS, &Impl::makeLiterals, &Impl::getLiterals>,
-        support::Reference<PrimitiveType, &Impl::m_underlyingType, UNDERLYING_TYPE, &Impl::setUnderlyingType>>;
+        support::Reference<
+            PrimitiveType, &Impl::m_underlyingType, UNDERLYING_TYPE, &Impl::setUnderlyingType>>;
 };
 
-inline Enum::Enum(Impl* impl)
-    : Type(impl)
-{
-}
+inline Enum::Enum(Impl* impl) : Type(impl) {}
 inline Enum::Impl* Enum::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

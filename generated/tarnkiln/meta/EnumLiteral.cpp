@@ -10,14 +10,9 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const EnumLiteral::Impl::VALUE{
-    .index = 2};
-
-constinit Slot const EnumLiteral::Impl::PARENT_ENUM{
-    .index = 3, .opposite = &Enum::Impl::LITERALS};
-
-constinit Slot const EnumLiteral::Impl::PUBLIC_IDENTIFIER{
-    .index = 4};
+constinit Slot const EnumLiteral::Impl::VALUE{.index = 2};
+constinit Slot const EnumLiteral::Impl::PARENT_ENUM{.index = 3, .opposite = &Enum::Impl::LITERALS};
+constinit Slot const EnumLiteral::Impl::PUBLIC_IDENTIFIER{.index = 4};
 
 EnumLiteral EnumLiteral::cast(ModelElement const& element)
 {
@@ -34,10 +29,7 @@ EnumLiteral EnumLiteral::create(Model const& model, UUID const& id)
     return support::create<EnumLiteral>(model, id);
 }
 
-EnumLiteral::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+EnumLiteral::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 EnumLiteral::Impl::~Impl() = default;
 
@@ -63,9 +55,10 @@ bool EnumLiteral::Impl::hasParentEnum() const
 
 void EnumLiteral::Impl::setParentEnum(Enum const& parentEnum)
 {
-    support::setContainer(*this, PARENT_ENUM, parentEnum.getImpl(), [&] {
+    auto const requireFree = [&] {
         support::requireFreeKey(parentEnum->getLiterals(), getName());
-    });
+    };
+    support::setContainer(*this, PARENT_ENUM, parentEnum.getImpl(), requireFree);
 }
 
 void EnumLiteral::Impl::setPublicIdentifier(boost::optional<ustring> const& publicIdentifier)
@@ -75,10 +68,11 @@ void EnumLiteral::Impl::setPublicIdentifier(boost::optional<ustring> const& publ
 
 void EnumLiteral::Impl::setName(ustring const& name)
 {
-    support::changeKey(
-        *this, getName(), name, getParentEnum(), PARENT_ENUM,
-        [&] { support::requireFreeKey(getParentEnum()->getLiterals(), name); },
-        [&] { NamedElement::Impl::setName(name); });
+    auto const requireFree = [&] {
+        support::requireFreeKey(getParentEnum()->getLiterals(), name);
+    };
+    auto const store = [&] { NamedElement::Impl::setName(name); };
+    support::changeKey(*this, getName(), name, getParentEnum(), PARENT_ENUM, requireFree, store);
 }
 }  // namespace tarn::kiln::meta
 

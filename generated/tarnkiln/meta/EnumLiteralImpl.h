@@ -65,13 +65,11 @@ public:
     using Rows = support::RowList<
         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>,
         support::Container<Enum, PARENT_ENUM, &Impl::setParentEnum>,
-        support::Optional<&Impl::m_publicIdentifier, PUBLIC_IDENTIFIER, &Impl::setPublicIdentifier>>;
+        support::Optional<
+            &Impl::m_publicIdentifier, PUBLIC_IDENTIFIER, &Impl::setPublicIdentifier>>;
 };
 
-inline EnumLiteral::EnumLiteral(Impl* impl)
-    : NamedElement(impl)
-{
-}
+inline EnumLiteral::EnumLiteral(Impl* impl) : NamedElement(impl) {}
 inline EnumLiteral::Impl* EnumLiteral::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

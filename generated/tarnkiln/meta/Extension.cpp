@@ -28,10 +28,7 @@ Extension Extension::create(Model const& model, UUID const& id)
     return support::create<Extension>(model, id);
 }
 
-Extension::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Extension::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Extension::Impl::~Impl() = default;
 
@@ -52,17 +49,19 @@ bool Extension::Impl::hasOwner() const
 
 void Extension::Impl::setOwner(DynamicExtensions const& owner)
 {
-    support::setContainer(*this, OWNER, owner.getImpl(), [&] {
+    auto const requireFree = [&] {
         support::requireFreeKey(owner->getExtensions(), getName());
-    });
+    };
+    support::setContainer(*this, OWNER, owner.getImpl(), requireFree);
 }
 
 void Extension::Impl::setName(ustring const& name)
 {
-    support::changeKey(
-        *this, getName(), name, getOwner(), OWNER,
-        [&] { support::requireFreeKey(getOwner()->getExtensions(), name); },
-        [&] { Property::Impl::setName(name); });
+    auto const requireFree = [&] {
+        support::requireFreeKey(getOwner()->getExtensions(), name);
+    };
+    auto const store = [&] { Property::Impl::setName(name); };
+    support::changeKey(*this, getName(), name, getOwner(), OWNER, requireFree, store);
 }
 }  // namespace tarn::kiln::meta
 

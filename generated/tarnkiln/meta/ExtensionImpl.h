@@ -19,8 +19,7 @@ namespace tarn::kiln::meta {
 /// changes nothing.
 ///
 /// Threads: as the handle.
-class TARNKILN_EXPORT Extension::Impl
-    : public support::Dispatched<Extension::Impl, Property::Impl>
+class TARNKILN_EXPORT Extension::Impl : public support::Dispatched<Extension::Impl, Property::Impl>
 {
 public:
     using Handle = Extension;
@@ -56,10 +55,7 @@ public:
         support::Container<DynamicExtensions, OWNER, &Impl::setOwner>>;
 };
 
-inline Extension::Extension(Impl* impl)
-    : Property(impl)
-{
-}
+inline Extension::Extension(Impl* impl) : Property(impl) {}
 inline Extension::Impl* Extension::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

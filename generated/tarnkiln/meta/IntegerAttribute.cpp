@@ -7,8 +7,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const IntegerAttribute::Impl::VALUE{
-    .index = 3};
+constinit Slot const IntegerAttribute::Impl::VALUE{.index = 3};
 
 IntegerAttribute IntegerAttribute::cast(ModelElement const& element)
 {
@@ -25,10 +24,7 @@ IntegerAttribute IntegerAttribute::create(Model const& model, UUID const& id)
     return support::create<IntegerAttribute>(model, id);
 }
 
-IntegerAttribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+IntegerAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 IntegerAttribute::Impl::~Impl() = default;
 

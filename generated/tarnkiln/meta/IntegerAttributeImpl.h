@@ -41,10 +41,7 @@ public:
         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>>;
 };
 
-inline IntegerAttribute::IntegerAttribute(Impl* impl)
-    : Attribute(impl)
-{
-}
+inline IntegerAttribute::IntegerAttribute(Impl* impl) : Attribute(impl) {}
 inline IntegerAttribute::Impl* IntegerAttribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

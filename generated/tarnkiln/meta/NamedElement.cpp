@@ -7,8 +7,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const NamedElement::Impl::NAME{
-    .index = 1};
+constinit Slot const NamedElement::Impl::NAME{.index = 1};
 
 NamedElement NamedElement::cast(ModelElement const& element)
 {
@@ -25,10 +24,7 @@ NamedElement NamedElement::create(Model const& model, UUID const& id)
     return support::create<NamedElement>(model, id);
 }
 
-NamedElement::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+NamedElement::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 NamedElement::Impl::~Impl() = default;
 

@@ -40,10 +40,7 @@ public:
         support::Scalar<&Impl::m_name, NAME, &Impl::setName>>;
 };
 
-inline NamedElement::NamedElement(Impl* impl)
-    : ModelElement(impl)
-{
-}
+inline NamedElement::NamedElement(Impl* impl) : ModelElement(impl) {}
 inline NamedElement::Impl* NamedElement::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

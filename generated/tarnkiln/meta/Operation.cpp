@@ -13,21 +13,12 @@ namespace tarn::kiln::meta {
 
 constinit Slot const Operation::Impl::ARGUMENTS{
     .index = 6, .composite = true, .single = false, .opposite = &Argument::Impl::OPERATION};
-
 constinit Slot const Operation::Impl::OWNING_TYPE{
     .index = 7, .opposite = &StructuredType::Impl::OWNED_OPERATIONS};
-
-constinit Slot const Operation::Impl::IS_ABSTRACT{
-    .index = 8};
-
-constinit Slot const Operation::Impl::IS_STATIC{
-    .index = 9};
-
-constinit Slot const Operation::Impl::IS_PUBLIC{
-    .index = 10};
-
-constinit Slot const Operation::Impl::IS_EVENT{
-    .index = 11};
+constinit Slot const Operation::Impl::IS_ABSTRACT{.index = 8};
+constinit Slot const Operation::Impl::IS_STATIC{.index = 9};
+constinit Slot const Operation::Impl::IS_PUBLIC{.index = 10};
+constinit Slot const Operation::Impl::IS_EVENT{.index = 11};
 
 Operation Operation::cast(ModelElement const& element)
 {
@@ -44,16 +35,13 @@ Operation Operation::create(Model const& model, UUID const& id)
     return support::create<Operation>(model, id);
 }
 
-Operation::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Operation::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Operation::Impl::~Impl() = default;
 
 std::unique_ptr<ElementSequence<Argument>> Operation::Impl::makeArguments(Impl* owner)
 {
-    return std::make_unique<ElementSequence<Argument>>(owner, true, ARGUMENTS);
+    return std::make_unique<ElementSequence<Argument>>(owner, /*unique=*/true, ARGUMENTS);
 }
 
 ElementSequence<Argument>& Operation::Impl::getArguments() const
@@ -103,10 +91,9 @@ void Operation::Impl::setIsEvent(bool event)
 
 void Operation::Impl::setName(ustring const& name)
 {
-    support::changeKey(
-        *this, getName(), name, getOwningType(), OWNING_TYPE,
-        [] {},
-        [&] { TypedElement::Impl::setName(name); });
+    auto const requireFree = [] {};
+    auto const store = [&] { TypedElement::Impl::setName(name); };
+    support::changeKey(*this, getName(), name, getOwningType(), OWNING_TYPE, requireFree, store);
 }
 }  // namespace tarn::kiln::meta
 

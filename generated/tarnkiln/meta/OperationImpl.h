@@ -81,7 +81,8 @@ private:
 
 public:
     using Rows = support::RowList<
-        support::References<&Impl::m_arguments, ARGUMENTS, &Impl::makeArguments, &Impl::getArguments>,
+        support::References<
+            &Impl::m_arguments, ARGUMENTS, &Impl::makeArguments, &Impl::getArguments>,
         support::Container<StructuredType, OWNING_TYPE, &Impl::setOwningType>,
         support::Scalar<&Impl::m_isAbstract, IS_ABSTRACT, &Impl::setIsAbstract>,
         support::Scalar<&Impl::m_isStatic, IS_STATIC, &Impl::setIsStatic>,
@@ -89,10 +90,7 @@ public:
         support::Scalar<&Impl::m_isEvent, IS_EVENT, &Impl::setIsEvent>>;
 };
 
-inline Operation::Operation(Impl* impl)
-    : TypedElement(impl)
-{
-}
+inline Operation::Operation(Impl* impl) : TypedElement(impl) {}
 inline Operation::Impl* Operation::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -11,22 +11,16 @@
 namespace tarn::kiln::meta {
 
 constinit Slot const Package::Impl::OWNED_TYPES{
-    .index = 2, .composite = true, .single = false, .keyed = true, .opposite = &Type::Impl::OWNING_PACKAGE};
-
+    .index = 2, .composite = true, .single = false, .keyed = true,
+    .opposite = &Type::Impl::OWNING_PACKAGE};
 constinit Slot const Package::Impl::NESTED_PACKAGES{
-    .index = 3, .composite = true, .single = false, .keyed = true, .opposite = &Package::Impl::PARENT_PACKAGE};
-
-constinit Slot const Package::Impl::URI{
-    .index = 4};
-
+    .index = 3, .composite = true, .single = false, .keyed = true,
+    .opposite = &Package::Impl::PARENT_PACKAGE};
+constinit Slot const Package::Impl::URI{.index = 4};
 constinit Slot const Package::Impl::PARENT_PACKAGE{
     .index = 5, .opposite = &Package::Impl::NESTED_PACKAGES};
-
-constinit Slot const Package::Impl::IMPORTED_PACKAGE_URIS{
-    .index = 6, .single = false};
-
-constinit Slot const Package::Impl::DEFAULT_VOBJ_CATEGORY{
-    .index = 7};
+constinit Slot const Package::Impl::IMPORTED_PACKAGE_URIS{.index = 6, .single = false};
+constinit Slot const Package::Impl::DEFAULT_VOBJ_CATEGORY{.index = 7};
 
 Package Package::cast(ModelElement const& element)
 {
@@ -43,10 +37,7 @@ Package Package::create(Model const& model, UUID const& id)
     return support::create<Package>(model, id);
 }
 
-Package::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Package::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Package::Impl::~Impl() = default;
 
@@ -98,14 +89,16 @@ bool Package::Impl::hasParentPackage() const
 
 void Package::Impl::setParentPackage(Package const& parentPackage)
 {
-    support::setContainer(*this, PARENT_PACKAGE, parentPackage.getImpl(), [&] {
+    auto const requireFree = [&] {
         support::requireFreeKey(parentPackage->getNestedPackages(), getName());
-    });
+    };
+    support::setContainer(*this, PARENT_PACKAGE, parentPackage.getImpl(), requireFree);
 }
 
 std::unique_ptr<PrimitiveSequence<ustring>> Package::Impl::makeImportedPackageURIs(Impl* owner)
 {
-    return std::make_unique<PrimitiveSequence<ustring>>(owner, false, IMPORTED_PACKAGE_URIS);
+    return std::make_unique<PrimitiveSequence<ustring>>(
+        owner, /*unique=*/false, IMPORTED_PACKAGE_URIS);
 }
 
 PrimitiveSequence<ustring>& Package::Impl::getImportedPackageURIs() const
@@ -120,10 +113,12 @@ void Package::Impl::setDefaultVobjCategory(boost::optional<string> const& defaul
 
 void Package::Impl::setName(ustring const& name)
 {
+    auto const requireFree = [&] {
+        support::requireFreeKey(getParentPackage()->getNestedPackages(), name);
+    };
+    auto const store = [&] { NamedElement::Impl::setName(name); };
     support::changeKey(
-        *this, getName(), name, getParentPackage(), PARENT_PACKAGE,
-        [&] { support::requireFreeKey(getParentPackage()->getNestedPackages(), name); },
-        [&] { NamedElement::Impl::setName(name); });
+        *this, getName(), name, getParentPackage(), PARENT_PACKAGE, requireFree, store);
 }
 }  // namespace tarn::kiln::meta
 

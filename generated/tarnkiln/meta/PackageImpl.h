@@ -23,8 +23,7 @@ namespace tarn::kiln::meta {
 /// changes nothing.
 ///
 /// Threads: as the handle.
-class TARNKILN_EXPORT Package::Impl
-    : public support::Dispatched<Package::Impl, NamedElement::Impl>
+class TARNKILN_EXPORT Package::Impl : public support::Dispatched<Package::Impl, NamedElement::Impl>
 {
 public:
     using Handle = Package;
@@ -95,18 +94,21 @@ private:
 
 public:
     using Rows = support::RowList<
-        support::References<&Impl::m_ownedTypes, OWNED_TYPES, &Impl::makeOwnedTypes, &Impl::getOwnedTypes>,
-        support::References<&Impl::m_nestedPackages, NESTED_PACKAGES, &Impl::makeNestedPackages, &Impl::getNestedPackages>,
+        support::References<
+            &Impl::m_ownedTypes, OWNED_TYPES, &Impl::makeOwnedTypes, &Impl::getOwnedTypes>,
+        support::References<
+            &Impl::m_nestedPackages, NESTED_PACKAGES, &Impl::makeNestedPackages,
+            &Impl::getNestedPackages>,
         support::Scalar<&Impl::m_uri, URI, &Impl::setUri>,
         support::Container<Package, PARENT_PACKAGE, &Impl::setParentPackage>,
-        support::Values<&Impl::m_importedPackageURIs, IMPORTED_PACKAGE_URIS, &Impl::makeImportedPackageURIs, &Impl::getImportedPackageURIs>,
-        support::Optional<&Impl::m_defaultVobjCategory, DEFAULT_VOBJ_CATEGORY, &Impl::setDefaultVobjCategory>>;
+        support::Values<
+            &Impl::m_importedPackageURIs, IMPORTED_PACKAGE_URIS, &Impl::makeImportedPackageURIs,
+            &Impl::getImportedPackageURIs>,
+        support::Optional<
+            &Impl::m_defaultVobjCategory, DEFAULT_VOBJ_CATEGORY, &Impl::setDefaultVobjCategory>>;
 };
 
-inline Package::Package(Impl* impl)
-    : NamedElement(impl)
-{
-}
+inline Package::Package(Impl* impl) : NamedElement(impl) {}
 inline Package::Impl* Package::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -22,10 +22,7 @@ PrimitiveType PrimitiveType::create(Model const& model, UUID const& id)
     return support::create<PrimitiveType>(model, id);
 }
 
-PrimitiveType::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+PrimitiveType::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 PrimitiveType::Impl::~Impl() = default;
 }  // namespace tarn::kiln::meta

@@ -33,10 +33,7 @@ public:
     using Rows = support::RowList<>;
 };
 
-inline PrimitiveType::PrimitiveType(Impl* impl)
-    : Type(impl)
-{
-}
+inline PrimitiveType::PrimitiveType(Impl* impl) : Type(impl) {}
 inline PrimitiveType::Impl* PrimitiveType::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -10,65 +10,27 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Property::Impl::IS_DERIVED{
-    .index = 6};
-
-constinit Slot const Property::Impl::IS_COMPOSITE{
-    .index = 7};
-
-constinit Slot const Property::Impl::IS_READ_ONLY{
-    .index = 8};
-
-constinit Slot const Property::Impl::IS_UNIQUE{
-    .index = 9};
-
-constinit Slot const Property::Impl::QUALIFIED_BY{
-    .index = 10};
-
-constinit Slot const Property::Impl::CUSTOM_QUALIFICATION{
-    .index = 11};
-
-constinit Slot const Property::Impl::IS_QUALIFICATION_UNIQUE{
-    .index = 12};
-
-constinit Slot const Property::Impl::OPPOSITE{
-    .index = 13};
-
-constinit Slot const Property::Impl::PROPERTY_INDEX{
-    .index = 14};
-
-constinit Slot const Property::Impl::IS_PUBLIC_ACCESSOR{
-    .index = 15};
-
-constinit Slot const Property::Impl::IS_PUBLIC_MUTATOR{
-    .index = 16};
-
-constinit Slot const Property::Impl::IS_TRANSIENT{
-    .index = 17};
-
-constinit Slot const Property::Impl::IS_SPARSE{
-    .index = 18};
-
+constinit Slot const Property::Impl::IS_DERIVED{.index = 6};
+constinit Slot const Property::Impl::IS_COMPOSITE{.index = 7};
+constinit Slot const Property::Impl::IS_READ_ONLY{.index = 8};
+constinit Slot const Property::Impl::IS_UNIQUE{.index = 9};
+constinit Slot const Property::Impl::QUALIFIED_BY{.index = 10};
+constinit Slot const Property::Impl::CUSTOM_QUALIFICATION{.index = 11};
+constinit Slot const Property::Impl::IS_QUALIFICATION_UNIQUE{.index = 12};
+constinit Slot const Property::Impl::OPPOSITE{.index = 13};
+constinit Slot const Property::Impl::PROPERTY_INDEX{.index = 14};
+constinit Slot const Property::Impl::IS_PUBLIC_ACCESSOR{.index = 15};
+constinit Slot const Property::Impl::IS_PUBLIC_MUTATOR{.index = 16};
+constinit Slot const Property::Impl::IS_TRANSIENT{.index = 17};
+constinit Slot const Property::Impl::IS_SPARSE{.index = 18};
 constinit Slot const Property::Impl::OWNING_TYPE{
     .index = 19, .opposite = &StructuredType::Impl::OWNED_ATTRIBUTES};
-
-constinit Slot const Property::Impl::VOBJ_DISP_CATEGORY{
-    .index = 20};
-
-constinit Slot const Property::Impl::VOBJ_DISP_SKIP_EMPTY{
-    .index = 21};
-
-constinit Slot const Property::Impl::IS_SET_ONCE{
-    .index = 22};
-
-constinit Slot const Property::Impl::IS_VOBJ_HIDDEN{
-    .index = 23};
-
-constinit Slot const Property::Impl::DEFAULT_VALUE{
-    .index = 24};
-
-constinit Slot const Property::Impl::IS_QUERY_INDEX{
-    .index = 25};
+constinit Slot const Property::Impl::VOBJ_DISP_CATEGORY{.index = 20};
+constinit Slot const Property::Impl::VOBJ_DISP_SKIP_EMPTY{.index = 21};
+constinit Slot const Property::Impl::IS_SET_ONCE{.index = 22};
+constinit Slot const Property::Impl::IS_VOBJ_HIDDEN{.index = 23};
+constinit Slot const Property::Impl::DEFAULT_VALUE{.index = 24};
+constinit Slot const Property::Impl::IS_QUERY_INDEX{.index = 25};
 
 Property Property::cast(ModelElement const& element)
 {
@@ -85,10 +47,7 @@ Property Property::create(Model const& model, UUID const& id)
     return support::create<Property>(model, id);
 }
 
-Property::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Property::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Property::Impl::~Impl() = default;
 
@@ -134,7 +93,8 @@ void Property::Impl::setCustomQualification(bool customQualification)
 
 void Property::Impl::setIsQualificationUnique(bool qualificationUnique)
 {
-    support::setScalar(*this, m_isQualificationUnique, IS_QUALIFICATION_UNIQUE, qualificationUnique);
+    support::setScalar(
+        *this, m_isQualificationUnique, IS_QUALIFICATION_UNIQUE, qualificationUnique);
 }
 
 Property Property::Impl::getOpposite() const
@@ -194,9 +154,10 @@ bool Property::Impl::hasOwningType() const
 
 void Property::Impl::setOwningType(StructuredType const& owningType)
 {
-    support::setContainer(*this, OWNING_TYPE, owningType.getImpl(), [&] {
+    auto const requireFree = [&] {
         support::requireFreeKey(owningType->getOwnedAttributes(), getName());
-    });
+    };
+    support::setContainer(*this, OWNING_TYPE, owningType.getImpl(), requireFree);
 }
 
 void Property::Impl::setVobjDispCategory(boost::optional<string> const& vobjDispCategory)
@@ -231,10 +192,11 @@ void Property::Impl::setIsQueryIndex(bool queryIndex)
 
 void Property::Impl::setName(ustring const& name)
 {
-    support::changeKey(
-        *this, getName(), name, getOwningType(), OWNING_TYPE,
-        [&] { support::requireFreeKey(getOwningType()->getOwnedAttributes(), name); },
-        [&] { TypedElement::Impl::setName(name); });
+    auto const requireFree = [&] {
+        support::requireFreeKey(getOwningType()->getOwnedAttributes(), name);
+    };
+    auto const store = [&] { TypedElement::Impl::setName(name); };
+    support::changeKey(*this, getName(), name, getOwningType(), OWNING_TYPE, requireFree, store);
 }
 }  // namespace tarn::kiln::meta
 

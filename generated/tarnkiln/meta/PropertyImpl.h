@@ -178,8 +178,11 @@ public:
         support::Scalar<&Impl::m_isReadOnly, IS_READ_ONLY, &Impl::setIsReadOnly>,
         support::Scalar<&Impl::m_isUnique, IS_UNIQUE, &Impl::setIsUnique>,
         support::Reference<Property, &Impl::m_qualifiedBy, QUALIFIED_BY, &Impl::setQualifiedBy>,
-        support::Scalar<&Impl::m_customQualification, CUSTOM_QUALIFICATION, &Impl::setCustomQualification>,
-        support::Scalar<&Impl::m_isQualificationUnique, IS_QUALIFICATION_UNIQUE, &Impl::setIsQualificationUnique>,
+        support::Scalar<
+            &Impl::m_customQualification, CUSTOM_QUALIFICATION, &Impl::setCustomQualification>,
+        support::Scalar<
+            &Impl::m_isQualificationUnique, IS_QUALIFICATION_UNIQUE,
+            &Impl::setIsQualificationUnique>,
         support::Reference<Property, &Impl::m_opposite, OPPOSITE, &Impl::setOpposite>,
         support::Scalar<&Impl::m_propertyIndex, PROPERTY_INDEX, &Impl::setPropertyIndex>,
         support::Scalar<&Impl::m_isPublicAccessor, IS_PUBLIC_ACCESSOR, &Impl::setIsPublicAccessor>,
@@ -187,18 +190,17 @@ public:
         support::Scalar<&Impl::m_isTransient, IS_TRANSIENT, &Impl::setIsTransient>,
         support::Scalar<&Impl::m_isSparse, IS_SPARSE, &Impl::setIsSparse>,
         support::Container<StructuredType, OWNING_TYPE, &Impl::setOwningType>,
-        support::Optional<&Impl::m_vobjDispCategory, VOBJ_DISP_CATEGORY, &Impl::setVobjDispCategory>,
-        support::Scalar<&Impl::m_vobjDispSkipEmpty, VOBJ_DISP_SKIP_EMPTY, &Impl::setVobjDispSkipEmpty>,
+        support::Optional<
+            &Impl::m_vobjDispCategory, VOBJ_DISP_CATEGORY, &Impl::setVobjDispCategory>,
+        support::Scalar<
+            &Impl::m_vobjDispSkipEmpty, VOBJ_DISP_SKIP_EMPTY, &Impl::setVobjDispSkipEmpty>,
         support::Scalar<&Impl::m_isSetOnce, IS_SET_ONCE, &Impl::setIsSetOnce>,
         support::Scalar<&Impl::m_isVobjHidden, IS_VOBJ_HIDDEN, &Impl::setIsVobjHidden>,
         support::Optional<&Impl::m_defaultValue, DEFAULT_VALUE, &Impl::setDefaultValue>,
         support::Scalar<&Impl::m_isQueryIndex, IS_QUERY_INDEX, &Impl::setIsQueryIndex>>;
 };
 
-inline Property::Property(Impl* impl)
-    : TypedElement(impl)
-{
-}
+inline Property::Property(Impl* impl) : TypedElement(impl) {}
 inline Property::Impl* Property::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -7,8 +7,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const RealAttribute::Impl::VALUE{
-    .index = 3};
+constinit Slot const RealAttribute::Impl::VALUE{.index = 3};
 
 RealAttribute RealAttribute::cast(ModelElement const& element)
 {
@@ -25,10 +24,7 @@ RealAttribute RealAttribute::create(Model const& model, UUID const& id)
     return support::create<RealAttribute>(model, id);
 }
 
-RealAttribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+RealAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 RealAttribute::Impl::~Impl() = default;
 

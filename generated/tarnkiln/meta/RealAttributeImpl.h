@@ -41,10 +41,7 @@ public:
         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>>;
 };
 
-inline RealAttribute::RealAttribute(Impl* impl)
-    : Attribute(impl)
-{
-}
+inline RealAttribute::RealAttribute(Impl* impl) : Attribute(impl) {}
 inline RealAttribute::Impl* RealAttribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

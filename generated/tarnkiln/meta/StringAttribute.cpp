@@ -7,8 +7,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const StringAttribute::Impl::VALUE{
-    .index = 3};
+constinit Slot const StringAttribute::Impl::VALUE{.index = 3};
 
 StringAttribute StringAttribute::cast(ModelElement const& element)
 {
@@ -25,10 +24,7 @@ StringAttribute StringAttribute::create(Model const& model, UUID const& id)
     return support::create<StringAttribute>(model, id);
 }
 
-StringAttribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+StringAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 StringAttribute::Impl::~Impl() = default;
 

@@ -41,10 +41,7 @@ public:
         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>>;
 };
 
-inline StringAttribute::StringAttribute(Impl* impl)
-    : Attribute(impl)
-{
-}
+inline StringAttribute::StringAttribute(Impl* impl) : Attribute(impl) {}
 inline StringAttribute::Impl* StringAttribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -9,20 +9,15 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const StructuredType::Impl::VOBJ_NAME{
-    .index = 4};
-
+constinit Slot const StructuredType::Impl::VOBJ_NAME{.index = 4};
 constinit Slot const StructuredType::Impl::OWNED_ATTRIBUTES{
-    .index = 5, .composite = true, .single = false, .keyed = true, .opposite = &Property::Impl::OWNING_TYPE};
-
+    .index = 5, .composite = true, .single = false, .keyed = true,
+    .opposite = &Property::Impl::OWNING_TYPE};
 constinit Slot const StructuredType::Impl::OWNED_OPERATIONS{
-    .index = 6, .composite = true, .single = false, .keyed = true, .opposite = &Operation::Impl::OWNING_TYPE};
-
-constinit Slot const StructuredType::Impl::VOBJ_COMPACT_DISPLAY{
-    .index = 7};
-
-constinit Slot const StructuredType::Impl::VOBJ_DISP_CATEGORIES{
-    .index = 8, .single = false};
+    .index = 6, .composite = true, .single = false, .keyed = true,
+    .opposite = &Operation::Impl::OWNING_TYPE};
+constinit Slot const StructuredType::Impl::VOBJ_COMPACT_DISPLAY{.index = 7};
+constinit Slot const StructuredType::Impl::VOBJ_DISP_CATEGORIES{.index = 8, .single = false};
 
 StructuredType StructuredType::cast(ModelElement const& element)
 {
@@ -39,10 +34,7 @@ StructuredType StructuredType::create(Model const& model, UUID const& id)
     return support::create<StructuredType>(model, id);
 }
 
-StructuredType::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+StructuredType::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 StructuredType::Impl::~Impl() = default;
 
@@ -51,7 +43,8 @@ void StructuredType::Impl::setVobjName(string const& vobjName)
     support::setScalar(*this, m_vobjName, VOBJ_NAME, vobjName);
 }
 
-std::unique_ptr<ElementMap<ustring, Property>> StructuredType::Impl::makeOwnedAttributes(Impl* owner)
+std::unique_ptr<ElementMap<ustring, Property>>
+StructuredType::Impl::makeOwnedAttributes(Impl* owner)
 {
     auto const keyOf = [](ModelElement::Impl* member) {
         return static_cast<Property::Impl*>(member)->getName();
@@ -64,7 +57,8 @@ ElementMap<ustring, Property>& StructuredType::Impl::getOwnedAttributes() const
     return support::shownCollection(*this, m_ownedAttributes, &Impl::makeOwnedAttributes);
 }
 
-std::unique_ptr<ElementMultimap<ustring, Operation>> StructuredType::Impl::makeOwnedOperations(Impl* owner)
+std::unique_ptr<ElementMultimap<ustring, Operation>>
+StructuredType::Impl::makeOwnedOperations(Impl* owner)
 {
     auto const keyOf = [](ModelElement::Impl* member) {
         return static_cast<Operation::Impl*>(member)->getName();
@@ -84,7 +78,8 @@ void StructuredType::Impl::setVobjCompactDisplay(bool vobjCompactDisplay)
 
 std::unique_ptr<PrimitiveSequence<string>> StructuredType::Impl::makeVobjDispCategories(Impl* owner)
 {
-    return std::make_unique<PrimitiveSequence<string>>(owner, false, VOBJ_DISP_CATEGORIES);
+    return std::make_unique<PrimitiveSequence<string>>(
+        owner, /*unique=*/false, VOBJ_DISP_CATEGORIES);
 }
 
 PrimitiveSequence<string>& StructuredType::Impl::getVobjDispCategories() const

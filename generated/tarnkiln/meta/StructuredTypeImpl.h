@@ -87,16 +87,20 @@ private:
 public:
     using Rows = support::RowList<
         support::Scalar<&Impl::m_vobjName, VOBJ_NAME, &Impl::setVobjName>,
-        support::References<&Impl::m_ownedAttributes, OWNED_ATTRIBUTES, &Impl::makeOwnedAttributes, &Impl::getOwnedAttributes>,
-        support::References<&Impl::m_ownedOperations, OWNED_OPERATIONS, &Impl::makeOwnedOperations, &Impl::getOwnedOperations>,
-        support::Scalar<&Impl::m_vobjCompactDisplay, VOBJ_COMPACT_DISPLAY, &Impl::setVobjCompactDisplay>,
-        support::Values<&Impl::m_vobjDispCategories, VOBJ_DISP_CATEGORIES, &Impl::makeVobjDispCategories, &Impl::getVobjDispCategories>>;
+        support::References<
+            &Impl::m_ownedAttributes, OWNED_ATTRIBUTES, &Impl::makeOwnedAttributes,
+            &Impl::getOwnedAttributes>,
+        support::References<
+            &Impl::m_ownedOperations, OWNED_OPERATIONS, &Impl::makeOwnedOperations,
+            &Impl::getOwnedOperations>,
+        support::Scalar<
+            &Impl::m_vobjCompactDisplay, VOBJ_COMPACT_DISPLAY, &Impl::setVobjCompactDisplay>,
+        support::Values<
+            &Impl::m_vobjDispCategories, VOBJ_DISP_CATEGORIES, &Impl::makeVobjDispCategories,
+            &Impl::getVobjDispCategories>>;
 };
 
-inline StructuredType::StructuredType(Impl* impl)
-    : Type(impl)
-{
-}
+inline StructuredType::StructuredType(Impl* impl) : Type(impl) {}
 inline StructuredType::Impl* StructuredType::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -10,9 +10,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Type::Impl::IS_VOBJ_HIDDEN{
-    .index = 2};
-
+constinit Slot const Type::Impl::IS_VOBJ_HIDDEN{.index = 2};
 constinit Slot const Type::Impl::OWNING_PACKAGE{
     .index = 3, .opposite = &Package::Impl::OWNED_TYPES};
 
@@ -31,10 +29,7 @@ Type Type::create(Model const& model, UUID const& id)
     return support::create<Type>(model, id);
 }
 
-Type::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+Type::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 Type::Impl::~Impl() = default;
 
@@ -60,17 +55,20 @@ bool Type::Impl::hasOwningPackage() const
 
 void Type::Impl::setOwningPackage(Package const& owningPackage)
 {
-    support::setContainer(*this, OWNING_PACKAGE, owningPackage.getImpl(), [&] {
+    auto const requireFree = [&] {
         support::requireFreeKey(owningPackage->getOwnedTypes(), getName());
-    });
+    };
+    support::setContainer(*this, OWNING_PACKAGE, owningPackage.getImpl(), requireFree);
 }
 
 void Type::Impl::setName(ustring const& name)
 {
+    auto const requireFree = [&] {
+        support::requireFreeKey(getOwningPackage()->getOwnedTypes(), name);
+    };
+    auto const store = [&] { NamedElement::Impl::setName(name); };
     support::changeKey(
-        *this, getName(), name, getOwningPackage(), OWNING_PACKAGE,
-        [&] { support::requireFreeKey(getOwningPackage()->getOwnedTypes(), name); },
-        [&] { NamedElement::Impl::setName(name); });
+        *this, getName(), name, getOwningPackage(), OWNING_PACKAGE, requireFree, store);
 }
 }  // namespace tarn::kiln::meta
 

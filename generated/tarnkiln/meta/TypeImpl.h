@@ -17,8 +17,7 @@ namespace tarn::kiln::meta {
 /// changes nothing.
 ///
 /// Threads: as the handle.
-class TARNKILN_EXPORT Type::Impl
-    : public support::Dispatched<Type::Impl, NamedElement::Impl>
+class TARNKILN_EXPORT Type::Impl : public support::Dispatched<Type::Impl, NamedElement::Impl>
 {
 public:
     using Handle = Type;
@@ -66,10 +65,7 @@ public:
         support::Container<Package, OWNING_PACKAGE, &Impl::setOwningPackage>>;
 };
 
-inline Type::Type(Impl* impl)
-    : NamedElement(impl)
-{
-}
+inline Type::Type(Impl* impl) : NamedElement(impl) {}
 inline Type::Impl* Type::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -8,17 +8,10 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const TypedElement::Impl::TYPE{
-    .index = 2};
-
-constinit Slot const TypedElement::Impl::LOWER{
-    .index = 3};
-
-constinit Slot const TypedElement::Impl::UPPER{
-    .index = 4};
-
-constinit Slot const TypedElement::Impl::IS_ORDERED{
-    .index = 5};
+constinit Slot const TypedElement::Impl::TYPE{.index = 2};
+constinit Slot const TypedElement::Impl::LOWER{.index = 3};
+constinit Slot const TypedElement::Impl::UPPER{.index = 4};
+constinit Slot const TypedElement::Impl::IS_ORDERED{.index = 5};
 
 TypedElement TypedElement::cast(ModelElement const& element)
 {
@@ -35,10 +28,7 @@ TypedElement TypedElement::create(Model const& model, UUID const& id)
     return support::create<TypedElement>(model, id);
 }
 
-TypedElement::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+TypedElement::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 TypedElement::Impl::~Impl() = default;
 

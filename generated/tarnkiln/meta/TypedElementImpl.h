@@ -69,10 +69,7 @@ public:
         support::Scalar<&Impl::m_isOrdered, IS_ORDERED, &Impl::setIsOrdered>>;
 };
 
-inline TypedElement::TypedElement(Impl* impl)
-    : NamedElement(impl)
-{
-}
+inline TypedElement::TypedElement(Impl* impl) : NamedElement(impl) {}
 inline TypedElement::Impl* TypedElement::getImpl() const
 {
     return static_cast<Impl*>(m_impl);

@@ -7,8 +7,7 @@
 
 namespace tarn::kiln::meta {
 
-constinit Slot const UUIDAttribute::Impl::VALUE{
-    .index = 3};
+constinit Slot const UUIDAttribute::Impl::VALUE{.index = 3};
 
 UUIDAttribute UUIDAttribute::cast(ModelElement const& element)
 {
@@ -25,10 +24,7 @@ UUIDAttribute UUIDAttribute::create(Model const& model, UUID const& id)
     return support::create<UUIDAttribute>(model, id);
 }
 
-UUIDAttribute::Impl::Impl(Model const& model, UUID const& id)
-    : Dispatched(model, id)
-{
-}
+UUIDAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
 UUIDAttribute::Impl::~Impl() = default;
 

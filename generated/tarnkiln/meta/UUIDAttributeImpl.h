@@ -41,10 +41,7 @@ public:
         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>>;
 };
 
-inline UUIDAttribute::UUIDAttribute(Impl* impl)
-    : Attribute(impl)
-{
-}
+inline UUIDAttribute::UUIDAttribute(Impl* impl) : Attribute(impl) {}
 inline UUIDAttribute::Impl* UUIDAttribute::getImpl() const
 {
     return static_cast<Impl*>(m_impl);
