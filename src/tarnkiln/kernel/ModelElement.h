@@ -3,6 +3,8 @@
 #pragma once
 #include "tarnkiln/kernel/ElementHandle.h"
 
+#include <concepts>
+
 namespace tarn::kiln {
 
 /// An element of any class.
@@ -15,11 +17,11 @@ namespace tarn::kiln {
 class TARNKILN_EXPORT ModelElement : public ElementHandle
 {
 public:
-    class Impl;    // ModelElementImpl.h
-    class Builder; // ModelElementBuilder.h
+    class Impl;     // ModelElementImpl.h
+    class Builder;  // ModelElementBuilder.h
 
     ModelElement() = default;
-    explicit ModelElement(Impl* impl); ///< Shares `impl`; null gives the empty handle.
+    explicit ModelElement(Impl* impl);  ///< Shares `impl`; null gives the empty handle.
 
     /// A stand-in of class `metaClass`, in `model`, for the element that `id` names.
     ///
@@ -34,13 +36,18 @@ public:
 
     static ModelElement cast(ModelElement const& element) { return element; }
 
-    Impl* getImpl() const;    ///< Null for the empty handle; lives as long as this handle.
-    Impl* operator->() const; ///< All operations of the element; the handle must not be empty.
+    Impl* getImpl() const;     ///< Null for the empty handle; lives as long as this handle.
+    Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln
 
-template <>
-struct std::hash<tarn::kiln::ModelElement>
+template <> struct std::hash<tarn::kiln::ModelElement>
 {
     std::size_t operator()(tarn::kiln::ModelElement const& element) const noexcept;
 };
+
+/// Handles of all classes hash as the element does.
+template <std::derived_from<tarn::kiln::ModelElement> Handle>
+requires(!std::same_as<Handle, tarn::kiln::ModelElement>) struct std::hash<Handle>
+    : std::hash<tarn::kiln::ModelElement>
+{};
