@@ -1,6 +1,7 @@
 /// \file
 /// The container of `UnorderedElementSet`.
 #pragma once
+#include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/UUIDHasher.h"
 
@@ -14,7 +15,7 @@ namespace tarn::kiln::internal {
 ///
 /// It could be `noexcept` and must not be: the standard library then stores the hash in each node,
 /// so that the set stays sound when the UUID of an element in it changes.
-struct ElementHasher
+struct TARNKILN_EXPORT ElementHasher
 {
     using is_transparent = void;
 
@@ -25,7 +26,7 @@ struct ElementHasher
 };
 
 /// Compares the objects behind two handles.
-struct ElementEqual
+struct TARNKILN_EXPORT ElementEqual
 {
     using is_transparent = void;
 

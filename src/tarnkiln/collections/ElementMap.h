@@ -84,7 +84,10 @@ private:
     ElementMap& m_map;
 };
 
-#define TARNKILN_DECLARE(K) extern template class ElementMap<K, ModelElement>;
+#define TARNKILN_DECLARE(K)                                                                        \
+    extern template class TARNKILN_EXPORT ReferenceAssociativeContainer<                           \
+        K, ModelElement, std::map<K, ModelElement, internal::TotalLess<K>>>;                       \
+    extern template class TARNKILN_EXPORT ElementMap<K, ModelElement>;
 TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

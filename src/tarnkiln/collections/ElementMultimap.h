@@ -86,7 +86,10 @@ private:
     ElementMultimap& m_map;
 };
 
-#define TARNKILN_DECLARE(K) extern template class ElementMultimap<K, ModelElement>;
+#define TARNKILN_DECLARE(K)                                                                        \
+    extern template class TARNKILN_EXPORT ReferenceAssociativeContainer<                           \
+        K, ModelElement, std::multimap<K, ModelElement, internal::TotalLess<K>>>;                  \
+    extern template class TARNKILN_EXPORT ElementMultimap<K, ModelElement>;
 TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

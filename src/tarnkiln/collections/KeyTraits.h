@@ -29,7 +29,7 @@ template <class K> struct TARNKILN_EXPORT KeyTraits
 /// The type of the property that qualifies `collectionProperty`; empty if that is not known.
 TARNKILN_EXPORT meta::Type qualifierTypeOf(meta::Property const& collectionProperty);
 
-#define TARNKILN_DECLARE(K) extern template struct KeyTraits<K>;
+#define TARNKILN_DECLARE(K) extern template struct TARNKILN_EXPORT KeyTraits<K>;
 TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
 }  // namespace tarn::kiln::internal

@@ -53,10 +53,10 @@ namespace tarn::kiln {
 TARNKILN_FOR_EACH_META_CLASS(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
 
-#define TARNKILN_DECLARE(T) extern template class ElementMap<ustring, T>;
+#define TARNKILN_DECLARE(T) extern template class TARNKILN_EXPORT ElementMap<ustring, T>;
 TARNKILN_FOR_EACH_NAMED_MEMBER(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
 
-extern template class ElementMultimap<ustring, meta::Operation>;
-extern template class ElementMap<unsigned long, meta::DynamicExtensions>;
+extern template class TARNKILN_EXPORT ElementMultimap<ustring, meta::Operation>;
+extern template class TARNKILN_EXPORT ElementMap<unsigned long, meta::DynamicExtensions>;
 }  // namespace tarn::kiln

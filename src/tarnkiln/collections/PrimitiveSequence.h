@@ -185,8 +185,8 @@ template <class T> GenericPrimitiveInterface* PrimitiveSequence<T>::getGenericIn
 }
 
 #define TARNKILN_DECLARE(T)                                                                        \
-    extern template class PrimitiveCollection<T, std::vector<T>>;                                  \
-    extern template class PrimitiveSequence<T>;
+    extern template class TARNKILN_EXPORT PrimitiveCollection<T, std::vector<T>>;                  \
+    extern template class TARNKILN_EXPORT PrimitiveSequence<T>;
 TARNKILN_FOR_EACH_PRIMITIVE_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

@@ -72,8 +72,9 @@ template <class T> void PrimitiveSet<T>::erase(T const& value)
 }
 
 #define TARNKILN_DECLARE(T)                                                                        \
-    extern template class PrimitiveCollection<T, std::set<T, internal::TotalLess<T>>>;             \
-    extern template class PrimitiveSet<T>;
+    extern template class TARNKILN_EXPORT                                                          \
+        PrimitiveCollection<T, std::set<T, internal::TotalLess<T>>>;                               \
+    extern template class TARNKILN_EXPORT PrimitiveSet<T>;
 TARNKILN_FOR_EACH_PRIMITIVE_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
 }  // namespace tarn::kiln

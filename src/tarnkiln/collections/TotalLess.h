@@ -1,6 +1,8 @@
 /// \file
 /// An order of values that places every one of them.
 #pragma once
+#include "tarnkiln/Export.h"
+
 #include <boost/date_time/posix_time/posix_time_types.hpp>
 
 #include <cmath>
@@ -10,10 +12,10 @@ namespace tarn::kiln::internal {
 
 /// `std::less`, but total where that is not: all NaNs are one value behind all others, and "not a
 /// date-time" is one value before all others.
-template <class T> struct TotalLess : std::less<T>
+template <class T> struct TARNKILN_EXPORT TotalLess : std::less<T>
 {};
 
-template <> struct TotalLess<double>
+template <> struct TARNKILN_EXPORT TotalLess<double>
 {
     bool operator()(double left, double right) const
     {
@@ -21,7 +23,7 @@ template <> struct TotalLess<double>
     }
 };
 
-template <> struct TotalLess<boost::posix_time::ptime>
+template <> struct TARNKILN_EXPORT TotalLess<boost::posix_time::ptime>
 {
     bool operator()(boost::posix_time::ptime const& left,
                     boost::posix_time::ptime const& right) const
