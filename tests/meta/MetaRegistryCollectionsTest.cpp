@@ -30,6 +30,8 @@ public:
 
     Type getCollectionType() const override { return {}; }
     void copyContents(AbstractOwnedCollection const&) override {}
+    void basicSwapContents(AbstractOwnedCollection&) noexcept override {}
+    void basicDropContents() noexcept override {}
 };
 
 class OtherIdleCollection final : public IdleCollection

@@ -42,6 +42,13 @@ public:
     virtual meta::Type getCollectionType() const = 0;
     /// Replaces the contents by those of `other`, which must be of the same class.
     virtual void copyContents(AbstractOwnedCollection const& other) = 0;
+    /// \name Rollback: silent, without upkeep and without an allocation, so that it never fails
+    /// @{
+    /// Exchanges the contents with those of `other`, which must be of the same class.
+    virtual void basicSwapContents(AbstractOwnedCollection& other) noexcept = 0;
+    /// Drops all contents.
+    virtual void basicDropContents() noexcept = 0;
+    /// @}
 
     /// Empty for a snapshot without one and while the metamodel is not built.
     meta::Property const& getCollectionProperty() const;

@@ -24,6 +24,11 @@ public:
     // AbstractOwnedCollection
     meta::Type getCollectionType() const override { return internal::PrimitiveTraits<T>::type(); }
     void copyContents(AbstractOwnedCollection const& other) override;
+    void basicSwapContents(AbstractOwnedCollection& other) noexcept override
+    {
+        m_entries.swap(static_cast<PrimitiveCollection&>(other).m_entries);
+    }
+    void basicDropContents() noexcept override { m_entries.clear(); }
     // AbstractPrimitiveCollection
     void clear() override;
     std::size_t size() const override { return m_entries.size(); }

@@ -71,6 +71,11 @@ public:
     // AbstractOwnedCollection
     meta::Type getCollectionType() const override;
     void copyContents(AbstractOwnedCollection const& other) override;
+    void basicSwapContents(AbstractOwnedCollection& other) noexcept override
+    {
+        m_entries.swap(static_cast<StringToStringMap&>(other).m_entries);
+    }
+    void basicDropContents() noexcept override { m_entries.clear(); }
 
 private:
     Entries m_entries;

@@ -19,6 +19,15 @@ class TARNKILN_EXPORT TypedReferenceCollection : public ReferenceCollection
 public:
     // AbstractOwnedCollection
     meta::Type getCollectionType() const override { return T::metaClass(); }
+    void basicSwapContents(AbstractOwnedCollection& other) noexcept override
+    {
+        m_entries.swap(static_cast<TypedReferenceCollection&>(other).m_entries);
+    }
+    void basicDropContents() noexcept override
+    {
+        // The handles go last: what they release must not find them half removed.
+        Container const released = std::exchange(m_entries, Container());
+    }
     // ReferenceCollection
     meta::Class const& getElementClass() const override { return T::metaClass(); }
     bool acceptsElement(ModelElement const& element) const override;

@@ -35,6 +35,19 @@ public:
     /// Takes out the proxy with the id of `proxy`.
     void removeProxy(ModelElement const& proxy);
 
+    // AbstractOwnedCollection
+    void basicSwapContents(AbstractOwnedCollection& other) noexcept override
+    {
+        Base::basicSwapContents(other);
+        m_proxies.swap(static_cast<TypedReferenceCollectionWithProxies&>(other).m_proxies);
+    }
+    void basicDropContents() noexcept override
+    {
+        Base::basicDropContents();
+        if (m_proxies)
+            m_proxies->clear();
+    }
+
     // ReferenceCollection
     std::vector<ModelElement> getAllValuesAndProxies() const override;
     void replaceProxy(ModelElement const& element, unsigned long index) override;

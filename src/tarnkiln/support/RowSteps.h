@@ -90,6 +90,18 @@ template <Slot const& SLOT> struct NoSteps
 ///     static Value old(auto const& record, auto const& old, property);  // the value in a record
 template <class Row> struct Steps;
 
+/// Puts the contents of the snapshot `old`, which is null for a collection that was made later, in
+/// the place of the present ones, which end up in the snapshot.
+template <class Collection>
+void restoreContents(LazyCollection<Collection>& field, std::unique_ptr<Collection>& old) noexcept
+{
+    Collection* const present = field.get();
+    if (present && old)
+        present->basicSwapContents(*old);
+    else if (present)
+        present->basicDropContents();
+}
+
 /// What all single values share.
 template <auto FIELD, Slot const& SLOT> struct FieldSteps : NoSteps<SLOT>
 {
@@ -413,11 +425,7 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
         old = MAKE(nullptr);
         ModelElement::Impl::_basicCopyValues(old.get(), present);
     }
-    static void restore(Owner& element, auto& old)
-    {
-        if (auto* const present = (element.*FIELD).get())
-            ModelElement::Impl::_basicCopyValues(present, old.get());
-    }
+    static void restore(Owner& element, auto& old) { restoreContents(element.*FIELD, old); }
     static void inverseAdd(Owner& element, ModelElement const& other)
     {
         ModelElement::Impl::_basicAdd(&made(element), other);
@@ -488,8 +496,8 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
     }
     static void drop(Owner& element)
     {
-        if ((element.*FIELD).get())
-            ModelElement::Impl::_basicClear((element.*FIELD).get());
+        if (auto* const present = (element.*FIELD).get())
+            present->basicDropContents();
     }
     static void visit(Owner const& element, ModelElement::Impl::ReferenceVisitor const& visit)
     {
@@ -530,14 +538,7 @@ struct Steps<Values<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
         old = MAKE(nullptr);
         old->copyContents(*present);
     }
-    static void restore(Owner& element, auto& old)
-    {
-        auto* const present = (element.*FIELD).get();
-        if (present && old)
-            present->copyContents(*old);
-        else if (present)
-            present->clear();
-    }
+    static void restore(Owner& element, auto& old) { restoreContents(element.*FIELD, old); }
     static AbstractOwnedCollection* collection(Owner const& element)
     {
         return (element.*FIELD).get();
