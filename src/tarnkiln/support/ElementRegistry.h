@@ -2,10 +2,12 @@
 /// The table of a model's elements by UUID.
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
-#include "tarnkiln/kernel/UUIDHasher.h"
 
 #include <algorithm>
+#include <bit>
 #include <cstddef>
+#include <cstdint>
+#include <cstring>
 #include <memory>
 
 namespace tarn::kiln::support {
@@ -69,12 +71,15 @@ public:
         reserveFor(m_size + m_mayReturn + 1);
         ++m_mayReturn;
     }
-    /// Enters an element for whose return room was kept.
+    /// Enters an element whose UUID is free. Allocates nothing if room was kept for its return.
     void insertReturning(ModelElement::Impl* element)
     {
+        if (m_mayReturn != 0)
+            --m_mayReturn;
+        else
+            reserveFor(m_size + 1);
         place(element);
         ++m_size;
-        --m_mayReturn;
     }
     /// Nothing that was erased comes back any more.
     void forgetReturns() { m_mayReturn = 0; }
@@ -89,10 +94,28 @@ public:
         }
     }
 
+    /// How many entries a look-up passes in the worst case.
+    std::size_t longestProbe() const
+    {
+        std::size_t longest = 0;
+        for (std::size_t at = 0; at < m_capacity; ++at) {
+            if (m_table[at])
+                longest = std::max(longest,
+                                   (at - home(m_table[at]->getUuid())) & (m_capacity - 1));
+        }
+        return longest;
+    }
+
 private:
+    /// Depends on all bytes: those of a family of UUIDs often differ in a few only.
     std::size_t home(UUID const& id) const
     {
-        return (internal::UUIDHasher()(id) >> 20) & (m_capacity - 1);
+        constexpr std::uint64_t SPREAD = 0x9E3779B97F4A7C15u;
+        std::uint64_t halves[2];
+        std::memcpy(halves, id.data, sizeof halves);
+        std::uint64_t word = halves[0] ^ std::rotl(halves[1] * SPREAD, 32);
+        word ^= word >> 32;
+        return static_cast<std::size_t>(word * SPREAD >> m_shift);
     }
     std::size_t next(std::size_t at) const { return (at + 1) & (m_capacity - 1); }
     void place(ModelElement::Impl* element)
@@ -125,6 +148,7 @@ private:
         std::size_t const oldCapacity = m_capacity;
         m_table.swap(old);
         m_capacity = capacity;
+        m_shift = 64 - std::countr_zero(capacity);
         for (std::size_t at = 0; at < oldCapacity; ++at) {
             if (old[at])
                 place(old[at]);
@@ -133,6 +157,7 @@ private:
 
     std::unique_ptr<ModelElement::Impl*[]> m_table;
     std::size_t m_capacity = 0; ///< A power of two; at most three quarters are used.
+    int m_shift = 0;            ///< Leaves as many of 64 bits as a place in the table has.
     std::size_t m_size = 0;
     std::size_t m_mayReturn = 0;
 };
