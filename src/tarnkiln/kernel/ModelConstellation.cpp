@@ -9,6 +9,8 @@
 #include "tarnkiln/services/ModelIdNormalizer.h"
 
 #include <algorithm>
+#include <utility>
+#include <vector>
 
 namespace tarn::kiln {
 
@@ -103,8 +105,12 @@ Model ModelConstellation::Impl::fetchModel(ustring const& uri)
 
 void ModelConstellation::Impl::saveModels()
 {
+    // a copy: saving may rename, load or destroy models
+    std::vector<std::pair<ustring, Model>> models;
     for (auto const& [location, model] : m_models)
-        services::ModelIdNormalizer::save(Model(model), location);
+        models.emplace_back(location, Model(model));
+    for (auto const& [location, model] : models)
+        services::ModelIdNormalizer::save(model, location);
 }
 
 void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)

@@ -51,9 +51,11 @@ public:
     std::vector<Model> getModels() const;
     /// The model of that URI in memory; empty if there is none.
     Model peekModel(ustring const& uri) const;
-    /// Loads the model of that URI by the normalizers.
+    /// Loads the model of that URI by the normalizers, renames it to that and takes it in.
     ///
-    /// A loaded model of a constellation of its own is not taken over: empty.
+    /// A registry model is returned as it is; a transient one counts as none.
+    /// \throws tarnkiln::messages::CannotMigrateModel  if it shares another constellation or is in
+    ///     a transaction.
     Model fetchModel(ustring const& uri);
     void saveModels();
     /// Takes a model in, and into the open transaction.

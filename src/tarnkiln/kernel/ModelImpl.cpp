@@ -247,10 +247,11 @@ void Model::Impl::setModelURI(ustring const& uri)
     if (!m_constellation)
         reportException(tarnkiln::messages::InvalidValue());
     ustring const location = services::ModelIdNormalizer::convertToLocationModelId(uri);
-    if (location != m_locationModelId)
+    if (location != m_locationModelId) {
         m_constellation->modelURIAboutToChange(m_locationModelId, location);
+        m_locationModelId = location; // at once: what follows may fail
+    }
     m_modelURI = services::ModelIdNormalizer::convertToExternalModelId(location);
-    m_locationModelId = location;
 }
 
 ModelConstellation Model::Impl::getModelConstellation() const
