@@ -3,6 +3,8 @@
 #include "tarnkiln/kernel/ProgressIndicators.h"
 #include "tarnkiln/meta/Property.h"
 #include "tests/support/ExpectRaises.h"
+#include "tests/support/NodeImpl.h"
+#include "tests/support/NodeMetamodel.h"
 #include "tests/support/PlainChange.h"
 #include "tests/support/ScriptedListener.h"
 #include "tests/support/Uuids.h"
@@ -101,6 +103,24 @@ TEST_F(AContainedElement, HasNoMetamodelPropertiesToShowWhileItsMetamodelIsNotBu
     EXPECT_EQ(child->containmentFeatureImpl(), nullptr);
     EXPECT_FALSE(child->containerProperty());
     EXPECT_FALSE(child->containerFeature());
+}
+
+TEST(AContainedNode, ShowsBothPropertiesOfItsContainment)
+{
+    Model const model = Model::create(ModelConstellation());
+    Node const parent = Node::create(model);
+    Node const child = Node::create(model);
+    auto const& properties = NodeMetamodel::get().properties;
+    meta::Property const& children = properties[Node::Impl::CHILDREN.index];
+
+    child->setParent(parent);
+
+    EXPECT_EQ(child->containmentFeature(), children);
+    EXPECT_EQ(child->containmentFeatureImpl(), children.getImpl());
+    EXPECT_EQ(child->containerProperty(), properties[Node::Impl::PARENT.index]);
+    EXPECT_EQ(child->containerFeature(), child->containerProperty());
+    EXPECT_EQ(child->getContainment(), Feature(children));
+    EXPECT_EQ(child->container(), parent);
 }
 
 TEST(ATopLevelElement, HasNoContainer)

@@ -5,6 +5,7 @@
 #include "tests/support/ExpectRaises.h"
 #include "tests/support/FakeDataSource.h"
 #include "tests/support/InvalidationLog.h"
+#include "tests/support/NodeImpl.h"
 #include "tests/support/PlainChange.h"
 #include "tests/support/ScriptedListener.h"
 #include "tests/support/Uuids.h"
@@ -440,6 +441,33 @@ TEST_F(ADestroyedSubtree, IsTakenBackWhenAHookFailsDeepWithinIt)
     EXPECT_EQ(model->getElementCount(), 1'002u);
     other->destroy();
     EXPECT_EQ(model->getElementCount(), 1'001u);
+}
+
+TEST(ADeepSubtree, OfNodesIsDestroyedAndBroughtBackAtAnyDepth)
+{
+    Model const model = Model::create(ModelConstellation());
+    Node const root = Node::create(model);
+    Node deepest = root;
+    {
+        Transaction const transaction = model->beginTransaction(/*revertible=*/false);
+        for (int i = 0; i < 8'000; ++i)
+        {
+            Node const next = Node::create(model);
+            next->setParent(deepest);
+            deepest = next;
+        }
+        transaction.commit();
+    }
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+    root->destroy();
+    EXPECT_FALSE(deepest);
+
+    EXPECT_EQ(transaction.rollBack(), TransactionResult::RolledBack);
+
+    EXPECT_TRUE(deepest);
+    EXPECT_TRUE(deepest->container());
+    root->destroy();
+    EXPECT_EQ(model->getElementCount(), 0u);
 }
 
 TEST(ADeepSubtree, IsReleasedWithItsModel)

@@ -575,39 +575,6 @@ TEST_F(AFrozenModel, RefusesEveryKindOfChange)
     EXPECT_EQ(model->getElementCount(), 1u);
 }
 
-TEST_F(AFrozenModel, CanBeRead)
-{
-    Model::Freezer const freezer = model->freeze();
-
-    EXPECT_EQ(model->findElement(uuidOf(1)), element);
-    EXPECT_THAT(model->getTopLevelElements(), ElementsAre(ModelElement(element)));
-    EXPECT_EQ(element->getValue(), 0);
-}
-
-TEST_F(AFrozenModel, BeginsTransactionsButRefusesTheirFirstChange)
-{
-    Model::Freezer const freezer = model->freeze();
-
-    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
-    EXPECT_RAISES(messages::ModelFrozen, change(element, 1));
-
-    EXPECT_EQ(transaction.commit(), TransactionResult::Committed);
-}
-
-TEST_F(AFrozenModel, IsFrozenUntilItsLastFreezerGoes)
-{
-    auto first = std::make_unique<Model::Freezer>(model->freeze());
-    auto second = std::make_unique<Model::Freezer>(model->freeze());
-
-    first.reset();
-    EXPECT_RAISES(messages::ModelFrozen, element->setValue(1));
-    second.reset();
-
-    EXPECT_FALSE(model->isFrozen());
-    element->setValue(1);
-    EXPECT_EQ(element->getValue(), 1);
-}
-
 TEST_F(AFrozenModel, IsThawedEarlyByDeactivationOnce)
 {
     Model::Freezer first = model->freeze();
@@ -617,29 +584,6 @@ TEST_F(AFrozenModel, IsThawedEarlyByDeactivationOnce)
     first.deactivate();
 
     EXPECT_TRUE(model->isFrozen());
-}
-
-TEST_F(AFrozenModel, StaysFrozenWhenItsFreezerIsMoved)
-{
-    {
-        Model::Freezer first = model->freeze();
-        Model::Freezer const second(std::move(first));
-        EXPECT_TRUE(model->isFrozen());
-    }
-    EXPECT_FALSE(model->isFrozen());
-}
-
-TEST_F(AFrozenModel, IsLetGoByAFreezerThatIsAssignedAnother)
-{
-    Model const other = Model::create(ModelConstellation());
-    Model::Freezer freezer = model->freeze();
-
-    freezer = other->freeze();
-
-    EXPECT_FALSE(model->isFrozen());
-    EXPECT_TRUE(other->isFrozen());
-    freezer.deactivate();
-    EXPECT_FALSE(other->isFrozen());
 }
 
 TEST_F(AFrozenModel, SurvivesTheAssignmentOfItsFreezerToItself)
@@ -659,45 +603,6 @@ TEST_F(AFrozenModel, IsKeptInMemoryByItsFreezer)
     freezer.reset();  // would touch a model that is gone, did the freezer not hold it
 }
 
-TEST_F(AFrozenModel, MayBeDestroyed)
-{
-    Model::Freezer freezer = model->freeze();
-
-    model->destroy();
-    freezer.deactivate();
-
-    EXPECT_FALSE(model);
-    EXPECT_FALSE(element);
-}
-
-TEST_F(AFrozenModel, IsWritableUntilTheLastOfNestedThawersGoes)
-{
-    Model::Freezer freezer = model->freeze();
-    auto outer = std::make_unique<Model::Thawer>(freezer.thaw());
-    auto inner = std::make_unique<Model::Thawer>(freezer.thaw());
-
-    element->setValue(1);
-    outer.reset();
-    element->setValue(2);
-    inner->deactivate();
-    inner->deactivate();
-
-    EXPECT_RAISES(messages::ModelFrozen, element->setValue(3));
-    EXPECT_EQ(element->getValue(), 2);
-    inner.reset();
-    EXPECT_TRUE(model->isFrozen());
-}
-
-TEST_F(AFrozenModel, IsThawedForOneFreezerOnly)
-{
-    Model::Freezer first = model->freeze();
-    Model::Freezer const second = model->freeze();
-
-    Model::Thawer const thawer = first.thaw();
-
-    EXPECT_RAISES(messages::ModelFrozen, element->setValue(1));
-}
-
 TEST_F(AFrozenModel, CanBeThawedAgainAndAgain)
 {
     Model::Freezer freezer = model->freeze();
@@ -712,20 +617,6 @@ TEST_F(AFrozenModel, CanBeThawedAgainAndAgain)
     EXPECT_EQ(element->getValue(), 3);
 }
 
-TEST_F(AFrozenModel, StaysThawedWhenItsThawerIsMoved)
-{
-    Model::Freezer freezer = model->freeze();
-    {
-        Model::Thawer first = freezer.thaw();
-        Model::Thawer second(std::move(first));
-        EXPECT_FALSE(model->isFrozen());
-        Model::Thawer third = freezer.thaw();
-        third = std::move(second);
-        EXPECT_FALSE(model->isFrozen());
-    }
-    EXPECT_TRUE(model->isFrozen());
-}
-
 TEST_F(AFrozenModel, IsFrozenByANewFreezerAfterOneDiedThawed)
 {
     auto freezer = std::make_unique<Model::Freezer>(model->freeze());
@@ -736,19 +627,6 @@ TEST_F(AFrozenModel, IsFrozenByANewFreezerAfterOneDiedThawed)
     thawer.reset();
     EXPECT_FALSE(model->isFrozen());
     Model::Freezer const next = model->freeze();
-
-    EXPECT_TRUE(model->isFrozen());
-}
-
-TEST_F(AFrozenModel, IsThawedByAFreezerThatMovedMeanwhile)
-{
-    auto freezer = std::make_unique<Model::Freezer>(model->freeze());
-    auto thawer = std::make_unique<Model::Thawer>(freezer->thaw());
-    Model::Freezer const moved(std::move(*freezer));
-    freezer.reset();
-
-    EXPECT_FALSE(model->isFrozen());
-    thawer.reset();
 
     EXPECT_TRUE(model->isFrozen());
 }
@@ -847,22 +725,6 @@ TEST_F(ALoadingIndicator, KeepsWhatWasLoadedWhenTheTransactionIsRolledBack)
 
     EXPECT_TRUE(loaded);
     EXPECT_EQ(model->findElement(loaded->getUuid()), loaded);
-}
-
-TEST_F(ALoadingIndicator, DoesNotHideAFreeze)
-{
-    Transaction const transaction = model->beginTransaction(/*revertible=*/false);
-    Model::Freezer const freezer = model->freeze();
-    Model::DataSourceLoadingInProgressIndicator const loading = model->startDataSourceLoading();
-
-    EXPECT_RAISES(messages::ModelFrozen, Plain::create(model));
-}
-
-TEST_F(ALoadingIndicator, DoesNotReplaceATransaction)
-{
-    Model::DataSourceLoadingInProgressIndicator const loading = model->startDataSourceLoading();
-
-    EXPECT_RAISES(messages::NoOpenTransaction, Plain::create(model));
 }
 
 // ---------------------------------------------------------------------------- outside transactions
