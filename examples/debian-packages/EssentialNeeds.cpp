@@ -29,7 +29,8 @@ public:
 
     std::vector<model::DependencyGroup> lacking() const
     {
-        std::vector<model::DependencyGroup> result;
+        std::vector<model::DependencyGroup> unsatisfied;
+        std::vector<model::DependencyGroup> unusable;
         std::vector<bool> seen(m_nodes.size());
         std::vector<std::size_t> blamed;
         auto const blame = [&](std::size_t node) {
@@ -47,11 +48,12 @@ public:
             {
                 if (isMet(need))
                     continue;
-                result.push_back(need.group);
+                (need.satisfiers.empty() ? unsatisfied : unusable).push_back(need.group);
                 std::for_each(need.satisfiers.begin(), need.satisfiers.end(), blame);
             }
         }
-        return result;
+        unsatisfied.insert(unsatisfied.end(), unusable.begin(), unusable.end());
+        return unsatisfied;
     }
 
 private:
