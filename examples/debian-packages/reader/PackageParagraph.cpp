@@ -14,6 +14,13 @@
 namespace debian {
 namespace {
 
+std::string quoted(std::string_view text)
+{
+    // Appended: GCC 12 warns of overlaps in sums of literals and strings that are inlined.
+    std::string result(1, '"');
+    return result.append(text).append(1, '"');
+}
+
 /// Reads fields of one paragraph and turns what is wrong with them into `ReadError`.
 class FieldReader
 {
@@ -39,7 +46,7 @@ public:
     {
         Paragraph::Field const field = findMandatory(name);
         if (!isValid(field.value))
-            fail(field, "\"" + std::string(field.value) + "\" is not allowed");
+            fail(field, quoted(field.value) + " is not allowed");
         return std::string(field.value);
     }
 
@@ -56,7 +63,7 @@ public:
             return false;
         if (ascii::equalsIgnoringCase(field->value, "yes"))
             return true;
-        fail(*field, "\"" + std::string(field->value) + "\" is neither \"yes\" nor \"no\"");
+        fail(*field, quoted(field->value) + " is neither \"yes\" nor \"no\"");
     }
 
     std::optional<std::uint64_t> readNumber(std::string_view name) const
@@ -68,7 +75,7 @@ public:
         char const* const end = field->value.data() + field->value.size();
         auto const result = std::from_chars(field->value.data(), end, number);
         if (result.ec != std::errc() || result.ptr != end)
-            fail(*field, "\"" + std::string(field->value) + "\" is not a number of 64 bits");
+            fail(*field, quoted(field->value) + " is not a number of 64 bits");
         return number;
     }
 
@@ -83,8 +90,8 @@ public:
             return MultiArch::Foreign;
         if (field->value == "allowed")
             return MultiArch::Allowed;
-        fail(*field, "\"" + std::string(field->value) +
-                         "\" is none of \"no\", \"same\", \"foreign\" and \"allowed\"");
+        fail(*field,
+             quoted(field->value) + " is none of \"no\", \"same\", \"foreign\" and \"allowed\"");
     }
 
     std::vector<RelationGroup> readRelations(std::string_view name, bool allowAlternatives) const
@@ -109,7 +116,7 @@ public:
             PackageRelation& provided = group.front();
             if (provided.bound && provided.bound->relation != VersionRelation::Equal)
                 fail(*m_paragraph.find(name),
-                     "\"" + provided.package + "\" has another relation than \"=\"");
+                     quoted(provided.package) + " has another relation than \"=\"");
             provides.push_back(std::move(provided));
         }
         return provides;
