@@ -36,12 +36,13 @@ struct LoadResult
 ///
 /// | Element | Made from | UUID from |
 /// |---|---|---|
-/// | `PackageIndex` | the file | nothing but its kind: a model has one |
-/// | `Package` | each name of a field `Package` or `Provides` | the name |
+/// | `PackageIndex` | the file | its kind alone: a model has one |
+/// | `Package` | each name in `Package` and `Provides` | the name |
 /// | `Release` | a paragraph | name, version, architecture |
-/// | `DependencyGroup` | a group of Pre-Depends, Depends, Recommends or Suggests | its release and
-/// number | | `Alternative` | a member of a group | its group and number |
+/// | `DependencyGroup` | a group of one of the four kinds | its release, kind and number |
+/// | `Alternative` | a member of a group | its group and number |
 ///
+/// The kinds are Pre-Depends, Depends, Recommends and Suggests.
 /// A dependency names a package, or a proxy into the model `AVAILABLE_URI` if the index has no such
 /// name: one proxy for each name. Architectures in dependencies, and versions in `Provides`, are
 /// not kept. Of paragraphs with the same name, version and architecture the first one counts.

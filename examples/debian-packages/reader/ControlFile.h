@@ -20,12 +20,12 @@ namespace debian {
 
 /// A stream of paragraphs. Knows lines and fields, but not what fields a package has.
 ///
-/// | Line                                 | Meaning |
-/// |--------------------------------------|--------------------------------------------------------|
-/// | empty, or blanks only                | ends a paragraph; several in a row count as one | |
-/// begins with `#`                      | a comment, ignored wherever it stands                  |
-/// | begins with a space or tab           | continues the field above | | `Name: value` | begins a
-/// field; the value may be empty                 |
+/// | Line                           | Meaning                                          |
+/// |--------------------------------|--------------------------------------------------|
+/// | empty, or blanks only          | ends a paragraph; several in a row count as one  |
+/// | begins with `#`                | a comment, ignored wherever it stands            |
+/// | begins with a space or tab     | continues the field above                        |
+/// | `Name: value`                  | begins a field; the value may be empty           |
 ///
 /// A line ends in LF or CR LF; a CR elsewhere is text. Blanks at the ends of lines and around the
 /// colon's value are dropped. Names consist of printable ASCII without space and colon, and begin
