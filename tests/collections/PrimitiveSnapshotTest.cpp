@@ -239,7 +239,7 @@ TEST(PrimitiveSetSnapshot, HoldsNegativeZeroAndZeroAsOneValue)
 
 TEST(TotalOrder, PutsWhatIsNotANumberBehindInfinity)
 {
-    internal::TotalLess<double> const less;
+    support::TotalLess<double> const less;
     double const infinity = std::numeric_limits<double>::infinity();
 
     EXPECT_TRUE(less(infinity, NOT_A_NUMBER));
@@ -250,7 +250,7 @@ TEST(TotalOrder, PutsWhatIsNotANumberBehindInfinity)
 
 TEST(TotalOrder, PutsWhatIsNotADateTimeBeforeAllTimes)
 {
-    internal::TotalLess<boost::posix_time::ptime> const less;
+    support::TotalLess<boost::posix_time::ptime> const less;
     boost::posix_time::ptime const none;
     boost::posix_time::ptime const first(boost::posix_time::neg_infin);
     boost::posix_time::ptime const day(boost::gregorian::date(2024, 2, 29));

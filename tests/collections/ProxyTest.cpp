@@ -266,7 +266,7 @@ TEST_F(Proxies, WithAnEmptyModelAndWithNoneAreOneEntry)
 
 TEST_F(Proxies, ThatDifferInTheModelOnlyShareAHash)
 {
-    internal::ProxyIdHasher const hash;
+    support::ProxyIdHasher const hash;
     ProxyId const local(ElementId::UUID_TYPE, u"x");
     ProxyId const remote(ElementId::UUID_TYPE, u"x", ELSEWHERE);
 

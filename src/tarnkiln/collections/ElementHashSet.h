@@ -9,7 +9,7 @@
 #include <type_traits>
 #include <unordered_set>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 /// Hashes an element by its UUID; 0 for the empty handle.
 ///
@@ -21,7 +21,7 @@ struct TARNKILN_EXPORT ElementHasher
 
     std::size_t operator()(ModelElement const& element) const
     {
-        return element.getImpl() ? UUIDHasher()(element.getImpl()->getUuid()) : 0;
+        return element.getImpl() ? internal::UUIDHasher()(element.getImpl()->getUuid()) : 0;
     }
 };
 
@@ -43,4 +43,4 @@ template <class T> using ElementHashSet = std::unordered_set<T, ElementHasher, E
 static_assert(std::__cache_default<ModelElement, ElementHasher>::value,
               "a set of elements stores the hash of each");
 #endif
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

@@ -16,9 +16,9 @@ namespace tarn::kiln {
 ///     packages = std::make_unique<ElementMap<ustring, Package>>(owner, nameOfPackage, NESTED);
 template <class K, class T>
 class TARNKILN_EXPORT ElementMap
-    : public ReferenceAssociativeContainer<K, T, std::map<K, T, internal::TotalLess<K>>>
+    : public ReferenceAssociativeContainer<K, T, std::map<K, T, support::TotalLess<K>>>
 {
-    using Base = ReferenceAssociativeContainer<K, T, std::map<K, T, internal::TotalLess<K>>>;
+    using Base = ReferenceAssociativeContainer<K, T, std::map<K, T, support::TotalLess<K>>>;
 
 public:
     class MyGenericInterface;
@@ -75,7 +75,7 @@ public:
     // GenericMapInterface
     ModelElement genericFind(Value const& key) override
     {
-        return m_map.find(internal::KeyTraits<K>::fromValue(key));
+        return m_map.find(support::KeyTraits<K>::fromValue(key));
     }
     meta::Type getKeyType() const override { return m_map.getKeyType(); }
     std::vector<Value> genericKeys() const override { return m_map.getKeys(); }
@@ -86,7 +86,7 @@ private:
 
 #define TARNKILN_DECLARE(K)                                                                        \
     extern template class TARNKILN_EXPORT ReferenceAssociativeContainer<                           \
-        K, ModelElement, std::map<K, ModelElement, internal::TotalLess<K>>>;                       \
+        K, ModelElement, std::map<K, ModelElement, support::TotalLess<K>>>;                        \
     extern template class TARNKILN_EXPORT ElementMap<K, ModelElement>;
 TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE

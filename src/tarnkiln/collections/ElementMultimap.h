@@ -14,9 +14,9 @@ namespace tarn::kiln {
 /// References by key; elements of one key stand in the order in which they came.
 template <class K, class T>
 class TARNKILN_EXPORT ElementMultimap
-    : public ReferenceAssociativeContainer<K, T, std::multimap<K, T, internal::TotalLess<K>>>
+    : public ReferenceAssociativeContainer<K, T, std::multimap<K, T, support::TotalLess<K>>>
 {
-    using Base = ReferenceAssociativeContainer<K, T, std::multimap<K, T, internal::TotalLess<K>>>;
+    using Base = ReferenceAssociativeContainer<K, T, std::multimap<K, T, support::TotalLess<K>>>;
 
 public:
     class MyGenericInterface;
@@ -76,7 +76,7 @@ public:
     // GenericMultimapInterface
     std::vector<ModelElement> genericFind(Value const& key) override
     {
-        std::vector<T> const found = m_map.find(internal::KeyTraits<K>::fromValue(key));
+        std::vector<T> const found = m_map.find(support::KeyTraits<K>::fromValue(key));
         return {found.begin(), found.end()};
     }
     meta::Type getKeyType() const override { return m_map.getKeyType(); }
@@ -88,7 +88,7 @@ private:
 
 #define TARNKILN_DECLARE(K)                                                                        \
     extern template class TARNKILN_EXPORT ReferenceAssociativeContainer<                           \
-        K, ModelElement, std::multimap<K, ModelElement, internal::TotalLess<K>>>;                  \
+        K, ModelElement, std::multimap<K, ModelElement, support::TotalLess<K>>>;                   \
     extern template class TARNKILN_EXPORT ElementMultimap<K, ModelElement>;
 TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE

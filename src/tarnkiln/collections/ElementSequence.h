@@ -26,7 +26,7 @@ public:
     class GenericSequence;
 
     using value_type = T;
-    using const_iterator = internal::SequenceIterator<T>;
+    using const_iterator = support::SequenceIterator<T>;
     using iterator = const_iterator;
 
     /// \param owner     null makes a snapshot.

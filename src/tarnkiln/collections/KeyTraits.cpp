@@ -6,7 +6,7 @@
 
 #include <type_traits>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 namespace {
 
 bool isEnumeration(meta::Type const& type)
@@ -55,4 +55,4 @@ meta::Type qualifierTypeOf(meta::Property const& collectionProperty)
 #define TARNKILN_DEFINE(K) template struct KeyTraits<K>;
 TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DEFINE)
 #undef TARNKILN_DEFINE
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

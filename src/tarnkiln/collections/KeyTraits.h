@@ -8,7 +8,7 @@
 #include "tarnkiln/meta/Property.h"
 #include "tarnkiln/meta/Type.h"
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 /// Keys of the type `K` as values. Defined for the types of `KeyTypes.h`; a further one needs
 /// a specialisation.
@@ -32,4 +32,4 @@ TARNKILN_EXPORT meta::Type qualifierTypeOf(meta::Property const& collectionPrope
 #define TARNKILN_DECLARE(K) extern template struct TARNKILN_EXPORT KeyTraits<K>;
 TARNKILN_FOR_EACH_KEY_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

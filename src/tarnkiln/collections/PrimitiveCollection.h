@@ -11,7 +11,7 @@ namespace tarn::kiln {
 
 /// Holds the container.
 ///
-/// \tparam T  a type with `internal::PrimitiveTraits`; those of `PrimitiveTypes.h` have it.
+/// \tparam T  a type with `support::PrimitiveTraits`; those of `PrimitiveTypes.h` have it.
 template <class T, class Container>
 class TARNKILN_EXPORT PrimitiveCollection : public AbstractPrimitiveCollection
 {
@@ -22,7 +22,7 @@ public:
     Container const& getEntries() const { return m_entries; }
 
     // AbstractOwnedCollection
-    meta::Type getCollectionType() const override { return internal::PrimitiveTraits<T>::type(); }
+    meta::Type getCollectionType() const override { return support::PrimitiveTraits<T>::type(); }
     void copyContents(AbstractOwnedCollection const& other) override;
     void basicSwapContents(AbstractOwnedCollection& other) noexcept override
     {
@@ -76,7 +76,7 @@ std::vector<Value> PrimitiveCollection<T, Container>::getAllValues() const
         return result;
     result.reserve(m_entries.size());
     for (T const& entry : m_entries)
-        result.push_back(internal::PrimitiveTraits<T>::toValue(entry, type));
+        result.push_back(support::PrimitiveTraits<T>::toValue(entry, type));
     return result;
 }
 }  // namespace tarn::kiln

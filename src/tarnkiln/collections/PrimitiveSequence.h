@@ -71,7 +71,7 @@ private:
 template <class T>
 class PrimitiveSequence<T>::SequenceInterface final : public GenericPrimitiveSequenceInterface
 {
-    using Traits = internal::PrimitiveTraits<T>;
+    using Traits = support::PrimitiveTraits<T>;
 
 public:
     explicit SequenceInterface(PrimitiveSequence& sequence) : m_sequence(sequence) {}
@@ -171,12 +171,12 @@ template <class T> void PrimitiveSequence<T>::remove(T const& value)
 
 template <class T> void PrimitiveSequence<T>::genericAdd(Value const& value)
 {
-    push_back(internal::PrimitiveTraits<T>::fromValue(value));
+    push_back(support::PrimitiveTraits<T>::fromValue(value));
 }
 
 template <class T> void PrimitiveSequence<T>::genericRemove(Value const& value)
 {
-    remove(internal::PrimitiveTraits<T>::fromValue(value));
+    remove(support::PrimitiveTraits<T>::fromValue(value));
 }
 
 template <class T> GenericPrimitiveInterface* PrimitiveSequence<T>::getGenericInterface() const

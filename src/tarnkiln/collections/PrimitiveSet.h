@@ -15,9 +15,9 @@ namespace tarn::kiln {
 /// the removal of one that it does not hold.
 template <class T>
 class TARNKILN_EXPORT PrimitiveSet
-    : public PrimitiveCollection<T, std::set<T, internal::TotalLess<T>>>
+    : public PrimitiveCollection<T, std::set<T, support::TotalLess<T>>>
 {
-    using Container = std::set<T, internal::TotalLess<T>>;
+    using Container = std::set<T, support::TotalLess<T>>;
     using Base = PrimitiveCollection<T, Container>;
 
 public:
@@ -37,11 +37,11 @@ public:
     // AbstractPrimitiveCollection
     void genericAdd(Value const& value) override
     {
-        insert(internal::PrimitiveTraits<T>::fromValue(value));
+        insert(support::PrimitiveTraits<T>::fromValue(value));
     }
     void genericRemove(Value const& value) override
     {
-        erase(internal::PrimitiveTraits<T>::fromValue(value));
+        erase(support::PrimitiveTraits<T>::fromValue(value));
     }
     int getKind() const override { return AbstractPrimitiveCollection::SET; }
 
@@ -73,7 +73,7 @@ template <class T> void PrimitiveSet<T>::erase(T const& value)
 
 #define TARNKILN_DECLARE(T)                                                                        \
     extern template class TARNKILN_EXPORT                                                          \
-        PrimitiveCollection<T, std::set<T, internal::TotalLess<T>>>;                               \
+        PrimitiveCollection<T, std::set<T, support::TotalLess<T>>>;                                \
     extern template class TARNKILN_EXPORT PrimitiveSet<T>;
 TARNKILN_FOR_EACH_PRIMITIVE_TYPE(TARNKILN_DECLARE)
 #undef TARNKILN_DECLARE

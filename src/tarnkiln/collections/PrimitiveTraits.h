@@ -5,7 +5,7 @@
 #include "tarnkiln/meta/StandardTypeOf.h"
 #include "tarnkiln/meta/Type.h"
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 /// Entries of the type `T` as values. The enumerations of a client specialise it.
 template <class T> struct PrimitiveTraits
@@ -16,4 +16,4 @@ template <class T> struct PrimitiveTraits
     /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  if `value` is of another type.
     static T fromValue(Value const& value) { return value.getValue<T>(); }
 };
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

@@ -4,7 +4,7 @@
 
 #include <functional>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 std::size_t ProxyIdHasher::operator()(ProxyId const& id) const
 {
@@ -13,4 +13,4 @@ std::size_t ProxyIdHasher::operator()(ProxyId const& id) const
         boost::hash_combine(seed, unit);
     return seed;
 }
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

@@ -8,7 +8,7 @@
 #include <cstddef>
 #include <unordered_map>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 /// Hashes type and text of an id and leaves the model out.
 struct TARNKILN_EXPORT ProxyIdHasher
@@ -18,4 +18,4 @@ struct TARNKILN_EXPORT ProxyIdHasher
 
 /// The proxies of one collection, each under its id.
 using ProxyTable = std::unordered_map<ProxyId, ModelElement, ProxyIdHasher>;
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

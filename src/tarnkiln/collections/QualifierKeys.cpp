@@ -9,18 +9,20 @@ namespace tarn::kiln {
 
 unsigned long enumerationKeyOf(ModelElement::Impl* element, meta::Property const& qualifier)
 {
-    // A literal's value travels as unsigned but reads as signed.
-    return static_cast<unsigned long>(keyOf<long>(element, qualifier));
+    boost::optional<long> const number = support::readQualifier(element, qualifier).getEnumNumber();
+    if (!number)
+        support::reportMissingKey(qualifier);
+    return static_cast<unsigned long>(*number);
 }
 
 UUID referenceKeyOf(ModelElement::Impl* element, meta::Property const& qualifier)
 {
-    Value const value = internal::readQualifier(element, qualifier);
+    Value const value = support::readQualifier(element, qualifier);
     ModelElement const referred = value.getValue<ModelElement>();
     return referred ? referred->getUuid() : UUID{};
 }
 
-namespace internal {
+namespace support {
 
 Value readQualifier(ModelElement::Impl* element, meta::Property const& qualifier)
 {
@@ -29,8 +31,8 @@ Value readQualifier(ModelElement::Impl* element, meta::Property const& qualifier
 
 void reportMissingKey(meta::Property const& qualifier)
 {
-    reportException(
-        tarnkiln::messages::CannotCastIncompatibleTypes(qualifiedName(qualifier->getType())));
+    reportException(tarnkiln::messages::CannotCastIncompatibleTypes(
+        internal::qualifiedName(qualifier->getType())));
 }
-}  // namespace internal
+}  // namespace support
 }  // namespace tarn::kiln

@@ -17,25 +17,25 @@ namespace tarn::kiln {
 /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  if there is no value, or one of
 ///     another type; with the qualified name of the qualifier's type or of the value's.
 template <class K> K keyOf(ModelElement::Impl* element, meta::Property const& qualifier);
-/// The value of an enumeration literal.
+/// The number of an enumeration literal; fails likewise.
 TARNKILN_EXPORT unsigned long enumerationKeyOf(ModelElement::Impl* element,
                                                meta::Property const& qualifier);
 /// The UUID of the element that `qualifier` refers to; nil if there is none.
 TARNKILN_EXPORT UUID referenceKeyOf(ModelElement::Impl* element, meta::Property const& qualifier);
 
-namespace internal {
+namespace support {
 TARNKILN_EXPORT Value readQualifier(ModelElement::Impl* element, meta::Property const& qualifier);
 [[noreturn]] TARNKILN_EXPORT void reportMissingKey(meta::Property const& qualifier);
-}  // namespace internal
+}  // namespace support
 
 template <class K> K keyOf(ModelElement::Impl* element, meta::Property const& qualifier)
 {
-    Value const value = internal::readQualifier(element, qualifier);
+    Value const value = support::readQualifier(element, qualifier);
     if (value.getFlags() != ValueFlags::OptionalSingle)
         return value.getValue<K>();
     boost::optional<K> const key = value.getValue<boost::optional<K>>();
     if (!key)
-        internal::reportMissingKey(qualifier);
+        support::reportMissingKey(qualifier);
     return *key;
 }
 

@@ -84,8 +84,7 @@ protected:
 
 private:
     /// Whether a key has one element at most.
-    static constexpr bool UNIQUE =
-        std::is_same_v<Container, std::map<K, T, internal::TotalLess<K>>>;
+    static constexpr bool UNIQUE = std::is_same_v<Container, std::map<K, T, support::TotalLess<K>>>;
 
     K keyOf(ModelElement const& element) const { return m_extractor(element.getImpl()); }
     const_iterator find(K const& key, ModelElement const& element) const;
@@ -213,7 +212,7 @@ template <class K, class T, class Container>
 meta::Type ReferenceAssociativeContainer<K, T, Container>::getKeyType() const
 {
     meta::Property const& property = Base::getCollectionProperty();
-    return property ? internal::qualifierTypeOf(property) : internal::KeyTraits<K>::fallbackType();
+    return property ? support::qualifierTypeOf(property) : support::KeyTraits<K>::fallbackType();
 }
 
 template <class K, class T, class Container>
@@ -222,7 +221,7 @@ std::vector<Value> ReferenceAssociativeContainer<K, T, Container>::getKeys() con
     meta::Type const type = getKeyType();
     std::vector<Value> result;
     for (auto place = begin(); place != end(); place = m_entries.upper_bound(place->first))
-        result.push_back(internal::KeyTraits<K>::toValue(place->first, type));
+        result.push_back(support::KeyTraits<K>::toValue(place->first, type));
     return result;
 }
 

@@ -131,6 +131,11 @@ bool ReferenceCollection::namesModel(ModelElement const& proxy)
     return proxy->getProxyIdImpl()->getModelId().has_value();
 }
 
+void ReferenceCollection::reportCannotAddIncompatibleObjectSubset()
+{
+    reportException(tarnkiln::messages::CannotAddIncompatibleObjectSubset());
+}
+
 void ReferenceCollection::reportCannotAddNonExistentObject()
 {
     reportException(tarnkiln::messages::CannotAddNonExistentObject());

@@ -118,6 +118,7 @@ protected:
 
     /// \name Failures, raised with the ids of their names
     /// @{
+    [[noreturn]] static void reportCannotAddIncompatibleObjectSubset();
     [[noreturn]] static void reportCannotAddNonExistentObject();
     [[noreturn]] static void reportCannotAddSecondObject();
     [[noreturn]] static void reportCannotCreateCrossModelAssociation();

@@ -8,7 +8,7 @@
 namespace tarn::kiln {
 template <class T> class ElementSequence;
 
-namespace internal {
+namespace support {
 
 /// A position in an `ElementSequence`, which resolves the entry there when it is read.
 ///
@@ -85,5 +85,5 @@ private:
     ElementSequence<T> const* m_sequence = nullptr;
     difference_type m_index = 0;
 };
-}  // namespace internal
+}  // namespace support
 }  // namespace tarn::kiln

@@ -8,7 +8,7 @@
 #include <cmath>
 #include <functional>
 
-namespace tarn::kiln::internal {
+namespace tarn::kiln::support {
 
 /// `std::less`, but total where that is not: all NaNs are one value behind all others, and "not a
 /// date-time" is one value before all others.
@@ -33,4 +33,4 @@ template <> struct TARNKILN_EXPORT TotalLess<boost::posix_time::ptime>
         return left < right;
     }
 };
-}  // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::support

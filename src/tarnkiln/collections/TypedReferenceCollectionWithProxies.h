@@ -78,7 +78,7 @@ private:
     std::vector<ModelElement> copyProxies() const;
     void moveToEntries(ModelElement const& proxy, ModelElement const& element);
 
-    std::unique_ptr<internal::ProxyTable> m_proxies;  ///< Null before the first proxy.
+    std::unique_ptr<support::ProxyTable> m_proxies;  ///< Null before the first proxy.
 };
 
 template <class T, class Container>
@@ -89,7 +89,7 @@ void TypedReferenceCollectionWithProxies<T, Container>::addProxy(ModelElement co
     if (Base::isComposite() && Base::namesModel(proxy))
         Base::reportCannotCreateCrossModelAssociation();
     if (!m_proxies)
-        m_proxies = std::make_unique<internal::ProxyTable>(/*buckets=*/1);
+        m_proxies = std::make_unique<support::ProxyTable>(/*buckets=*/1);
     AbstractOwnedCollection::Operation operation(*this);
     Base::modifying();
     m_proxies->emplace(*proxy.getImpl()->getProxyIdImpl(), proxy);
@@ -188,7 +188,7 @@ void TypedReferenceCollectionWithProxies<T, Container>::basicCopyValues(
 {
     auto const& source = static_cast<TypedReferenceCollectionWithProxies const&>(other);
     auto copy =
-        source.m_proxies ? std::make_unique<internal::ProxyTable>(*source.m_proxies) : nullptr;
+        source.m_proxies ? std::make_unique<support::ProxyTable>(*source.m_proxies) : nullptr;
     AbstractOwnedCollection::Operation operation(*this);
     Base::basicCopyValues(other);
     m_proxies.swap(copy);
@@ -216,7 +216,7 @@ template <class T, class Container>
 void TypedReferenceCollectionWithProxies<T, Container>::clearProxies()
 {
     if (m_proxies)
-        internal::ProxyTable(1).swap(*m_proxies);
+        support::ProxyTable(1).swap(*m_proxies);
 }
 
 /// What is loaded while a proxy is resolved may change the table, so that roads walk a copy.

@@ -2,8 +2,8 @@
 
 namespace tarn::kiln {
 
-template class TypedReferenceCollection<ModelElement, internal::ElementHashSet<ModelElement>>;
+template class TypedReferenceCollection<ModelElement, support::ElementHashSet<ModelElement>>;
 template class TypedReferenceCollectionWithProxies<ModelElement,
-                                                   internal::ElementHashSet<ModelElement>>;
+                                                   support::ElementHashSet<ModelElement>>;
 template class UnorderedElementSet<ModelElement>;
 }  // namespace tarn::kiln

@@ -17,9 +17,9 @@ namespace tarn::kiln {
 /// still found, by a scan.
 template <class T>
 class TARNKILN_EXPORT UnorderedElementSet
-    : public TypedReferenceCollectionWithProxies<T, internal::ElementHashSet<T>>
+    : public TypedReferenceCollectionWithProxies<T, support::ElementHashSet<T>>
 {
-    using Container = internal::ElementHashSet<T>;
+    using Container = support::ElementHashSet<T>;
     using Base = TypedReferenceCollectionWithProxies<T, Container>;
 
 public:
@@ -174,9 +174,8 @@ UnorderedElementSet<T>::find(ModelElement const& element) const
     return std::find_if(begin(), end(), [&](T const& entry) { return entry == element; });
 }
 
-extern template class TypedReferenceCollection<ModelElement,
-                                               internal::ElementHashSet<ModelElement>>;
+extern template class TypedReferenceCollection<ModelElement, support::ElementHashSet<ModelElement>>;
 extern template class TypedReferenceCollectionWithProxies<ModelElement,
-                                                          internal::ElementHashSet<ModelElement>>;
+                                                          support::ElementHashSet<ModelElement>>;
 extern template class UnorderedElementSet<ModelElement>;
 }  // namespace tarn::kiln
