@@ -418,5 +418,72 @@ TEST_F(ManyToMany, ARollbackRestoresBothEnds)
     EXPECT_TRUE(second->getMarks().empty());
     EXPECT_TRUE(model->checkInvariants().empty());
 }
+
+// ---------------------------------------------------------------------------- failures
+
+/// A node that fails once it has taken its end of an association.
+class FailingImpl : public Node::Impl
+{
+public:
+    using Node::Impl::Impl;
+
+    void inverseAddSlot(ModelElement const& element, Slot const& slot) override
+    {
+        Node::Impl::inverseAddSlot(element, slot);
+        throw std::runtime_error("the other end fails");
+    }
+};
+
+class FailureAtTheOtherEnd : public CollectionFixture
+{
+protected:
+    FailureAtTheOtherEnd() { failing->notifyCreated(); }
+
+    Node const owner = node(u"owner");
+    Node const failing{new FailingImpl(model, UUID{})};
+};
+
+TEST_F(FailureAtTheOtherEnd, IsTakenBackIfTheTransactionIsDeep)
+{
+    DeepCounter counter;
+    model->addListener(&counter);
+
+    EXPECT_THROW(owner->getOwned().push_back(failing), std::runtime_error);
+    EXPECT_THROW(owner->getMarks().insert(failing), std::runtime_error);
+    EXPECT_THROW(owner->getByName().insert(failing), std::runtime_error);
+
+    EXPECT_TRUE(owner->getOwned().empty());
+    EXPECT_TRUE(owner->getMarks().empty());
+    EXPECT_TRUE(owner->getByName().empty());
+    EXPECT_FALSE(failing->hasOwner());
+    EXPECT_TRUE(failing->isTopLevel());
+    EXPECT_EQ(counter.commits, 0);
+    EXPECT_EQ(counter.rollbacks, 3);
+    EXPECT_FALSE(model->getCurrentTransaction());
+    model->removeListener(&counter);
+    EXPECT_TRUE(model->checkInvariants().empty());
+}
+
+TEST_F(FailureAtTheOtherEnd, StaysIfTheTransactionIsShallow)
+{
+    EXPECT_THROW(owner->getOwned().push_back(failing), std::runtime_error);
+
+    EXPECT_EQ(owner->getOwned().size(), 1u);
+    EXPECT_TRUE(failing->hasOwner());
+    EXPECT_FALSE(model->getCurrentTransaction());
+}
+
+TEST_F(FailureAtTheOtherEnd, IsLeftToTheOuterTransaction)
+{
+    Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+
+    EXPECT_THROW(owner->getOwned().push_back(failing), std::runtime_error);
+    EXPECT_EQ(owner->getOwned().size(), 1u);
+    EXPECT_FALSE(transaction.isRollBackOnly());
+    EXPECT_EQ(transaction.rollBack(), TransactionResult::RolledBack);
+
+    EXPECT_TRUE(owner->getOwned().empty());
+    EXPECT_FALSE(failing->hasOwner());
+}
 }  // namespace
 }  // namespace testkit
