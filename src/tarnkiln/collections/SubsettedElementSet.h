@@ -34,6 +34,10 @@ public:
     {
         reportCannotAddIncompatibleObjectSubset();
     }
+    /// A view holds nothing that could be swapped or dropped.
+    void basicSwapContents(AbstractOwnedCollection&) noexcept override {}
+    void basicDropContents() noexcept override {}
+
     // ReferenceCollection
     std::vector<ModelElement> getAllValues() const override
     {
