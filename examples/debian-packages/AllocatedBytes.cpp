@@ -31,10 +31,16 @@ std::size_t debian::allocatedBytes()
     return liveBytes.load(std::memory_order_relaxed);
 }
 
-// The forms for arrays and without exceptions call these.
+// The other forms call these, except under the sanitizers, whose own forms for arrays fit each
+// other.
 void* operator new(std::size_t size)
 {
     return counted(std::malloc(size == 0 ? 1 : size));
+}
+void* operator new(std::size_t size, std::nothrow_t const& /*tag*/) noexcept
+{
+    void* const block = std::malloc(size == 0 ? 1 : size);
+    return block ? counted(block) : nullptr;
 }
 void* operator new(std::size_t size, std::align_val_t alignment)
 {
