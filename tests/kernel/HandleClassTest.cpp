@@ -7,6 +7,7 @@
 #include <gmock/gmock.h>
 
 #include <type_traits>
+#include <unordered_set>
 
 namespace {
 
@@ -113,5 +114,18 @@ TYPED_TEST(EveryHandleClass, EqualsHandlesOfTheSameObjectOnly)
     EXPECT_EQ(first, first);
     EXPECT_NE(first, second);
     EXPECT_NE(first, TypeParam());
+}
+
+TEST(HandlesOfElements, HashByTheirElementWhateverTheirClass)
+{
+    Model const model = Model::createTransientModel();
+    Plain const first = Plain::create(model);
+    Plain const second = Plain::create(model);
+    std::unordered_set<ModelElement> const set{first, second, ModelElement(first), ModelElement()};
+
+    EXPECT_EQ(set.size(), 3u);
+    EXPECT_EQ(set.count(ModelElement(second.getImpl())), 1u);
+    EXPECT_EQ(std::hash<ModelElement>()(ModelElement()), 0u);
+    EXPECT_EQ(std::hash<Plain>()(first), std::hash<ModelElement>()(first));
 }
 }  // namespace

@@ -4,7 +4,6 @@
 #include "tarnkiln/kernel/ModelElementBuilder.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/ProxyId.h"
-#include "tarnkiln/kernel/UUIDHasher.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/ClassImpl.h"
@@ -20,10 +19,3 @@ ModelElement ModelElement::createProxy(Model const& model, meta::Class const& me
     return builder->createProxy(id);
 }
 } // namespace tarn::kiln
-
-std::size_t std::hash<tarn::kiln::ModelElement>::operator()(
-    tarn::kiln::ModelElement const& element) const noexcept
-{
-    auto const* const impl = element.getElementImpl();
-    return impl ? tarn::kiln::internal::UUIDHasher()(impl->getUuid()) : 0;
-}

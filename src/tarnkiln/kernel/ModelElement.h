@@ -2,6 +2,7 @@
 /// The handle of an element of a model.
 #pragma once
 #include "tarnkiln/kernel/ElementHandle.h"
+#include "tarnkiln/kernel/UUIDHasher.h"
 
 #include <concepts>
 
@@ -43,7 +44,11 @@ public:
 
 template <> struct std::hash<tarn::kiln::ModelElement>
 {
-    std::size_t operator()(tarn::kiln::ModelElement const& element) const noexcept;
+    std::size_t operator()(tarn::kiln::ModelElement const& element) const noexcept
+    {
+        tarn::kiln::ElementImpl const* const impl = element.getElementImpl();
+        return impl ? tarn::kiln::internal::UUIDHasher()(impl->getUuid()) : 0;
+    }
 };
 
 /// Handles of all classes hash as the element does.
