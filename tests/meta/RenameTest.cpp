@@ -184,7 +184,8 @@ TEST_F(Reowning, RefusesToNestAPackageInItself)
 TEST_F(Reowning, RefusesAnOwnerInAnotherModel)
 {
     Class const book = cls(u"Book");
-    Package const elsewhere = Package::create(Model::createRegistryModel(u"elsewhere"));
+    Model const other = Model::createRegistryModel(u"elsewhere");
+    Package const elsewhere = Package::create(other);
 
     EXPECT_RAISES(messages::CannotChangeModel, book->setOwningPackage(elsewhere));
 }
