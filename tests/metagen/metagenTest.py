@@ -87,6 +87,13 @@ class WrongDescription(unittest.TestCase):
     def property(self, owner, name):
         return named(self.cls(owner)["properties"], name)
 
+    def at(self, owner, name=None):
+        """The place of a class or of one of its properties."""
+        place = f"/classes/{self.facts['classes'].index(self.cls(owner))}"
+        if name is None:
+            return place
+        return f"{place}/properties/{self.cls(owner)['properties'].index(self.property(owner, name))}"
+
     def refuse(self, place, reason):
         """Expects that the generator names `place` and `reason`, and writes nothing."""
         with tempfile.TemporaryDirectory() as folder:
@@ -105,79 +112,80 @@ class WrongDescription(unittest.TestCase):
 
     def test_gives_a_uuid_twice(self):
         self.cls("Enum")["uuid"] = self.cls("Class")["uuid"]
-        self.refuse("classes/Enum", "belongs to classes/Class")
+        self.refuse(self.at("Enum") + "/uuid", f"belongs to {self.at('Class')}/uuid")
 
     def test_gives_a_malformed_uuid(self):
         self.property("Enum", "literals")["uuid"] = "nothing"
-        self.refuse("classes/Enum/properties/literals", "is no UUID")
+        self.refuse(self.at("Enum", "literals") + "/uuid", "is no UUID")
 
     def test_leaves_a_gap_between_indices(self):
         self.property("EnumLiteral", "parentEnum")["index"] = 4
-        self.refuse("classes/EnumLiteral/parentEnum", "3 comes next")
+        self.refuse(self.at("EnumLiteral", "parentEnum") + "/index", "3 comes next")
 
     def test_does_not_continue_the_indices_of_the_superclass(self):
         self.property("TypedElement", "type")["index"] = 1
-        self.refuse("classes/TypedElement/type", "2 comes next")
+        self.refuse(self.at("TypedElement", "type") + "/index", "2 comes next")
 
     def test_counts_its_slots_wrongly(self):
         self.cls("Enum")["slots"] = 7
-        self.refuse("classes/Enum", "slots is 7 instead of 6")
+        self.refuse(self.at("Enum") + "/slots", "is 7 instead of 6")
 
     def test_gives_a_derived_property_an_index(self):
         self.property("Type", "qualifiedName")["index"] = 4
-        self.refuse("classes/Type/qualifiedName", "derived properties have no index")
+        self.refuse(self.at("Type", "qualifiedName") + "/index", "a derived property has no index")
 
     def test_names_an_opposite_that_is_not_there(self):
         self.property("Enum", "literals")["opposite"] = "owner"
-        self.refuse("classes/Enum/literals", "EnumLiteral has no property owner")
+        self.refuse(self.at("Enum", "literals"), "EnumLiteral has no property owner")
 
     def test_has_opposites_that_are_not_mutual(self):
         self.property("EnumLiteral", "parentEnum")["opposite"] = None
-        self.refuse("classes/Enum/literals", "the opposite of parentEnum is None")
+        self.refuse(self.at("Enum", "literals") + "/opposite", "one-sided: EnumLiteral.parentEnum has no")
 
     def test_has_opposites_of_types_that_do_not_match(self):
         self.property("EnumLiteral", "parentEnum")["type"] = "Type"
-        self.refuse("classes/Enum/literals", "its opposite is of type Type, not Enum")
+        self.refuse(self.at("Enum", "literals") + "/opposite",
+                    "EnumLiteral.parentEnum is of type Type, not Enum")
 
     def test_has_two_containers_for_each_other(self):
         self.property("EnumLiteral", "parentEnum")["composite"] = True
-        self.refuse("classes/Enum/literals", "one container")
+        self.refuse(self.at("Enum", "literals"), "one container")
 
     def test_qualifies_by_a_property_of_another_class(self):
         self.property("Enum", "literals")["qualifiedBy"] = "uri"
-        self.refuse("classes/Enum/literals", "EnumLiteral has no property uri")
+        self.refuse(self.at("Enum", "literals"), "EnumLiteral has no property uri")
 
     def test_has_a_default_that_does_not_parse(self):
         self.property("Argument", "isInput")["default"] = "maybe"
-        self.refuse("classes/Argument/isInput", "'maybe' is no Boolean")
+        self.refuse(self.at("Argument", "isInput") + "/default", "'maybe' does not parse as Boolean")
 
     def test_has_bounds_that_leave_no_room(self):
         self.property("Argument", "isInput")["lower"] = 2
-        self.refuse("classes/Argument/isInput", "2..1 leave no room")
+        self.refuse(self.at("Argument", "isInput") + "/lower", "the bounds 2..1 leave no room")
 
     def test_has_a_superclass_that_is_not_there(self):
         self.cls("Enum")["superclass"] = "Nothing"
-        self.refuse("classes/Enum", "there is no superclass Nothing")
+        self.refuse(self.at("Enum") + "/superclass", "there is no class Nothing")
 
     def test_has_a_ring_of_superclasses(self):
         self.cls("NamedElement")["superclass"] = "Enum"
-        self.refuse("classes/", "lead back to it")
+        self.refuse(self.at("NamedElement") + "/superclass", "lead back to it")
 
     def test_has_a_property_of_an_unknown_class(self):
         self.property("Class", "superclass")["type"] = "Nothing"
-        self.refuse("classes/Class/superclass", "there is no class Nothing")
+        self.refuse(self.at("Class", "superclass") + "/type", "there is no type Nothing")
 
     def test_has_a_class_without_cpp(self):
         del self.overlay["classes"]["Enum"]
-        self.refuse("catalogue.cpp.json: classes", "there is no entry for Enum")
+        self.refuse("catalogue.cpp.json: /classes", "there is no entry for Enum")
 
     def test_has_cpp_for_a_property_without_facts(self):
         self.overlay["classes"]["Enum"]["properties"]["colour"] = {"doc": "the colour"}
-        self.refuse("catalogue.cpp.json: classes/Enum", "the facts know no colour")
+        self.refuse("catalogue.cpp.json: /classes/Enum", "the facts know no colour")
 
     def test_has_a_type_without_cpp(self):
         del self.overlay["types"]["Integer"]
-        self.refuse("catalogue.cpp.json: types", "there is no C++ type for Integer")
+        self.refuse("catalogue.cpp.json: /types", "there is no C++ type for Integer")
 
 
 if __name__ == "__main__":

@@ -7,12 +7,16 @@ import sys
 
 import jinja2
 
-import check
-import model
+import load
+import source
 
 ROOT = pathlib.Path(__file__).resolve().parent
 PER_CLASS = {"Handle.h": "{name}.h", "Impl.h": "{name}Impl.h", "Class.cpp": "{name}.cpp"}
-PER_PACKAGE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt"}
+PER_CATALOGUE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt"}
+# What a client has besides.
+PER_CLIENT = {"Fwd.h": "Fwd.h"}
+PER_ENUMERATION = {"Enumeration.h": "{name}.h"}
+PER_DATA_TYPE = {"DataType.h": "{name}.h", "DataType.cpp": "{name}.cpp"}
 
 
 def environment():
@@ -27,13 +31,21 @@ def render(package, command):
     env = environment()
     origin = f"// Made from {package.title} by `{command}`; do not edit."
     files = {}
-    for template, pattern in PER_CLASS.items():
-        for cls in package.classes:
-            text = env.get_template(template + ".jinja").render(c=cls, p=package, origin=origin)
-            files[pattern.format(name=cls.name)] = text
-    for template, name in PER_PACKAGE.items():
+
+    def add(template, name, **names):
         files[name] = env.get_template(template + ".jinja").render(
-            p=package, origin=origin, command=command)
+            p=package, origin=origin, command=command, **names)
+
+    def add_each(templates, entries):
+        for template, pattern in templates.items():
+            for entry in entries:
+                add(template, pattern.format(name=entry.name), c=entry)
+
+    add_each(PER_CLASS, package.classes)
+    add_each(PER_ENUMERATION, package.enumerations)
+    add_each(PER_DATA_TYPE, package.data_types)
+    for template, name in (PER_CATALOGUE if package.is_catalogue else PER_CLIENT).items():
+        add(template, name)
     return files
 
 
@@ -64,20 +76,39 @@ def compare(files, output):
 
 def main():
     parser = argparse.ArgumentParser(description=__doc__)
-    parser.add_argument("description", type=pathlib.Path, help="the facts, NAME.json; NAME.cpp.json lies beside")
+    parser.add_argument("description", type=pathlib.Path,
+                        help="NAME.json; of the catalogue the facts, beside which NAME.cpp.json lies")
     parser.add_argument("output", type=pathlib.Path, help="the folder of the generated files")
-    parser.add_argument("--check", action="store_true", help="change nothing, print a diff and fail if stale")
+    choice = parser.add_mutually_exclusive_group()
+    choice.add_argument("--check", action="store_true",
+                        help="change nothing, print a diff and fail if stale")
+    choice.add_argument("--list", action="store_true",
+                        help="write nothing, print the names of the generated files")
+    choice.add_argument("--inputs", action="store_true",
+                        help="write nothing, print the files that the output depends on")
     arguments = parser.parse_args()
     try:
-        package = model.Package(arguments.description, arguments.description.with_suffix(".cpp.json"))
-    except check.DescriptionError as error:
+        package = load.package(arguments.description)
+    except source.DescriptionError as error:
         print(error, file=sys.stderr)
         return 2
-    files = render(package, "tools/metagen/metagen.py")
+    if arguments.inputs:
+        print("\n".join(inputs(package)))
+        return 0
+    files = render(package, "tools/metagen/metagen.py" if package.is_catalogue else "metagen.py")
+    if arguments.list:
+        print("\n".join(sorted(files)))
+        return 0
     if arguments.check:
         return 1 if compare(files, arguments.output) else 0
     write(files, arguments.output)
     return 0
+
+
+def inputs(package):
+    """The generator, its templates, and the descriptions that were read."""
+    own = [*ROOT.glob("*.py"), *ROOT.glob("*.json"), *ROOT.glob("templates/**/*.jinja")]
+    return sorted(str(path) for path in {*own, *package.sources})
 
 
 if __name__ == "__main__":

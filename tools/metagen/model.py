@@ -4,15 +4,13 @@ A description has two halves: the facts (classes, properties, indices, UUIDs) an
 the decisions that only C++ needs (namespace, documentation, C++ types, what is written by hand).
 Everything that templates print is computed here; they only lay it out.
 """
-import json
 import re
 import textwrap
 
-import check
+import words
 
 WIDTH = 100
 MODEL_ELEMENT = "ModelElement"
-UNBOUNDED = 0xFFFFFFFF
 
 
 def comment(text, indent=0):
@@ -57,6 +55,22 @@ def capital(name):
     return name[0].upper() + name[1:]
 
 
+def article(name):
+    return "an" if name[0] in "AEIOU" else "a"
+
+
+def sentence(text):
+    """`text` with a capital and a full stop."""
+    return capital(text.rstrip(".")) + "."
+
+
+def sorted_blocks(headers):
+    """Headers in angle brackets, those of Boost before those of the standard library."""
+    boost = sorted(h for h in headers if h.startswith("<boost"))
+    standard = sorted(headers - set(boost))
+    return [block for block in (boost, standard) if block]
+
+
 class Property:
     """One property of a class, and the C++ that stands for it."""
 
@@ -70,9 +84,13 @@ class Property:
         self.many = facts["upper"] != 1
         self.is_element = facts["typeKind"] == "Class"
         self.composite = facts["composite"]
-        self.constant = constant(self.name)
-        self.field = f"m_{self.name}"
+        self.cpp_name = cpp.get("name", self.name)
+        self.constant = constant(self.cpp_name)
+        self.field = f"m_{self.cpp_name}"
         self.setter_kind = cpp.get("setter", "generated")
+        # A property that may not be set from outside still has a setter, for the class itself.
+        self.is_settable = facts.get("setOnce", False) or not facts["readOnly"]
+        self.is_set_once = facts.get("setOnce", False)
 
     def link(self):
         """Finds what the description names; all classes exist by now."""
@@ -81,7 +99,7 @@ class Property:
         self.opposite = self.target and self.target.find(self.facts["opposite"])
         self.qualifier = self.target and self.target.find(self.facts["qualifiedBy"])
         self.is_container = bool(self.opposite and self.opposite.composite)
-        self.key_changer = None
+        self.rekeyed = []
 
     @property
     def kind(self):
@@ -101,19 +119,20 @@ class Property:
 
     @property
     def getter(self):
-        return self.name if re.match(r"is[A-Z]", self.name) else "get" + capital(self.name)
+        is_question = re.match(r"is[A-Z]", self.cpp_name)
+        return self.cpp_name if is_question else "get" + capital(self.cpp_name)
 
     @property
     def setter(self):
-        return "set" + capital(self.name)
+        return "set" + capital(self.cpp_name)
 
     @property
     def has(self):
-        return "has" + capital(self.name)
+        return "has" + capital(self.cpp_name)
 
     @property
     def maker(self):
-        return "make" + capital(self.name)
+        return "make" + capital(self.cpp_name)
 
     @property
     def parameter(self):
@@ -126,9 +145,9 @@ class Property:
     @property
     def argument(self):
         """The name of the setter's argument; no word of the language."""
-        words = re.sub(r"^is(?=[A-Z])", "", self.name)
-        name = words[0].lower() + words[1:]
-        return "value" if name in ("operation", "static", "public", "default") else name
+        plain = re.sub(r"^is(?=[A-Z])", "", self.cpp_name)
+        name = plain[0].lower() + plain[1:]
+        return "value" if name in words.RESERVED | {"operation"} else name
 
     @property
     def value(self):
@@ -138,9 +157,14 @@ class Property:
     def type(self):
         """The handle, the plain value, or the optional value."""
         if self.is_element:
-            return self.facts["type"]
+            return self.owner.package.handle(self.facts["type"])
         plain = self.value["cpp"]
         return f"boost::optional<{plain}>" if self.kind == "optional" else plain
+
+    @property
+    def target_impl(self):
+        """The class behind the handle of a reference, as its headers spell it."""
+        return f"{self.type}::Impl"
 
     @property
     def result(self):
@@ -150,26 +174,36 @@ class Property:
     def initial(self):
         """The initializer of the field, with its blank."""
         text = self.facts["default"]
-        if self.kind != "scalar":
+        if self.kind not in ("scalar", "optional"):
             return ""
-        plain = self.value["cpp"]
-        if plain == "bool":
-            return " = true" if text == "true" else " = false"
-        if plain == "UUID":
-            return "{}"
-        return f" = {text or 0}" if self.value["byValue"] else ""
+        if text:
+            return f" = {self.owner.package.default(self.facts['type'], text)}"
+        if self.kind == "optional":
+            return ""
+        return self.value.get("initial", " = 0" if self.value["byValue"] else "")
 
     @property
     def collection(self):
         """The class of a many-valued property's collection."""
-        entry = self.facts["type"] if self.is_element else self.value["cpp"]
+        entry = self.type if self.is_element else self.value["cpp"]
         if self.qualifier:
             form = "ElementMap" if self.facts["qualificationUnique"] else "ElementMultimap"
-            return f"{form}<{self.qualifier.value['cpp']}, {entry}>"
+            return f"{form}<{self.key_type}, {entry}>"
         if self.is_element:
             return f"ElementSequence<{entry}>" if self.facts["ordered"] else \
                 f"UnorderedElementSet<{entry}>"
         return f"PrimitiveSequence<{entry}>" if self.facts["ordered"] else f"PrimitiveSet<{entry}>"
+
+    @property
+    def key_type(self):
+        """The keys of a qualified property; literals go by their numbers."""
+        is_literal = self.qualifier.facts["typeKind"] == "Enum"
+        return "unsigned long" if is_literal else self.qualifier.value["cpp"]
+
+    def key_of(self, expression):
+        """`expression`, a value of the qualifier, as a key."""
+        is_literal = self.qualifier.facts["typeKind"] == "Enum"
+        return f"static_cast<unsigned long>({expression})" if is_literal else expression
 
     @property
     def collection_header(self):
@@ -188,7 +222,8 @@ class Property:
 
     @property
     def key_expression(self):
-        return f"static_cast<{self.target.name}::Impl*>(member)->{self.qualifier.getter}()"
+        member = f"static_cast<{self.type}::Impl*>(member)"
+        return self.key_of(f"{member}->{self.qualifier.getter}()")
 
     @property
     def slot_definition(self):
@@ -209,11 +244,11 @@ class Property:
         kind, *arguments = {
             "scalar": ["Scalar", self.field_pointer, self.constant, self.setter_pointer],
             "optional": ["Optional", self.field_pointer, self.constant, self.setter_pointer],
-            "reference": ["Reference", self.facts["type"], self.field_pointer, self.constant,
+            "reference": ["Reference", self.type, self.field_pointer, self.constant,
                           self.setter_pointer],
-            "composite reference": ["CompositeReference", self.facts["type"], self.field_pointer,
+            "composite reference": ["CompositeReference", self.type, self.field_pointer,
                                     self.constant, self.setter_pointer],
-            "container": ["Container", self.facts["type"], self.constant, self.setter_pointer],
+            "container": ["Container", self.type, self.constant, self.setter_pointer],
             "references": ["References", self.field_pointer, self.constant, self.maker_pointer,
                            f"&Impl::{self.getter}"],
             "values": ["Values", self.field_pointer, self.constant, self.maker_pointer,
@@ -239,26 +274,30 @@ class Property:
 
     @property
     def doc(self):
-        text = capital(self.cpp["doc"]) + "."
-        if self.key_changer:
-            text += "\n" + self.key_changer.key_failure
+        text = sentence(self.cpp["doc"] or f"the {spoken(self.name)}")
+        if self.is_set_once:
+            text += ("\nCan be set once: \\throws tarnkiln::messages::CannotSetReadOnlyProperty  if "
+                     "it has a value.")
+        if any(rekeyed.unique for rekeyed in self.rekeyed):
+            text += "\n" + self.rekeyed[0].key_failure
         return comment(text, 4)
 
     @property
     def overridden(self):
         """Whether a derived class gives the setter another body."""
-        return any(c.rekeyed and c.rekeyed.key is self and c is not self.owner
+        return any(self in [key for key, rekeyed in c.inherited_keys]
                    for c in self.owner.package.classes)
 
 
 class Rekeyed:
-    """A class whose elements stand in a collection of their owner by the value of `key`."""
+    """How the elements of a class stand in a collection of an owner by the value of `key`."""
 
     def __init__(self, to_owner):
         self.to_owner = to_owner
         self.collection = to_owner.opposite
         self.key = self.collection.qualifier
         self.unique = self.collection.facts["qualificationUnique"]
+        self.action = f"changeIn{capital(to_owner.cpp_name)}"
 
     @property
     def key_failure(self):
@@ -274,6 +313,19 @@ class Rekeyed:
             text += "\n\n" + self.key_failure
         return comment(text, 4)
 
+    @property
+    def require_free(self):
+        """Fails if the owner has an element of the new key; in a lambda."""
+        return self.key.call("    support::requireFreeKey",
+                             f"{self.to_owner.getter}()->{self.collection.getter}()",
+                             self.collection.key_of(self.key.argument))
+
+    def change(self, store):
+        """The change of the key in the owner's collection."""
+        return self.key.call("support::changeKey", "*this", f"{self.key.getter}()",
+                             self.key.argument, f"{self.to_owner.getter}()", self.to_owner.constant,
+                             "requireFree", store)
+
 
 class Class:
     def __init__(self, facts, cpp, package):
@@ -284,7 +336,7 @@ class Class:
         self.superclass = facts["superclass"]
         self.abstract = facts["abstract"]
         self.slots = facts["slots"]
-        self.brief = cpp["brief"]
+        self.brief = cpp["brief"] or f"{capital(article(self.name))} {spoken(self.name)}."
         self.properties = [Property(entry, cpp["properties"][entry["name"]], self)
                            for entry in facts["properties"]]
         self.declarations = cpp.get("declarations", [])
@@ -294,13 +346,20 @@ class Class:
             prop.link()
 
     def link_keys(self):
-        self.rekeyed = None
+        """Finds the collections of owners in which elements stand by a key."""
+        changes = {}
         for prop in self.stored:
             if prop.opposite and prop.opposite.qualifier:
-                self.rekeyed = Rekeyed(prop)
-        self.rekeys_inherited = bool(self.rekeyed) and self.rekeyed.key.owner is not self
-        if self.rekeyed and not self.rekeys_inherited:
-            self.rekeyed.key.key_changer = self.rekeyed
+                changes.setdefault(prop.opposite.qualifier, []).append(Rekeyed(prop))
+        for key, rekeyed in changes.items():
+            if key.owner is self:
+                key.rekeyed = rekeyed
+        self.inherited_keys = [each for each in changes.items() if each[0].owner is not self]
+        self.rekeyed = [each for rekeyed in changes.values() for each in rekeyed]
+
+    def rekeyed_by(self, to_owner):
+        """How it stands in the collection that is the opposite of `to_owner`; or None."""
+        return next((each for each in self.rekeyed if each.to_owner is to_owner), None)
 
     @property
     def stored(self):
@@ -321,11 +380,12 @@ class Class:
 
     @property
     def article(self):
-        return "an" if self.name[0] in "AEIOU" else "a"
+        return article(self.name)
 
     @property
     def handle_file_doc(self):
-        return comment(f"\\file\nThe handle of {self.cpp['file']}.")
+        subject = self.cpp.get("file", f"{self.article} `{self.name}`")
+        return comment(f"\\file\nThe handle of {subject}.")
 
     @property
     def handle_doc(self):
@@ -336,8 +396,7 @@ class Class:
         return comment(
             text + f"The handle is shared: copies refer to the same {noun}; it is false when empty "
             f"or when the {noun} was destroyed.\n\n"
-            "Threads: handles may be copied and dropped anywhere. What belongs to the registry may "
-            "be read on any thread; all else happens on the thread that uses the model.")
+            f"Threads: {self.package.thread_rule}")
 
     @property
     def cast_doc(self):
@@ -361,38 +420,50 @@ class Class:
 
     @property
     def handle_includes(self):
-        base = "tarnkiln/kernel/ModelElement.h" if self.base is None else self.header(self.superclass)
-        return sorted([base, "tarnkiln/Export.h", "tarnkiln/meta/Fwd.h"])
+        base = "tarnkiln/kernel/ModelElement.h" if self.base is None else self.base.handle_header
+        return sorted([base, *self.package.common_headers])
 
     def header(self, name):
         return f"{self.package.include}/{name}.h"
 
     @property
+    def handle_header(self):
+        return self.header(self.name)
+
+    @property
+    def impl_header(self):
+        return self.header(f"{self.name}Impl")
+
+    @property
     def impl_includes(self):
-        headers = {self.header(self.name), "tarnkiln/support/Dispatch.h"}
+        headers = {self.handle_header, "tarnkiln/support/Dispatch.h"}
         if self.base:
-            headers.add(self.header(self.superclass + "Impl"))
+            headers.add(self.base.impl_header)
         for prop in self.properties:
             if prop.target and prop.cpp.get("getter") != "none":
-                headers.add(self.header(prop.target.name))
+                headers.add(prop.target.handle_header)
             if prop.stored and prop.many:
                 headers.add(prop.collection_header)
-        headers |= {h for h in self.cpp.get("includes", []) if not h.startswith("<")}
-        return sorted(headers)
+        return sorted(h for h in headers | self.value_headers if not h.startswith("<"))
 
     @property
     def impl_system_includes(self):
-        headers = {h for h in self.cpp.get("includes", []) if h.startswith("<")}
+        headers = set()
         for prop in self.stored:
-            if not prop.is_element and "include" in prop.value:
-                headers.add(prop.value["include"])
             if prop.kind == "optional":
                 headers.add("<boost/optional.hpp>")
             if prop.many:
                 headers.add("<memory>")
-        boost = sorted(h for h in headers if h.startswith("<boost"))
-        standard = sorted(headers - set(boost))
-        return [block for block in (boost, standard) if block]
+        return sorted_blocks({h for h in headers | self.value_headers if h.startswith("<")})
+
+    @property
+    def value_headers(self):
+        """What the plain values of properties need, and what is declared by hand."""
+        headers = set(self.cpp.get("includes", []))
+        for prop in self.stored:
+            if not prop.is_element and "include" in prop.value:
+                headers.add(prop.value["include"])
+        return headers
 
     @property
     def source_includes(self):
@@ -400,22 +471,26 @@ class Class:
                    "tarnkiln/support/Unbuilt.h"}
         for prop in self.stored:
             if prop.target:
-                headers.add(self.header(prop.target.name + "Impl"))
-        if self.rekeyed:
+                headers.add(prop.target.impl_header)
+        for rekeyed in self.rekeyed:
             headers.add("tarnkiln/support/Keyed.h")
-            headers.add(self.rekeyed.collection.collection_header)
-        headers.discard(self.header(self.name + "Impl"))
+            headers.add(rekeyed.collection.collection_header)
+        headers.discard(self.impl_header)
         return sorted(headers)
 
     # C++
 
     @property
     def base_impl(self):
-        return f"{self.superclass}::Impl"
+        return f"{self.base_handle}::Impl"
+
+    @property
+    def base_handle(self):
+        return self.package.handle(self.superclass)
 
     @property
     def class_head(self):
-        return fill(f"class {self.package.export} {self.name}::Impl ",
+        return fill(f"class {self.package.export_word}{self.name}::Impl ",
                     [f": public support::Dispatched<{self.name}::Impl, {self.base_impl}>"], "", 4)
 
     def instantiation(self, word, template, base):
@@ -442,22 +517,3 @@ class Class:
     def accessors(self):
         """The properties that have a getter; derived ones may be written by hand."""
         return [p for p in self.properties if p.stored or "code" in p.cpp]
-
-
-class Package:
-    """All classes of one metamodel."""
-
-    def __init__(self, facts_file, overlay_file):
-        facts, overlay = check.load(facts_file, overlay_file)
-        self.title = facts_file.name
-        self.namespace = overlay["namespace"]
-        self.include = overlay["include"]
-        self.export = overlay["export"]
-        self.types = overlay["types"]
-        self.classes = [Class(entry, overlay["classes"][entry["name"]], self)
-                        for entry in facts["classes"]]
-        self.by_name = {c.name: c for c in self.classes}
-        for cls in self.classes:
-            cls.link()
-        for cls in self.classes:
-            cls.link_keys()

@@ -1,0 +1,116 @@
+"""The enumerations and data types of a metamodel, and the C++ that stands for them."""
+import model
+
+
+class Literal:
+    def __init__(self, facts, cpp, owner):
+        self.facts = facts
+        self.name = facts["name"]
+        self.value = facts["value"]
+        self.enumerator = model.capital(cpp.get("name", self.name))
+        self.doc = model.comment(model.sentence(cpp["doc"]), 4) if cpp.get("doc") else ""
+
+
+class Enumeration:
+    def __init__(self, facts, cpp, package):
+        self.facts = facts
+        self.cpp = cpp
+        self.package = package
+        self.name = facts["name"]
+        self.literals = [Literal(entry, cpp["literals"][entry["name"]], self)
+                         for entry in facts["literals"]]
+
+    @property
+    def header(self):
+        return f"{self.package.include}/{self.name}.h"
+
+    @property
+    def file_doc(self):
+        return model.comment(f"\\file\nThe literals of `{self.name}`.")
+
+    @property
+    def doc(self):
+        brief = self.cpp["brief"] or f"{model.capital(model.article(self.name))} " \
+                                     f"{model.spoken(self.name)}."
+        return model.comment("\n\n".join(part for part in (brief, self.cpp["details"]) if part))
+
+    @property
+    def qualified(self):
+        return f"{self.package.namespace}::{self.name}"
+
+    def literal(self, name):
+        return next(literal for literal in self.literals if literal.name == name)
+
+    @property
+    def carried(self):
+        """Its row in the table of C++ types; a field begins as the literal of number 0."""
+        zeros = [literal for literal in self.literals if literal.value == 0]
+        first = (zeros or self.literals)[0]
+        return {"namespace": self.package.namespace, "name": self.name, "byValue": True,
+                "include": self.header, "literals": {l.name: l.enumerator for l in self.literals},
+                "first": first.enumerator}
+
+
+class Field(model.Property):
+    """A field of a data type: a property that lies in the value and has no slot."""
+
+    @property
+    def kind(self):
+        return "optional" if self.facts["lower"] == 0 else "scalar"
+
+    @property
+    def setter_head(self):
+        return f"    void {self.setter}({self.parameter}) {{ {self.field} = {self.argument}; }}"
+
+
+class DataType:
+    """A class of plain values with fields."""
+
+    def __init__(self, facts, cpp, package):
+        self.facts = facts
+        self.cpp = cpp
+        self.package = package
+        self.name = facts["name"]
+        self.fields = [Field(entry, cpp["properties"][entry["name"]], self)
+                       for entry in facts["properties"]]
+
+    @property
+    def header(self):
+        return f"{self.package.include}/{self.name}.h"
+
+    @property
+    def file_doc(self):
+        return model.comment(f"\\file\nThe values of the data type `{self.name}`.")
+
+    @property
+    def doc(self):
+        brief = self.cpp["brief"] or f"{model.capital(model.article(self.name))} " \
+                                     f"{model.spoken(self.name)}."
+        parts = (brief, self.cpp["details"], "A plain value, copied and compared by its fields.")
+        return model.comment("\n\n".join(part for part in parts if part))
+
+    @property
+    def qualified(self):
+        return f"{self.package.namespace}::{self.name}"
+
+    @property
+    def headers(self):
+        return {field.value["include"] for field in self.fields if "include" in field.value}
+
+    @property
+    def includes(self):
+        return sorted({*self.package.common_headers, "tarnkiln/support/ValueTraits.h"}
+                      | {h for h in self.headers if not h.startswith("<")})
+
+    @property
+    def system_includes(self):
+        headers = {h for h in self.headers if h.startswith("<")}
+        if any(field.kind == "optional" for field in self.fields):
+            headers.add("<boost/optional.hpp>")
+        return model.sorted_blocks(headers)
+
+    @property
+    def carried(self):
+        """Its row in the table of C++ types."""
+        return {"namespace": self.package.namespace, "name": self.name, "byValue": False,
+                "include": self.header}
