@@ -23,3 +23,5 @@ install(FILES
     ${PROJECT_BINARY_DIR}/tarnkilnConfig.cmake
     ${PROJECT_BINARY_DIR}/tarnkilnConfigVersion.cmake
     DESTINATION ${TARNKILN_PACKAGE_DIR})
+install(FILES ${PROJECT_SOURCE_DIR}/tools/gdb/tarnkiln.py
+    DESTINATION ${CMAKE_INSTALL_DATADIR}/tarnkiln/gdb)
