@@ -116,6 +116,13 @@ template <class T> struct Kept<boost::optional<T>> : Kept<T>
 {};
 }  // namespace
 
+template <class T> Value ValueAccess<T>::make(meta::Type const& type, T const& payload)
+{
+    Value value(ValueMeta(Value::started(type)), nullptr);
+    store(value, payload);
+    return value;
+}
+
 template <class T> void ValueAccess<T>::store(Value& value, T const& payload)
 {
     value.m_flags = PlainAccess<T>::FLAGS;

@@ -64,6 +64,8 @@ concept CollectionReference =
 /// How `Value` keeps and reads a `T`; defined and instantiated in `ValueAccess.cpp`.
 template <class T> struct TARNKILN_EXPORT ValueAccess
 {
+    /// A value of `type`, whether or not that is one whose values hold a `T`.
+    static Value make(meta::Type const& type, T const& payload);
     /// Gives a value that holds nothing yet the payload and the shape.
     static void store(Value& value, T const& payload);
     static void check(Value const& value);
