@@ -6,6 +6,7 @@
 #include "tests/support/InvalidationLog.h"
 #include "tests/support/PlainChange.h"
 #include "tests/support/ScriptedListener.h"
+#include "tests/support/TracingConstellationListener.h"
 #include "tests/support/Uuids.h"
 
 #include <gmock/gmock.h>
@@ -16,41 +17,6 @@ using namespace tarn::kiln;
 using namespace testkit;
 using ::testing::ElementsAre;
 using ::testing::IsEmpty;
-
-/// Tells a trace of what it is told.
-class TracingListener : public ConstellationListener
-{
-public:
-    explicit TracingListener(Trace& trace, std::string name = "listener")
-        : m_trace(trace),
-          m_name(std::move(name))
-    {}
-    ~TracingListener() override { m_trace.push_back(m_name + " gone"); }
-
-    void modelAdded(ModelConstellation const& constellation, Model const& model) override
-    {
-        m_trace.push_back(m_name + " added");
-        if (onAdded)
-            onAdded(constellation, model);
-    }
-    void modelDestroyed(ModelConstellation const& constellation, Model const& model) override
-    {
-        m_trace.push_back(m_name + " destroyed");
-        if (onDestroyed)
-            onDestroyed(constellation, model);
-    }
-    void listenerRemoved(ModelConstellation const&) override
-    {
-        m_trace.push_back(m_name + " removed");
-    }
-
-    std::function<void(ModelConstellation const&, Model const&)> onAdded;
-    std::function<void(ModelConstellation const&, Model const&)> onDestroyed;
-
-private:
-    Trace& m_trace;
-    std::string m_name;
-};
 
 ProxyId remoteId(ModelElement const& element, ustring const& uri)
 {
@@ -65,7 +31,6 @@ protected:
 
 using AConstellation = Constellation;
 using AJoiningModel = Constellation;
-using AConstellationListener = Constellation;
 using AGroup = Constellation;
 using TheHistoryOfUris = Constellation;
 using AReferenceAcrossModels = Constellation;
@@ -326,67 +291,6 @@ TEST_F(AJoiningModel, MayBeTheLastThatHeldItsOldConstellation)
     EXPECT_EQ(log.deathsOf(old), 1);
     EXPECT_TRUE(model);
     EXPECT_EQ(model->getModelConstellation(), home);
-}
-
-// ---------------------------------------------------------------------------- listeners
-
-TEST_F(AConstellationListener, IsToldInTheOrderOfAddingAndWhenItGoes)
-{
-    Trace trace;
-    {
-        TracingListener first(trace, "first");
-        TracingListener second(trace, "second");
-        home->addConstellationListener(&first);
-        home->addConstellationListener(&second);
-
-        Model::create(home)->destroy();
-        home->removeConstellationListener(&first);
-        home->removeConstellationListener(&second);
-    }
-
-    EXPECT_THAT(trace,
-                ElementsAre("first added", "second added", "first destroyed", "second destroyed",
-                            "first removed", "second removed", "second gone", "first gone"));
-}
-
-TEST_F(AConstellationListener, IsDeletedIfItIsOwned)
-{
-    Trace trace;
-    auto owned = std::make_unique<TracingListener>(trace);
-    TracingListener* const listener = owned.get();
-    home->addOwnedConstellationListener(std::move(owned));
-
-    home->removeConstellationListener(listener);
-
-    EXPECT_THAT(trace, ElementsAre("listener removed", "listener gone"));
-}
-
-TEST_F(AConstellationListener, IsRemovedOnceForEachTimeItWasAdded)
-{
-    Trace trace;
-    TracingListener listener(trace);
-    home->addConstellationListener(&listener);
-    home->addConstellationListener(&listener);
-
-    home->removeConstellationListener(&listener);
-    Model const model = Model::create(home);
-    home->removeConstellationListener(&listener);
-    home->removeConstellationListener(&listener);
-
-    EXPECT_THAT(trace, ElementsAre("listener removed", "listener added", "listener removed"));
-}
-
-TEST_F(AConstellationListener, IsToldOfTheEndOfItsConstellation)
-{
-    Trace trace;
-    {
-        ModelConstellation const shortLived = ModelConstellation::create();
-        shortLived->addOwnedConstellationListener(std::make_unique<TracingListener>(trace));
-        Model::create(shortLived);
-    }
-
-    EXPECT_THAT(trace, ElementsAre("listener added", "listener destroyed", "listener removed",
-                                   "listener gone"));
 }
 
 // ---------------------------------------------------------------------------- groups

@@ -67,6 +67,37 @@ void ModelConstellation::Impl::removeRef()
         delete this;
 }
 
+/// Keeps the places of listeners for as long as any walk over them is under way.
+class ModelConstellation::Impl::ListenerWalk
+{
+public:
+    explicit ListenerWalk(Impl& constellation)
+        : m_constellation(constellation)
+    {
+        ++m_constellation.m_listenerWalks;
+    }
+    ListenerWalk(ListenerWalk const&) = delete;
+    ListenerWalk& operator=(ListenerWalk const&) = delete;
+    ~ListenerWalk()
+    {
+        if (--m_constellation.m_listenerWalks == 0)
+            std::erase(m_constellation.m_listeners, nullptr);
+    }
+
+private:
+    Impl& m_constellation;
+};
+
+template <class Tell>
+void ModelConstellation::Impl::forEachListener(Tell const& tell)
+{
+    ListenerWalk const walk(*this);
+    for (std::size_t i = 0; i < m_listeners.size(); ++i) {
+        if (m_listeners[i])
+            tell(*m_listeners[i]->getListener());
+    }
+}
+
 // ---------------------------------------------------------------------------- models
 
 bool ModelConstellation::Impl::hasAliveModels()
@@ -120,8 +151,10 @@ void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)
     if (!m_models.emplace(model->getLocationModelId(), model).second)
         reportException(tarnkiln::messages::UniquenessConstraint());
     model->basicSetModelConstellation(this);
-    for (ConstellationListenerHolder const& holder : m_listeners)
-        holder.getListener()->modelAdded(ModelConstellation(this), Model(model));
+    ModelConstellation const self(this);
+    forEachListener([&](ConstellationListener& listener) {
+        listener.modelAdded(self, Model(model));
+    });
     if (m_group && !model->getCurrentTransaction())
         model->doBeginTransaction(m_group.get(), m_group->getOrigin());
     m_uriHistory[model->getModelURI()] = UriRecord{model, ustring()};
@@ -130,8 +163,9 @@ void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)
 void ModelConstellation::Impl::modelIsDestroyed(Model::Impl* model)
 {
     ModelConstellation const self(this);
-    for (ConstellationListenerHolder const& holder : m_listeners)
-        holder.getListener()->modelDestroyed(self, Model(model));
+    forEachListener([&](ConstellationListener& listener) {
+        listener.modelDestroyed(self, Model(model));
+    });
     auto const found = m_models.find(model->getLocationModelId());
     if (found != m_models.end() && found->second == model)
         m_models.erase(found);
@@ -196,22 +230,30 @@ ModelElement ModelConstellation::Impl::resolveProxy(ModelElement const& proxy)
 
 void ModelConstellation::Impl::addConstellationListener(ConstellationListener* listener)
 {
-    m_listeners.emplace_back(listener, this, /*owned=*/false);
+    m_listeners.push_back(
+        std::make_unique<ConstellationListenerHolder>(listener, this, /*owned=*/false));
 }
 
 void ModelConstellation::Impl::addOwnedConstellationListener(
     std::unique_ptr<ConstellationListener> listener)
 {
-    m_listeners.emplace_back(listener.get(), this, /*owned=*/true);
+    m_listeners.reserve(m_listeners.size() + 1);
+    m_listeners.push_back(
+        std::make_unique<ConstellationListenerHolder>(listener.get(), this, /*owned=*/true));
     static_cast<void>(listener.release());
 }
 
 void ModelConstellation::Impl::removeConstellationListener(ConstellationListener* listener)
 {
-    auto const found = std::find_if(
-        m_listeners.begin(), m_listeners.end(),
-        [&](ConstellationListenerHolder const& holder) { return holder.getListener() == listener; });
-    if (found != m_listeners.end())
+    auto const found =
+        std::find_if(m_listeners.begin(), m_listeners.end(), [&](auto const& holder) {
+            return holder && holder->getListener() == listener;
+        });
+    if (found == m_listeners.end())
+        return;
+    // told last, when it is off the list
+    std::unique_ptr<ConstellationListenerHolder> const removed = std::move(*found);
+    if (m_listenerWalks == 0)
         m_listeners.erase(found);
 }
 
@@ -255,6 +297,6 @@ void ModelConstellation::Impl::destroy()
     for (Model const& model : getModels())
         model->destroy();
     invalidate();
-    m_listeners.clear();
+    forEachListener([&](ConstellationListener& listener) { removeConstellationListener(&listener); });
 }
 } // namespace tarn::kiln

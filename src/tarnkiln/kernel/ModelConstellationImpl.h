@@ -6,9 +6,9 @@
 #include "tarnkiln/kernel/ModelConstellation.h"
 #include "tarnkiln/kernel/ModelElement.h"
 
-#include <list>
 #include <map>
 #include <memory>
+#include <vector>
 
 namespace tarn::kiln {
 
@@ -95,10 +95,17 @@ private:
         ustring forwardingUri;
     };
 
+    class ListenerWalk;
+
+    /// Calls `tell(listener)` for each; listeners may come and go meanwhile.
+    template <class Tell>
+    void forEachListener(Tell const& tell);
+
     std::map<ustring, Model::Impl*> m_models; ///< By location.
     std::unique_ptr<internal::TransactionGroup> m_group;
     std::map<ustring, UriRecord> m_uriHistory; ///< Where a URI has gone.
-    std::list<ConstellationListenerHolder> m_listeners;
+    std::vector<std::unique_ptr<ConstellationListenerHolder>> m_listeners;
+    int m_listenerWalks = 0; ///< Under way: who is removed meanwhile leaves a null.
 };
 
 inline ModelConstellation::Impl* ModelConstellation::getImpl() const
