@@ -138,6 +138,51 @@ TEST_F(ABuilder, TakesEverythingBackWhenAPartFails)
     occupant->destroy();
 }
 
+/// An element that fails in its constructor, after the one of its base has run.
+class FailingInConstructor : public Plain::Impl
+{
+public:
+    explicit FailingInConstructor(Plain::Builder& builder) : Plain::Impl(builder, UUID{})
+    {
+        Plain const taken(this);  // lets go of before the failure
+        throw std::runtime_error("no");
+    }
+};
+
+class FailingBuilder : public Plain::Builder
+{
+public:
+    using Plain::Builder::Builder;
+
+protected:
+    ModelElement doCreate(bool, UUID const&) override
+    {
+        Orchestrator orchestrator(this);
+        try
+        {
+            return Plain(new FailingInConstructor(*this));
+        }
+        catch (std::runtime_error const&)
+        {
+            EXPECT_EQ(orchestrator.getCreatedElement(this).getImpl(), nullptr);
+            throw;
+        }
+    }
+};
+
+TEST_F(ABuilder, ForgetsAnElementWhoseConstructorFails)
+{
+    ExpectNoLeakedElements const noLeaks;
+    FailingBuilder builder(model);
+    Plain::Builder outer(model);
+    Orchestrator orchestrator(&outer);
+
+    EXPECT_THROW(builder.create(), std::runtime_error);
+
+    EXPECT_EQ(builder.getOrchestrator(), nullptr);
+    EXPECT_EQ(model->getElementCount(), 0u);
+}
+
 TEST_F(ABuilder, DoomsTheOuterTransactionWhenItFails)
 {
     Plain const occupant = Plain::create(model, uuidOf(1));

@@ -410,6 +410,60 @@ TEST(ADeadElement, OutlivesItsModel)
     child = Plain();
 }
 
+TEST(ADeadElement, HasNoModelOnceThatIsGone)
+{
+    ExpectNoLeakedElements const noLeaks;
+    Plain destroyed, undone, left;
+    {
+        Model const model = Model::create(ModelConstellation());
+        left = Plain::create(model);
+        destroyed = Plain::create(model);
+        destroyed->destroy();
+        Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+        undone = Plain::create(model);
+        transaction.rollBack();
+
+        EXPECT_EQ(destroyed->getModel(), model);
+        EXPECT_EQ(undone->getModel(), model);
+    }
+
+    for (Plain const& dead : {destroyed, undone, left})
+    {
+        EXPECT_EQ(dead->getModel().getImpl(), nullptr);
+        EXPECT_EQ(dead->getModelImpl(), nullptr);
+        EXPECT_FALSE(dead->isProxy());
+        EXPECT_EQ(dead->getProxyIdImpl(), nullptr);
+        EXPECT_FALSE(dead->getPersistentProxyId(/*omitModel=*/false).getModelId());
+        dead->destroy();
+    }
+}
+
+TEST(ADeadElement, HasADestroyedModelForAsLongAsThatIsHeld)
+{
+    Model const model = Model::create(ModelConstellation());
+    Plain const element = Plain::create(model);
+
+    model->destroy();
+
+    EXPECT_EQ(element->getModelImpl(), model.getImpl());
+}
+
+TEST(AnElementThatCameBack, DiesAndComesBackAgain)
+{
+    ExpectNoLeakedElements const noLeaks;
+    Model const model = Model::create(ModelConstellation());
+    Plain const element = Plain::create(model);
+    for (int round = 0; round < 3; ++round)
+    {
+        Transaction const transaction = model->beginTransaction(/*revertible=*/true);
+        element->destroy();
+        transaction.rollBack();
+
+        EXPECT_TRUE(element);
+        EXPECT_EQ(element->getModel(), model);
+    }
+}
+
 TEST(RolledBackCreations, LeaveNothingBehindInAThousandRounds)
 {
     ExpectNoLeakedElements const noLeaks;

@@ -272,4 +272,33 @@ TEST_F(RecordOrder, FailingInTheMiddleLeavesTheElementAsItWas)
     EXPECT_EQ(0, a->getCount());
     EXPECT_EQ(TransactionResult::NotCompleted, transaction.rollBack()) << "nothing was recorded";
 }
+
+TEST_F(RecordOrder, FailingAtTheOtherEndIsLeftToTheRollbackOfTheOpenTransaction)
+{
+    Node const a = make("a"), b = make("b");
+    Transaction const transaction = model->beginTransaction(true);
+    when(b, Node::Impl::BACKLINKS, [] { throw std::runtime_error("no room"); });
+
+    EXPECT_THROW(a->getLinks().push_back(b), std::runtime_error);
+
+    EXPECT_FALSE(transaction.isRollBackOnly());
+    EXPECT_EQ(TransactionResult::RolledBack, transaction.rollBack());
+    EXPECT_TRUE(a->getLinks().empty());
+    EXPECT_THAT(model->checkInvariants(), IsEmpty());
+}
+
+TEST_F(RecordOrder, FailingAtThisEndLeavesTheTransactionUsable)
+{
+    Node const a = make("a"), b = make("b");
+    Transaction const transaction = model->beginTransaction(true);
+    when(a, Node::Impl::LINKS, [] { throw std::runtime_error("no room"); });
+
+    EXPECT_THROW(a->getLinks().push_back(b), std::runtime_error);
+
+    EXPECT_FALSE(transaction.isRollBackOnly());
+    when(a, Node::Impl::LINKS, [] {});
+    a->getLinks().push_back(b);
+    EXPECT_EQ(TransactionResult::Committed, transaction.commit());
+    EXPECT_THAT(b->getBacklinks().getAllValues(), ElementsAre(a));
+}
 }  // namespace

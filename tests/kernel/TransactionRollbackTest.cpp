@@ -618,6 +618,70 @@ TEST_F(TransactionRollback, OfTheLastPropertyLeavesTheContainerAlone)
     EXPECT_EQ(parent, special->getParent());
 }
 
+// ---------------------------------------------------------------------------- doomed transactions
+
+TEST_F(TransactionRollback, ThatCannotBeAvoidedComesBehindEachChangeOfSeveralSteps)
+{
+    Node const p = make(u"p"), q = make(u"q"), x = make(u"x"), y = make(u"y");
+    p->getGrouped().insert(x);
+    p->getByName().insert(y);
+    p->getLinks().push_back(x);
+    std::function<void()> const changes[] = {
+        [&] { x->setName(u"new"); },       [&] { y->setName(u"new"); },
+        [&] { q->setBody(y); },            [&] { x->setParent(p); },
+        [&] { p->getByName().destroyAllContents(); },
+        [&] { p->destroy(); },             [&] { model->destroyAllContents(); },
+    };
+    for (std::function<void()> const& change : changes)
+    {
+        Transaction const outer = begin();
+        begin();  // dropped at once
+        ASSERT_TRUE(outer.isRollBackOnly());
+
+        change();
+        outer.commit();
+
+        EXPECT_EQ(nullptr, model->getCurrentTransaction());
+        EXPECT_THAT(model->checkInvariants(), IsEmpty());
+        EXPECT_EQ(u"x", x->getName());
+        EXPECT_THAT(membersOf(p->getGrouped()), ElementsAre(x));
+        EXPECT_EQ(y, p->getByName().find(u"y"));
+        EXPECT_EQ(p, y->container());
+        EXPECT_FALSE(q->hasBody());
+        EXPECT_TRUE(isAtTop(x));
+    }
+}
+
+TEST_F(TransactionRollback, ThatCannotBeAvoidedComesAtOnceBehindTheChangeOfASetter)
+{
+    Node const x = make(u"x");
+    Transaction const outer = begin();
+    begin();  // dropped at once
+
+    x->setName(u"new");
+
+    EXPECT_EQ(nullptr, model->getCurrentTransaction());
+    EXPECT_EQ(u"x", x->getName());
+    EXPECT_EQ(TransactionResult::NotCompleted, outer.commit());
+}
+
+TEST_F(TransactionRollback, ThatCannotBeAvoidedComesBehindAChangeInAnotherModelOfTheGroup)
+{
+    Model const other = Model::create(model->getModelConstellation());
+    Transaction const outer = begin();
+    Node const inOther = Node::create(other), target = Node::create(other);
+    other->beginTransaction(true);  // dropped at once
+    Node const a = make(), b = make();
+    ASSERT_FALSE(outer.isRollBackOnly()) << "only the model of the dropped handle says so";
+
+    a->getChildren().push_back(b);
+    inOther->getLinks().push_back(target);
+
+    EXPECT_EQ(TransactionResult::RolledBack, outer.commit());
+    EXPECT_EQ(0u, model->getElementCount());
+    EXPECT_EQ(0u, other->getElementCount());
+}
+
 // ---------------------------------------------------------------------------- afterwards
 
 TEST_F(TransactionRollback, LeavesTheModelReadyForTheNextTransaction)

@@ -26,17 +26,30 @@ void AbstractOwnedCollection::modifying()
         m_owner->notifyModifying(m_feature.index());
 }
 
-AbstractOwnedCollection::Operation::Operation(AbstractOwnedCollection& collection)
+namespace {
+
+Model::Impl* modelOf(ModelElement::Impl const* owner)
 {
-    Model::Impl* const model = collection.m_owner ? collection.m_owner->getModelImpl() : nullptr;
-    if (model && !model->getCurrentTransaction())
-        m_transaction = model->beginTransaction(/*revertible=*/false);
+    return owner ? owner->getModelImpl() : nullptr;
 }
+
+Transaction beginUnlessOpen(Model::Impl* model)
+{
+    return model && !model->getCurrentTransaction() ? model->beginTransaction(/*revertible=*/false)
+                                                    : Transaction();
+}
+}  // namespace
+
+AbstractOwnedCollection::Operation::Operation(AbstractOwnedCollection& collection)
+    : m_transaction(beginUnlessOpen(modelOf(collection.m_owner))),
+      m_step(modelOf(collection.m_owner))
+{}
 
 AbstractOwnedCollection::Operation::~Operation() = default;
 
 TransactionResult AbstractOwnedCollection::Operation::commit()
 {
+    m_step.close();
     return m_transaction ? m_transaction.commit() : TransactionResult::NotCompleted;
 }
 }  // namespace tarn::kiln

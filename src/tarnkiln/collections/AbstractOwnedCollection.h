@@ -8,6 +8,7 @@
 #include "tarnkiln/kernel/Transaction.h"
 #include "tarnkiln/meta/Fwd.h"
 #include "tarnkiln/meta/Property.h"
+#include "tarnkiln/support/OpenStep.h"
 
 namespace tarn::kiln {
 
@@ -95,5 +96,6 @@ public:
 
 private:
     Transaction m_transaction;  ///< Empty unless opened here.
+    support::OpenStep m_step;
 };
 }  // namespace tarn::kiln

@@ -5,6 +5,7 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/services/datasource/DataSource.h"
+#include "tarnkiln/support/OpenStep.h"
 
 #include <utility>
 #include <vector>
@@ -238,7 +239,9 @@ void ModelElement::Impl::destroy()
     Transaction const transaction = model->beginTransaction(/*revertible=*/false);
     if (model->getDataSource())
         model->getDataSource()->loadElementSubtree(keep);
+    support::OpenStep step(model.getImpl());
     destroyRecursively(/*keepIncoming=*/false, /*removeFromContainer=*/true, multiModel);
+    step.close();
     transaction.commit();
 }
 

@@ -9,7 +9,16 @@
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 
+#include <utility>
+
 namespace tarn::kiln {
+
+namespace {
+
+/// The last made of those of this thread, which is linked to the one before it.
+thread_local constinit ModelElement::Builder::Orchestrator* orchestrators = nullptr;
+
+} // namespace
 
 ModelElement::Impl::Impl(Builder& builder, UUID const& id)
     : Impl(builder.getModel(), id)
@@ -68,15 +77,32 @@ ModelElement ModelElement::Builder::createProxy(ProxyId const& id)
 ModelElement::Builder::Orchestrator::Orchestrator(Builder* builder)
     : m_model(builder->getModel())
     , m_transaction(m_model->beginTransaction(/*revertible=*/true))
+    , m_step(m_model.getImpl())
 {
     if (m_model->isFrozen())
         reportException(tarnkiln::messages::ModelFrozen());
     addBuilder(builder);
+    m_next = std::exchange(orchestrators, this);
 }
 
 ModelElement::Builder::Orchestrator::~Orchestrator()
 {
     releaseBuilders();
+    Orchestrator** link = &orchestrators;
+    while (*link != this)
+        link = &(*link)->m_next;
+    *link = m_next;
+}
+
+void ModelElement::Builder::Orchestrator::constructionFailed(
+    ModelElement::Impl const* element)
+{
+    for (Orchestrator* each = orchestrators; each; each = each->m_next) {
+        for (auto& [builder, created] : each->m_created) {
+            if (created.getImpl() == element)
+                created = ModelElement();
+        }
+    }
 }
 
 void ModelElement::Builder::Orchestrator::addBuilder(Builder* builder)
@@ -108,6 +134,7 @@ ModelElement ModelElement::Builder::Orchestrator::getCreatedElement(Builder* bui
 
 void ModelElement::Builder::Orchestrator::commit()
 {
+    m_step.close();
     m_transaction.commit();
     releaseBuilders();
 }

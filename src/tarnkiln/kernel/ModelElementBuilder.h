@@ -3,6 +3,7 @@
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/support/OpenStep.h"
 #include "tarnkiln/support/SlotSet.h"
 
 #include <map>
@@ -81,11 +82,17 @@ public:
     /// Commits and lets go of all builders.
     void commit();
 
+    /// Tells this thread's orchestrators that an element that one of them was told of dies, because
+    /// the constructor of a derived class has failed.
+    static void constructionFailed(ModelElement::Impl const* element);
+
 private:
     void releaseBuilders();
 
     Model m_model;
     Transaction m_transaction;
+    support::OpenStep m_step;
     std::map<Builder*, ModelElement> m_created;
+    Orchestrator* m_next = nullptr; ///< Of those of this thread.
 };
 } // namespace tarn::kiln

@@ -3,6 +3,7 @@
 #include "tarnkiln/collections/ReferenceCollection.h"
 #include "tarnkiln/kernel/Changes.h"
 #include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/ModelElementBuilder.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
@@ -10,6 +11,10 @@
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/services/datasource/DataSource.h"
+
+#include "sill/i18n/StringConversion.h"
+
+#include <boost/uuid/uuid_io.hpp>
 
 namespace tarn::kiln {
 
@@ -40,25 +45,48 @@ ModelElement::Impl::Impl(Model const& model, UUID const& id)
 
 ModelElement::Impl::~Impl()
 {
-    m_refCount = REFCOUNT_DELETING;
+    bool const isHeld = m_refCount.exchange(REFCOUNT_DELETING) != 0;
+    if (isHeld) // by an orchestrator: the constructor of a derived class has failed
+        Builder::Orchestrator::constructionFailed(this);
     if (isProxy()) {
         if (m_model)
             m_model->m_proxies.erase(this);
+        delete m_proxyId;
     }
     else if (static_cast<signed char>(m_validity) > 0) {
         m_model->remove(this);
     }
     unpinContainer();
+    unanchor();
 }
 
 Model ModelElement::Impl::getModel() const
 {
-    return Model(m_model);
+    return Model(getModelImpl());
+}
+
+void ModelElement::Impl::anchor()
+{
+    if (m_aside != Aside::Nothing || !m_model)
+        return;
+    m_anchor = m_model->m_anchor.get();
+    m_anchor->addRef();
+    m_aside = Aside::Anchor;
+}
+
+void ModelElement::Impl::unanchor()
+{
+    if (m_aside != Aside::Anchor)
+        return;
+    m_aside = Aside::Nothing;
+    m_anchor->removeRef();
+    m_anchor = nullptr;
 }
 
 void ModelElement::Impl::invalidate()
 {
     pinContainer();
+    anchor();
     ElementImpl::invalidate();
 }
 
@@ -196,19 +224,25 @@ void ModelElement::Impl::notifyCreated()
 
 boost::optional<ProxyId> ModelElement::Impl::getProxyId() const
 {
-    return m_proxyId ? boost::optional<ProxyId>(*m_proxyId) : boost::none;
+    return isProxy() ? boost::optional<ProxyId>(*m_proxyId) : boost::none;
 }
 
 ProxyId ModelElement::Impl::getPersistentProxyId(bool omitModel) const
 {
-    return m_proxyId ? *m_proxyId : m_model->getPersistentProxyId(this, omitModel);
+    if (isProxy())
+        return *m_proxyId;
+    Model::Impl const* const model = getModelImpl();
+    return model ? model->getPersistentProxyId(this, omitModel)
+                 : ProxyId(ElementId::UUID_TYPE,
+                           sill::i18n::to_ustring(boost::uuids::to_string(getUuid())));
 }
 
 void ModelElement::Impl::_becomeProxy(ProxyId const& id, ElementValidity validity)
 {
     auto proxyId = std::make_unique<ProxyId>(id);
     m_model->m_proxies.insert(this);
-    m_proxyId = std::move(proxyId);
+    m_proxyId = proxyId.release();
+    m_aside = Aside::ProxyId;
     m_validity = validity;
 }
 
@@ -300,7 +334,8 @@ void ModelElement::Impl::_basicCopyValues(ReferenceCollection* target,
 
 void ModelElement::Impl::_loadCollectionContents(ReferenceCollection* collection) const
 {
-    if (m_model && m_model->getDataSource())
-        m_model->getDataSource()->loadCollectionContents(collection);
+    Model::Impl const* const model = getModelImpl();
+    if (model && model->getDataSource())
+        model->getDataSource()->loadCollectionContents(collection);
 }
 } // namespace tarn::kiln

@@ -7,6 +7,7 @@
 #include "tarnkiln/kernel/ModelElement.h"
 #include "tarnkiln/kernel/ProxyId.h"
 #include "tarnkiln/kernel/ReflectionPrivateTag.h"
+#include "tarnkiln/support/ModelAnchor.h"
 
 #include <boost/optional.hpp>
 
@@ -178,9 +179,9 @@ public:
 
     /// \name Proxies
     /// @{
-    bool isProxy() const { return m_proxyId != nullptr; }
+    bool isProxy() const { return m_aside == Aside::ProxyId; }
     boost::optional<ProxyId> getProxyId() const;
-    ProxyId const* getProxyIdImpl() const { return m_proxyId.get(); }
+    ProxyId const* getProxyIdImpl() const { return isProxy() ? m_proxyId : nullptr; }
     /// The id by which a proxy would name this element; a proxy's own id.
     ProxyId getPersistentProxyId(bool omitModel) const;
     ProxyId _getPersistentProxyId() const { return getPersistentProxyId(/*omitModel=*/false); }
@@ -216,8 +217,11 @@ public:
     void _loadCollectionContents(ReferenceCollection* collection) const;
     /// @}
 
-    /// The model; null for a proxy whose model is gone.
-    Model::Impl* getModelImpl() const { return m_model; }
+    /// The model; null for a proxy or a dead element whose model is gone.
+    Model::Impl* getModelImpl() const
+    {
+        return m_aside == Aside::Anchor ? m_anchor->getModel() : m_model;
+    }
 
 protected:
     /// Tells the invalidate callback, if there is one, that `collection` dies with this element.
@@ -233,14 +237,29 @@ private:
     void storeLink(Impl* container, Feature const& feature);
     void pinContainer();
     void unpinContainer();
+    void anchor();
+    void unanchor();
     static constexpr std::uint32_t NOT_TOP_LEVEL = ~std::uint32_t{0};
 
+    /// What `m_proxyId` and `m_anchor` share their place for.
+    enum class Aside : unsigned char
+    {
+        Nothing,
+        ProxyId, ///< Of a proxy, dead or not.
+        Anchor   ///< Of any other dead element.
+    };
+
     bool m_containerPinned = false; ///< A dead element keeps its container in memory.
+    Aside m_aside = Aside::Nothing;
     std::uint32_t m_topLevelIndex = NOT_TOP_LEVEL;
     Impl* m_container = nullptr;
     Feature m_containmentFeature; ///< The container's; null for a top-level element.
-    Model::Impl* m_model;
-    std::unique_ptr<ProxyId> m_proxyId; ///< Not null exactly for a proxy.
+    Model::Impl* m_model; ///< Not to be followed in a dead element, which has an anchor.
+    union
+    {
+        tarn::kiln::ProxyId* m_proxyId = nullptr; ///< Owned.
+        support::ModelAnchor* m_anchor;           ///< Counted.
+    };
 };
 
 inline ModelElement::ModelElement(Impl* impl)

@@ -14,6 +14,7 @@
 #include "tarnkiln/services/ElementIdResolver.h"
 #include "tarnkiln/services/ModelIdNormalizer.h"
 #include "tarnkiln/services/datasource/DataSource.h"
+#include "tarnkiln/support/OpenStep.h"
 
 #include "sill/i18n/StringConversion.h"
 
@@ -32,6 +33,7 @@ std::atomic<unsigned long> modelsCreated{0};
 Model::Impl::Impl(UUID const& id, ModelConstellation const& constellation)
     : ElementImpl(id, ElementValidity::Valid)
     , m_modelCounter(++modelsCreated)
+    , m_anchor(new support::ModelAnchor(this))
     , m_usageProvider(std::make_unique<DefaultModelUsageProvider>())
     , m_transactionFactory(std::make_unique<internal::LocalTransactionFactoryImpl>(*this))
 {
@@ -45,6 +47,7 @@ Model::Impl::~Impl()
 {
     m_refCount = REFCOUNT_DELETING;
     destroy();
+    m_anchor.get()->modelIsGone();
 }
 
 Model Model::Impl::getModel() const
@@ -169,8 +172,11 @@ void Model::Impl::remove(ModelElement::Impl* element)
 
 void Model::Impl::resurrectElement(ModelElement::Impl* element)
 {
+    if (m_elements.contains(element))
+        return; // its destruction failed before it began
     element->m_validity = ElementValidity::Valid;
     element->unpinContainer();
+    element->unanchor();
     m_elements.insertReturning(element);
     if (element->isTopLevel())
         m_topLevelElements.insertReturning(element);
@@ -381,9 +387,11 @@ void Model::Impl::destroyElements(bool multiModel)
 void Model::Impl::destroyAllContents()
 {
     Transaction const transaction = beginTransaction(/*revertible=*/false);
+    support::OpenStep step(this);
     destroyElements(isMultiModel());
     allElementsDestroying();
     m_topLevelElements.clear();
+    step.close();
     transaction.commit();
 }
 

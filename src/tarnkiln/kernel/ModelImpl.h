@@ -6,7 +6,9 @@
 #include "tarnkiln/kernel/ModelConstellation.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/support/CountedPointer.h"
 #include "tarnkiln/support/ElementRegistry.h"
+#include "tarnkiln/support/ModelAnchor.h"
 #include "tarnkiln/support/TopLevelElements.h"
 #include "tarnkiln/meta/TransactionOrigin.h"
 
@@ -86,6 +88,10 @@ public:
     AbstractTransactionFactoryImpl& getDefaultTransactionFactory() const;
     /// Lets another party begin this model's transactions; null restores the default.
     void setTransactionFactory(std::unique_ptr<AbstractTransactionFactoryImpl> factory);
+    /// Between these a rollback that can't be avoided waits (OpenStep.h).
+    void openStep() { ++m_openSteps; }
+    void closeStep() { --m_openSteps; }
+    bool isInStep() const { return m_openSteps != 0; }
     /// Makes the next default transaction ask the listeners again whether it must be deep.
     void resetTransactionDepth() { m_transactionDepth = 0; }
     /// @}
@@ -249,6 +255,8 @@ private:
     std::atomic<int> m_freezeCount{0};
     unsigned int m_dataSourceLoadCount = 0;
     unsigned int m_parseCount = 0;
+    unsigned int m_openSteps = 0;
+    support::CountedPointer<support::ModelAnchor> const m_anchor; ///< For dead elements.
     unsigned long m_endedTransactions = 0;
     std::unordered_set<ExtensionListener*> m_extensionListeners;
     std::unique_ptr<meta::DataModelUsageProvider> m_usageProvider;

@@ -166,7 +166,8 @@ Collection& shownCollection(Owner const& owner, LazyCollection<Collection>& fiel
     };
     if constexpr (keepsProxiesAside)
     {
-        if (!owner.getModelImpl()->isParsing())
+        Model::Impl* const model = owner.getModelImpl();
+        if (model && !model->isParsing())
             collection.resolveAll();
     }
     return collection;

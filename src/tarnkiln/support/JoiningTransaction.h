@@ -3,6 +3,7 @@
 #pragma once
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/support/OpenStep.h"
 
 namespace tarn::kiln::support {
 
@@ -13,12 +14,18 @@ class JoiningTransaction
 {
 public:
     explicit JoiningTransaction(ModelElement::Impl const& element)
-        : m_transaction(element.getModelImpl()->beginTransaction(/*revertible=*/false))
+        : m_transaction(element.getModelImpl()->beginTransaction(/*revertible=*/false)),
+          m_step(element.getModelImpl())
     {}
 
-    void commit() { m_transaction.commit(); }
+    void commit()
+    {
+        m_step.close();
+        m_transaction.commit();
+    }
 
 private:
     Transaction m_transaction;
+    OpenStep m_step;
 };
 }  // namespace tarn::kiln::support

@@ -56,12 +56,11 @@ public:
         std::uint32_t const index = element->m_topLevelIndex;
         return index < m_elements.size() && m_elements[index].getImpl() == element;
     }
+    /// Drops all handles, and keeps the room for those that may come back.
     void clear()
     {
-        for (ModelElement const& element : m_elements)
-            element->m_topLevelIndex = ModelElement::Impl::NOT_TOP_LEVEL;
-        std::vector<ModelElement> const dropped = std::move(m_elements);
-        m_elements.clear();
+        while (!m_elements.empty())
+            erase(m_elements.back().getImpl());
     }
     std::vector<ModelElement> const& all() const { return m_elements; }
     std::size_t size() const { return m_elements.size(); }

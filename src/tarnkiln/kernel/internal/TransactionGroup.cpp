@@ -83,11 +83,17 @@ bool TransactionGroup::anyRollBackOnly() const
                        [](TransactionImpl const* member) { return member->isRollBackOnly(); });
 }
 
+bool TransactionGroup::anyInStep() const
+{
+    return std::any_of(m_members.begin(), m_members.end(),
+                       [](TransactionImpl const* member) { return member->isInStep(); });
+}
+
 TransactionResult TransactionGroup::tryCommit(boost::optional<Value> const& message)
 {
     if (m_ending)
         return TransactionResult::NotCompleted;
-    if (anyRollBackOnly())
+    if (anyRollBackOnly() && !anyInStep())
         return rollBack();
     return commitIfComplete(message);
 }

@@ -47,6 +47,7 @@ private:
 
     bool allReady() const;
     bool anyRollBackOnly() const;
+    bool anyInStep() const;
     TransactionResult finishCommit(boost::optional<Value> const& message);
     bool prepareAll(boost::optional<Value> const& message);
     bool validateAll(boost::optional<Value> const& message);

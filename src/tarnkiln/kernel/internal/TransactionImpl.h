@@ -95,6 +95,7 @@ public:
     bool hasEnded() const { return has(ENDED); }
     bool isDeep() const { return has(DEEP); }
     bool isRolledBack() const { return has(ROLLED_BACK); }
+    bool isInStep() const { return m_model->isInStep(); }
     bool isProhibited() const { return has(CHANGES_PROHIBITED); }
     TransactionGroup* getGroup() const { return m_group; }
     TransactionImpl* getPreviousTelling() const { return m_previousTelling; }
