@@ -340,6 +340,7 @@ class Class:
         self.properties = [Property(entry, cpp["properties"][entry["name"]], self)
                            for entry in facts["properties"]]
         self.declarations = cpp.get("declarations", [])
+        self.unmodelled_fields = cpp.get("fields", [])
 
     def link(self):
         for prop in self.properties:
@@ -508,6 +509,10 @@ class Class:
     @property
     def fields(self):
         return [p for p in self.stored if p.kind != "container"]
+
+    @property
+    def has_fields(self):
+        return bool(self.fields or self.unmodelled_fields)
 
     @property
     def collections(self):

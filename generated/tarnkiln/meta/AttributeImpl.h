@@ -4,6 +4,7 @@
 #pragma once
 #include "tarnkiln/meta/Attribute.h"
 #include "tarnkiln/meta/AttributeMap.h"
+#include "tarnkiln/meta/Type.h"
 #include "tarnkiln/support/Dispatch.h"
 
 namespace tarn::kiln::meta {
@@ -41,6 +42,9 @@ public:
     /// Whether there is one and it is live.
     bool hasOwner() const;
     void setOwner(AttributeMap const& owner);
+
+    /// The type of the value.
+    virtual Type getType() const = 0;
 
 private:
     ustring m_key;

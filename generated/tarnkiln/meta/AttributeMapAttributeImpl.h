@@ -37,6 +37,7 @@ public:
     /// Whether there is one and it is live.
     bool hasValue() const;
     void setValue(AttributeMap const& value);
+    Type getType() const override;
 
 private:
     mutable support::CountedPointer<AttributeMap::Impl> m_value;

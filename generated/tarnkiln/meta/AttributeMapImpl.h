@@ -8,6 +8,7 @@
 #include "tarnkiln/support/Dispatch.h"
 
 #include <memory>
+#include <vector>
 
 namespace tarn::kiln::meta {
 
@@ -39,6 +40,43 @@ public:
     ElementMap<ustring, Attribute>& getAttributes() const;
     /// Whether the collection was made, as its getter does.
     bool hasAttributes() const { return m_attributes.get(); }
+
+    /// Takes in `attribute`, which may come from another map; null and destroyed ones are ignored.
+    /// \throws tarnkiln::messages::UniquenessConstraint  if another one has its key.
+    virtual void insert(Attribute const& attribute);
+
+    /// The same, and destroys another one that has its key.
+    virtual void insertOrReplace(Attribute const& attribute);
+
+    /// Makes an attribute and takes it in under `key`: "Real" stands for a `RealAttribute`, and
+    /// what has a dot is the qualified name of a class without its last word, "Attribute". Empty,
+    /// and nothing is made, if no such class can be instantiated.
+    /// \throws tarnkiln::messages::UniquenessConstraint  if the key is taken; then nothing is left
+    /// of the new attribute.
+    virtual Attribute emplace(ustring const& fqn, ustring const& key);
+
+    /// The attribute under `key`; empty if there is none.
+    virtual Attribute at(ustring const& key) const;
+
+    /// The attribute at the end of a path of keys, all but the last of which lead to attributes
+    /// with maps; empty if there is none.
+    virtual Attribute recursiveAt(std::vector<ustring> const& keys) const;
+
+    /// Lets go of an attribute or of a stand-in, which lives on without an owner.
+    virtual void eraseValue(Attribute const& attribute);
+
+    /// Lets go of the attribute under `key`, which lives on without an owner.
+    virtual void erase(ustring const& key);
+
+    /// Destroys an attribute of this map, and no other.
+    virtual void removeValue(Attribute const& attribute);
+
+    /// Destroys the attribute under `key`, if there is one.
+    virtual void remove(ustring const& key);
+
+    /// Follows the keys from `index`, counted from 0, to before `size`. Beyond the last there is
+    /// nothing.
+    virtual Attribute doRecurse(std::vector<ustring> const& keys, int index, int size) const;
 
 private:
     static std::unique_ptr<ElementMap<ustring, Attribute>> makeAttributes(Impl* owner);

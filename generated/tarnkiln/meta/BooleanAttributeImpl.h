@@ -32,6 +32,7 @@ public:
     /// The value.
     bool getValue() const { return m_value; }
     void setValue(bool value);
+    Type getType() const override;
 
 private:
     bool m_value = false;

@@ -34,6 +34,7 @@ public:
     /// The value.
     boost::posix_time::ptime const& getValue() const { return m_value; }
     void setValue(boost::posix_time::ptime const& value);
+    Type getType() const override;
 
 private:
     boost::posix_time::ptime m_value;

@@ -32,6 +32,7 @@ public:
     /// The value.
     int getValue() const { return m_value; }
     void setValue(int value);
+    Type getType() const override;
 
 private:
     int m_value = 0;

@@ -70,6 +70,13 @@ public:
     /// Gives it another name, under which the owner then keeps it.
     void setName(ustring const& name) override;
 
+    /// Gives the operation what calls by reflection run, in place of what it had. Null takes that
+    /// away. Is no change of the model: nothing is announced, recorded or copied.
+    void setInvoker(std::unique_ptr<AbstractMethodInvoker> invoker);
+
+    /// What calls by reflection run; null if there is nothing.
+    std::shared_ptr<AbstractMethodInvoker> const& getInvoker() const { return m_invoker; }
+
 private:
     static std::unique_ptr<ElementSequence<Argument>> makeArguments(Impl* owner);
 
@@ -78,6 +85,7 @@ private:
     bool m_isStatic = false;
     bool m_isPublic = true;
     bool m_isEvent = false;
+    std::shared_ptr<AbstractMethodInvoker> m_invoker;
 
 public:
     using Rows = support::RowList<

@@ -32,6 +32,7 @@ public:
     /// The value.
     double getValue() const { return m_value; }
     void setValue(double value);
+    Type getType() const override;
 
 private:
     double m_value = 0;

@@ -32,6 +32,7 @@ public:
     /// The value.
     ustring const& getValue() const { return m_value; }
     void setValue(ustring const& value);
+    Type getType() const override;
 
 private:
     ustring m_value;

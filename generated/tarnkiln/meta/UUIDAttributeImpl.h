@@ -32,6 +32,7 @@ public:
     /// The value.
     UUID const& getValue() const { return m_value; }
     void setValue(UUID const& value);
+    Type getType() const override;
 
 private:
     UUID m_value{};

@@ -7,6 +7,8 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
+#include "tarnkiln/meta/AbstractMethodInvoker.h"
+#include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/Operation.h"
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
@@ -117,11 +119,20 @@ void ModelElement::Impl::setPropertyValue(meta::Property const& property, Value 
 }
 
 boost::optional<Value> ModelElement::Impl::invoke(meta::Operation const& operation,
-                                                  std::vector<Value> const&,
-                                                  ReflectionPrivateTag const&)
+                                                  std::vector<Value> const& arguments,
+                                                  ReflectionPrivateTag const& tag)
 {
-    reportException(tarnkiln::messages::NoSuchOperation(
-        operation ? operation->getName() : ustring(), internal::qualifiedName(getMetaClass())));
+    // What runs may give the operation another invoker.
+    auto const invoker = operation ? operation->getInvoker() : nullptr;
+    meta::Class const& metaClass = getMetaClass();
+    if (!invoker || !metaClass || !metaClass->isA(operation->getOwningType()) ||
+        (!operation->isPublic() && tag == PUBLIC_ACCESS))
+    {
+        reportException(tarnkiln::messages::NoSuchOperation(
+            operation.getElementImpl() ? operation->getName() : ustring(),
+            internal::qualifiedName(metaClass)));
+    }
+    return invoker->invoke(ModelElement(this), arguments);
 }
 
 ustring ModelElement::Impl::identifier() const

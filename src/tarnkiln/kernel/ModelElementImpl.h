@@ -67,8 +67,13 @@ public:
     virtual void setPropertyValue(meta::Property const& property, Value const& value,
                                   ReflectionPrivateTag const& tag);
     /// @}
-    /// Calls an operation by reflection. Fails with `NoSuchOperation` (operation, class) if the
-    /// operation is not live or has nothing to run.
+    /// Calls an operation by reflection, and gives its result if it has one.
+    ///
+    /// \throws tarnkiln::messages::NoSuchOperation  (operation, qualified class name) if the
+    ///     operation is not live or has nothing to run, if this class has not got it, and if it is
+    ///     not public and `tag` is `PUBLIC_ACCESS`. The name of an empty operation is empty.
+    /// \throws tarnkiln::messages::InvalidValue, CannotCastIncompatibleTypes  if the arguments do
+    ///     not suit. What the operation itself throws passes unchanged.
     virtual boost::optional<Value> invoke(meta::Operation const& operation,
                                           std::vector<Value> const& arguments,
                                           ReflectionPrivateTag const& tag);

@@ -8,6 +8,7 @@
 #include "tarnkiln/kernel/ModelConstellationImpl.h"
 #include "tarnkiln/kernel/ProgressIndicators.h"
 #include "tarnkiln/kernel/ProxyId.h"
+#include "tarnkiln/kernel/internal/DeclaredExtensions.h"
 #include "tarnkiln/kernel/internal/LocalTransactionFactoryImpl.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/meta/Package.h"
@@ -34,6 +35,7 @@ Model::Impl::Impl(UUID const& id, ModelConstellation const& constellation)
     : ElementImpl(id, ElementValidity::Valid)
     , m_modelCounter(++modelsCreated)
     , m_anchor(new support::ModelAnchor(this))
+    , m_extensions(std::make_unique<internal::DeclaredExtensions>())
     , m_usageProvider(std::make_unique<DefaultModelUsageProvider>())
     , m_transactionFactory(std::make_unique<internal::LocalTransactionFactoryImpl>(*this))
 {
@@ -234,16 +236,6 @@ void Model::Impl::removeAllListeners()
         removeListenerFromTransaction(holder.get());
 }
 
-void Model::Impl::addExtensionListener(ExtensionListener* listener)
-{
-    m_extensionListeners.insert(listener);
-}
-
-void Model::Impl::removeExtensionListener(ExtensionListener* listener)
-{
-    m_extensionListeners.erase(listener);
-}
-
 // ---------------------------------------------------------------------------- identity
 
 void Model::Impl::setModelURI(ustring const& uri)
@@ -418,6 +410,7 @@ void Model::Impl::destroy()
     for (ModelElement::Impl* const proxy : m_proxies)
         proxy->m_model = nullptr;
     m_proxies.clear();
+    destroyExtensions();
     if (m_currentTransaction)
         m_currentTransaction->abandon();
     resetDataSource();

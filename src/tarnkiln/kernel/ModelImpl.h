@@ -15,6 +15,7 @@
 #include <boost/optional.hpp>
 
 #include <atomic>
+#include <functional>
 #include <memory>
 #include <unordered_set>
 #include <vector>
@@ -25,6 +26,7 @@ namespace datasource {
 class DataSource;
 }
 namespace internal {
+class DeclaredExtensions;
 class LocalTransactionFactoryImpl;
 }
 
@@ -135,6 +137,51 @@ public:
     {
         return m_listeners;
     }
+    /// @}
+
+    /// \name Extensions
+    /// Properties that this model adds to classes of the registry, for its own elements. They are
+    /// changes of the registry's model: transactions of this model do not take them back. They end
+    /// with `unextendMetaclass` or with this model.
+    /// @{
+    /// Adds a property to `extended` and to the classes below it. Listeners are told after that.
+    ///
+    /// \param defaultValue  what elements have as long as nothing is set; must be there for a single
+    ///     value that is no reference. A single reference is empty at first, whatever is given.
+    /// \throws tarnkiln::messages::CannotCreateWithoutModel  unless `extended` is a live class of
+    ///     the registry.
+    /// \throws tarnkiln::messages::NoSuchType  (type name) if no type has that name.
+    /// \throws tarnkiln::messages::ExtensionMustHaveName
+    /// \throws tarnkiln::messages::ExtensionNameMustBeUnique  if this model has an extension of the
+    ///     name on a class above or below.
+    /// \throws tarnkiln::messages::ExtensionMustHaveDefaultValue
+    /// \throws tarnkiln::messages::InvalidValue, CannotCastIncompatibleTypes  if the default does
+    ///     not suit.
+    /// \throws tarnkiln::messages::CannotInstantiateCollection  (qualified name of the type) if
+    ///     many values were asked for and the type has no collections.
+    /// \throws tarnkiln::messages::NoOpenTransaction  if a transaction of the registry is open; the
+    ///     declaration then belongs to that.
+    void extendMetaclass(meta::Class const& extended, meta::ExtensionPrototype const& prototype,
+                         boost::optional<Value> const& defaultValue);
+    /// Takes away a property that this model added to exactly `extended`. Listeners are told before
+    /// that.
+    ///
+    /// \throws tarnkiln::messages::CannotCreateWithoutModel, NoOpenTransaction  as above.
+    /// \throws tarnkiln::messages::NoSuchExtension  (name, qualified class name)
+    void unextendMetaclass(meta::Class const& extended, ustring const& name);
+    /// The extension of exactly that class; empty if there is none.
+    meta::Extension getDeclaredExtension(meta::Class const& extended, ustring const& name) const;
+    /// The extension of that class, or else of the next class above that has one; empty if there is
+    /// none.
+    meta::Extension getExtension(meta::Class const& metaClass, ustring const& name) const;
+    /// What elements of `metaClass` have as long as nothing is set.
+    ///
+    /// \throws tarnkiln::messages::NoSuchExtension  (name, qualified class name) if there is no such
+    ///     extension, or none with a default.
+    Value getExtensionDefault(meta::Class const& metaClass, ustring const& name) const;
+    /// Tells all listeners that there is a new extension.
+    void notifyExtensionAdded(meta::Extension const& extension);
+    /// Not owned; one that is there is not added again.
     void addExtensionListener(ExtensionListener* listener);
     void removeExtensionListener(ExtensionListener* listener);
     /// @}
@@ -239,6 +286,8 @@ private:
 
     void forgetListener(ListenerHolderBase* holder);
     void removeAllListeners();
+    void tellExtensionListeners(std::function<void(ExtensionListener&)> const& tell);
+    void destroyExtensions();
     void destroyElements(bool multiModel);
     bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
 
@@ -258,6 +307,7 @@ private:
     unsigned int m_openSteps = 0;
     support::CountedPointer<support::ModelAnchor> const m_anchor; ///< For dead elements.
     unsigned long m_endedTransactions = 0;
+    std::unique_ptr<internal::DeclaredExtensions> const m_extensions;
     std::unordered_set<ExtensionListener*> m_extensionListeners;
     std::unique_ptr<meta::DataModelUsageProvider> m_usageProvider;
     std::unique_ptr<AbstractTransactionFactoryImpl> m_transactionFactory;

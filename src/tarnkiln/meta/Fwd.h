@@ -4,6 +4,8 @@
 
 namespace tarn::kiln::meta {
 class AbstractDeferredInvocation;
+class AbstractEvent;
+class AbstractMethodInvoker;
 class Argument;
 class Attribute;
 class AttributeMap;
@@ -36,4 +38,4 @@ class Type;
 class TypedElement;
 class UUIDAttribute;
 enum class Language : int;
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -1,0 +1,227 @@
+/// \file
+/// How a model declares extensions of classes. The values of extensions belong to the elements.
+#include "tarnkiln/collections/AbstractOwnedCollection.h"
+#include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/kernel/ExtensionListener.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/DeclaredExtensions.h"
+#include "tarnkiln/kernel/internal/TypeKind.h"
+#include "tarnkiln/kernel/internal/qualifiedName.h"
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/DynamicExtensionsImpl.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
+#include "tarnkiln/meta/MetaRegistry.h"
+
+#include <memory>
+#include <unordered_set>
+#include <utility>
+
+namespace tarn::kiln {
+
+namespace messages = tarnkiln::messages;
+using internal::DeclaredExtensions;
+using internal::qualifiedName;
+using meta::MetaRegistry;
+
+namespace {
+
+/// Fails unless `extended` is a live class of the registry's model.
+void requireExtensible(meta::Class const& extended, Model const& registryModel)
+{
+    if (!extended || extended->getModelImpl() != registryModel.getImpl())
+        reportException(messages::CannotCreateWithoutModel());
+}
+
+/// Fails if one of `namesakes` extends a class above or below `extended`.
+void requireUnrelated(std::vector<meta::Extension> const& namesakes, meta::Class const& extended)
+{
+    for (meta::Extension const& namesake : namesakes)
+    {
+        meta::Class const other = namesake->getExtendedMetaclass();
+        if (other && (other->isA(extended) || extended->isA(other)))
+            reportException(messages::ExtensionNameMustBeUnique());
+    }
+}
+
+/// Fails unless the registry can make the collections of a many-valued extension.
+void requireCollection(meta::Extension const& extension)
+{
+    std::unique_ptr<AbstractOwnedCollection> const trial(
+        MetaRegistry::getInstance().instantiateDynamicCollection(ModelElement(), extension));
+    if (!trial)
+        reportException(messages::CannotInstantiateCollection(qualifiedName(extension->getType())));
+}
+
+/// What `extended` has from the model with that counter; made if there is nothing.
+meta::DynamicExtensions requireGroup(meta::Class const& extended, unsigned long modelCounter)
+{
+    if (auto const present = extended->getExtensions().find(modelCounter))
+        return present;
+    auto const group = meta::DynamicExtensions::create(extended->getModel());
+    group->setModelID(modelCounter);
+    group->setOwningClass(extended);
+    return group;
+}
+
+meta::Extension makeExtension(meta::DynamicExtensions const& owner, meta::Type const& type,
+                              meta::ExtensionPrototype const& prototype)
+{
+    auto const extension = meta::Extension::create(owner->getModel());
+    extension->setName(prototype.getName());
+    extension->setType(type);
+    extension->setOwner(owner);
+    extension->setLower(prototype.getLower());
+    extension->setUpper(prototype.getUpper());
+    extension->setIsUnique(prototype.isUnique());
+    extension->setIsOrdered(prototype.isOrdered());
+    extension->setIsPublicAccessor(true);
+    extension->setIsPublicMutator(true);
+    return extension;
+}
+
+void requireCommit(Transaction const& transaction)
+{
+    if (transaction.commit() != TransactionResult::Committed)
+        reportException(messages::NoOpenTransaction());
+}
+}  // namespace
+
+void Model::Impl::extendMetaclass(meta::Class const& extended,
+                                  meta::ExtensionPrototype const& prototype,
+                                  boost::optional<Value> const& defaultValue)
+{
+    MetaRegistry& registry = MetaRegistry::getInstance();
+    MetaRegistry::LockedModel const locked(registry);
+    requireExtensible(extended, locked.getModel());
+    meta::Type const type = registry.getType(prototype.getTypeName());
+    if (!type)
+        reportException(messages::NoSuchType(prototype.getTypeName()));
+    bool const isSingle = prototype.getUpper() == 1;
+    bool const isReference = internal::classImpl(type) != nullptr;
+    ustring const name = prototype.getName();
+    if (name.empty())
+        reportException(messages::ExtensionMustHaveName());
+    requireUnrelated(m_extensions->named(name), extended);
+    if (isSingle && !isReference && !defaultValue)
+        reportException(messages::ExtensionMustHaveDefaultValue());
+
+    Transaction const transaction = locked.getModel()->beginTransaction(/*revertible=*/true);
+    meta::Extension const extension =
+        makeExtension(requireGroup(extended, m_modelCounter), type, prototype);
+    if (defaultValue)
+        defaultValue->checkCompatibleWithProperty(extension);
+    if (!isSingle)
+        requireCollection(extension);
+    requireCommit(transaction);
+
+    // A reference is never stored as a default: it could keep an element of another model.
+    bool const isEmptyByDefault = isSingle && isReference;
+    m_extensions->add(
+        name, {extension, isEmptyByDefault ? Value::createEmptyValue(type, true) : defaultValue});
+    notifyExtensionAdded(extension);
+}
+
+void Model::Impl::unextendMetaclass(meta::Class const& extended, ustring const& name)
+{
+    MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
+    requireExtensible(extended, locked.getModel());
+    meta::Extension const extension = getDeclaredExtension(extended, name);
+    if (!extension)
+        reportException(messages::NoSuchExtension(name, qualifiedName(extended)));
+    ustring const declaredName = name;
+
+    Transaction const transaction = locked.getModel()->beginTransaction(/*revertible=*/true);
+    tellExtensionListeners(
+        [&](ExtensionListener& listener) { listener.extensionRemoved(getModel(), extension); });
+    meta::DynamicExtensions const group = extension->getOwner();
+    extension->destroy();
+    if (group && group->getExtensions().empty())
+        group->destroy();
+    requireCommit(transaction);
+    m_extensions->remove(declaredName, extension);
+}
+
+meta::Extension Model::Impl::getDeclaredExtension(meta::Class const& extended,
+                                                  ustring const& name) const
+{
+    MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
+    meta::DynamicExtensions const group =
+        extended ? extended->getExtensions().find(m_modelCounter) : meta::DynamicExtensions();
+    meta::Extension const found = group ? group->getExtensions().find(name) : meta::Extension();
+    return found ? found : meta::Extension();
+}
+
+meta::Extension Model::Impl::getExtension(meta::Class const& metaClass, ustring const& name) const
+{
+    MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
+    // A description may close the superclasses to a ring.
+    std::unordered_set<meta::Class::Impl const*> seen;
+    for (meta::Class at = metaClass; at && seen.insert(at.getImpl()).second;
+         at = at->getSuperclass())
+    {
+        if (meta::Extension const found = getDeclaredExtension(at, name))
+            return found;
+    }
+    return meta::Extension();
+}
+
+Value Model::Impl::getExtensionDefault(meta::Class const& metaClass, ustring const& name) const
+{
+    meta::Extension const extension = getExtension(metaClass, name);
+    DeclaredExtensions::Record const* const record =
+        extension ? m_extensions->find(name, extension) : nullptr;
+    if (!record || !record->defaultValue)
+        reportException(messages::NoSuchExtension(name, qualifiedName(metaClass)));
+    return *record->defaultValue;
+}
+
+void Model::Impl::notifyExtensionAdded(meta::Extension const& extension)
+{
+    tellExtensionListeners(
+        [&](ExtensionListener& listener) { listener.extensionAdded(getModel(), extension); });
+}
+
+void Model::Impl::addExtensionListener(ExtensionListener* listener)
+{
+    m_extensionListeners.insert(listener);
+}
+
+void Model::Impl::removeExtensionListener(ExtensionListener* listener)
+{
+    m_extensionListeners.erase(listener);
+}
+
+/// A listener may remove itself and others meanwhile; those are not told any more.
+void Model::Impl::tellExtensionListeners(std::function<void(ExtensionListener&)> const& tell)
+{
+    std::vector<ExtensionListener*> const listeners(m_extensionListeners.begin(),
+                                                    m_extensionListeners.end());
+    for (ExtensionListener* const listener : listeners)
+    {
+        if (m_extensionListeners.contains(listener))
+            tell(*listener);
+    }
+}
+
+/// The declarations go with the model that made them.
+void Model::Impl::destroyExtensions()
+{
+    if (m_extensions->isEmpty())
+        return;
+    MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
+    if (locked.getModel().getImpl() != this)
+    {
+        Transaction const transaction = locked.getModel()->beginTransaction(/*revertible=*/true);
+        for (meta::Extension const& extension : m_extensions->all())
+        {
+            if (meta::DynamicExtensions const group =
+                    extension ? extension->getOwner() : meta::DynamicExtensions())
+                group->destroy();
+        }
+        transaction.commit();
+    }
+    m_extensions->clear();
+}
+}  // namespace tarn::kiln
