@@ -27,19 +27,10 @@ using meta::Language;
 using meta::StandardTypes;
 using meta::TransactionOrigin;
 
-/// A type that comes with the metamodel's own package; a stand-in while that is not built.
-template <class Kind> meta::Type catalogueType(ustring const& name)
+/// A type of the metamodel's own package.
+meta::Type catalogueType(ustring const& name)
 {
-    meta::MetaRegistry& registry = meta::MetaRegistry::getInstance();
-    if (meta::Type const known = registry.getType(name))
-        return known;
-    meta::MetaRegistry::LockedModel const locked(registry);
-    Transaction const transaction = locked.getModel()->beginTransaction(/*revertible=*/false);
-    Kind const standIn = Kind::create(locked.getModel());
-    standIn->setName(name);
-    registry.registerType(standIn, name, nullptr, nullptr);
-    transaction.commit();
-    return standIn;
+    return meta::MetaRegistry::getInstance().getType(name);
 }
 
 /// The type of a `T`, and two different `T`s, neither of them the default, in ascending order.
@@ -95,16 +86,15 @@ SAMPLE(UUID, StandardTypes::uuidMeta, (UUID{{1, 2}}), (UUID{{2, 1}}))
 SAMPLE(ptime, StandardTypes::dateTimeMeta, ptime(boost::gregorian::date(1970, 1, 1)),
        ptime(boost::gregorian::date(2026, 5, 4)))
 SAMPLE(string, StandardTypes::stdstringMeta, "a", "b")
-SAMPLE(TransactionOrigin, catalogueType<meta::DataType>(u"tarn.kiln.meta.TransactionOrigin"),
+SAMPLE(TransactionOrigin, catalogueType(u"tarn.kiln.meta.TransactionOrigin"),
        with(&TransactionOrigin::setLanguage, Language::CPlusPlus),
        with(&TransactionOrigin::setLanguage, Language::JavaScript))
-SAMPLE(ExtensionPrototype, catalogueType<meta::DataType>(u"tarn.kiln.meta.ExtensionPrototype"),
+SAMPLE(ExtensionPrototype, catalogueType(u"tarn.kiln.meta.ExtensionPrototype"),
        with(&ExtensionPrototype::setName, ustring(u"a")),
        with(&ExtensionPrototype::setName, ustring(u"b")))
-SAMPLE(Language, catalogueType<meta::Enum>(u"tarn.kiln.meta.Language"), Language::CPlusPlus,
+SAMPLE(Language, catalogueType(u"tarn.kiln.meta.Language"), Language::CPlusPlus,
        Language::JavaScript)
-SAMPLE(Model, catalogueType<meta::PrimitiveType>(u"tarn.kiln.TarnModel"), firstModel(),
-       secondModel())
+SAMPLE(Model, catalogueType(u"tarn.kiln.TarnModel"), firstModel(), secondModel())
 SAMPLE(bool, StandardTypes::booleanMeta, true, false)
 
 template <class T> class PlainValue : public ValueFixture

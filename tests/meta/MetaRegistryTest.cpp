@@ -7,7 +7,10 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/meta/PrimitiveTypeImpl.h"
+#include "tarnkiln/meta/SchemaBase.h"
 #include "tests/meta/RegistrySession.h"
 #include "tests/support/ExpectRaises.h"
 
@@ -74,12 +77,14 @@ TEST(MetaRegistry, OwnsARegistryModelOfAFixedUri)
     EXPECT_EQ(model->getModelURI(), MetaRegistry::MetaRegistryModelID);
 }
 
-TEST(MetaRegistry, UsesNoPackagesWhateverItHolds)
+TEST(MetaRegistry, IsDescribedByTheCatalogueWhateverItHolds)
 {
     RegistryElement<Class> const made(u"Made");
+    Package const root = MetaPackageMeta::getInstance().getRootPackage();
 
-    EXPECT_TRUE(registry().getModel()->getUsedPackages().empty());
-    EXPECT_TRUE(registry().getModel()->getUsedPackageUris().empty());
+    EXPECT_EQ(registry().getModel()->getUsedPackages(), std::vector<Package>{root});
+    EXPECT_EQ(registry().getModel()->getUsedPackageUris(),
+              std::vector<ustring>{SchemaBase + u"meta/19700101"});
 }
 
 TEST(RegistryModel, RefusesChangesOutsideALock)

@@ -327,7 +327,7 @@ class Rules:
 
 def check_overlay(problems, overlay, facts):
     """Every class and property has its C++ half, and there is none without facts."""
-    for key in ("namespace", "include", "export", "types", "classes"):
+    for key in ("namespace", "include", "export", "metaPackage", "types", "classes"):
         if key not in overlay:
             problems.add("", f"the key {key!r} is missing")
     problems.stop()

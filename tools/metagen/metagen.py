@@ -8,13 +8,16 @@ import sys
 import jinja2
 
 import load
+import rows
 import source
 
 ROOT = pathlib.Path(__file__).resolve().parent
 PER_CLASS = {"Handle.h": "{name}.h", "Impl.h": "{name}Impl.h", "Class.cpp": "{name}.cpp"}
+ROWS = {"Rows.h": ".h", "Rows.cpp": ".cpp"}
 PER_CATALOGUE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt"}
 # What a client has besides.
 PER_CLIENT = {"Fwd.h": "Fwd.h"}
+META_PACKAGE = {"MetaPackage.h": ".h", "MetaPackage.cpp": ".cpp"}
 PER_ENUMERATION = {"Enumeration.h": "{name}.h"}
 PER_DATA_TYPE = {"DataType.h": "{name}.h", "DataType.cpp": "{name}.cpp"}
 
@@ -46,6 +49,11 @@ def render(package, command):
     add_each(PER_DATA_TYPE, package.data_types)
     for template, name in (PER_CATALOGUE if package.is_catalogue else PER_CLIENT).items():
         add(template, name)
+    if not package.is_catalogue:
+        for template, suffix in META_PACKAGE.items():
+            add(template, package.meta_package + suffix)
+    for template, suffix in ROWS.items():
+        add(template, package.rows_file + suffix, r=rows.Rows(package))
     return files
 
 

@@ -28,7 +28,7 @@ def fill(head, items, tail, indent):
     line = head + ", ".join(items) + tail
     if len(line) <= WIDTH:
         return line
-    lines, current = [head.rstrip()], " " * indent
+    lines, current = [head.rstrip()] if head.strip() else [], " " * indent
     for position, item in enumerate(items):
         piece = item + (tail if position == len(items) - 1 else ",")
         gap = "" if current.isspace() else " "
@@ -236,8 +236,14 @@ class Property:
             parts.append(".keyed = true")
         if self.opposite:
             parts.append(f".opposite = &{self.opposite.owner.name}::Impl::{self.opposite.constant}")
+        parts.append(f".property = {self.element}")
         head = f"constinit Slot const {self.owner.name}::Impl::{self.constant}{{"
         return fill(head, parts, "};", 4)
+
+    @property
+    def element(self):
+        """The function that gives the metamodel's element; the meta package declares it."""
+        return f"propertyOf<rows::properties::{self.owner.name}{capital(self.name)}>"
 
     def row(self, end):
         """Its row in the table of the class; `end` closes the line."""
@@ -469,7 +475,7 @@ class Class:
     @property
     def source_includes(self):
         headers = {"tarnkiln/support/DispatchSteps.h", "tarnkiln/support/Handle.h",
-                   "tarnkiln/support/Unbuilt.h"}
+                   self.package.meta_package_header}
         for prop in self.stored:
             if prop.target:
                 headers.add(prop.target.impl_header)

@@ -21,6 +21,7 @@ class Package:
         self.include = overlay["include"]
         self.export = overlay["export"]
         self.export_header = overlay.get("exportHeader")
+        self.meta_package = overlay["metaPackage"]
         self.imports = imports
         self.enumerations = [values.Enumeration(entry, overlay["enumerations"][entry["name"]], self)
                              for entry in facts["enumerations"] if "enumerations" in overlay]
@@ -110,6 +111,22 @@ class Package:
     @property
     def is_catalogue(self):
         return self.namespace == "tarn::kiln::meta"
+
+    @property
+    def meta_package_header(self):
+        return f"{self.include}/{self.meta_package}.h"
+
+    @property
+    def rows_file(self):
+        return "CatalogueRows" if self.is_catalogue else self.meta_package + "Rows"
+
+    @property
+    def collection_headers(self):
+        """What the collections of all own types need."""
+        if self.is_catalogue:
+            return ["tarnkiln/collections/MetaCollections.h"]
+        types = self.data_types + self.enumerations
+        return [*(c.impl_header for c in self.classes), *(f"{self.include}/{t.name}.h" for t in types)]
 
     @property
     def export_word(self):

@@ -1,15 +1,18 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/ArgumentImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Argument::Impl::OPERATION{.index = 6, .opposite = &Operation::Impl::ARGUMENTS};
-constinit Slot const Argument::Impl::IS_INPUT{.index = 7};
+constinit Slot const Argument::Impl::OPERATION{
+    .index = 6, .opposite = &Operation::Impl::ARGUMENTS,
+    .property = propertyOf<rows::properties::ArgumentOperation>};
+constinit Slot const Argument::Impl::IS_INPUT{
+    .index = 7, .property = propertyOf<rows::properties::ArgumentIsInput>};
 
 Argument Argument::cast(ModelElement const& element)
 {
@@ -18,7 +21,7 @@ Argument Argument::cast(ModelElement const& element)
 
 meta::Class const& Argument::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Argument);
 }
 
 Argument Argument::create(Model const& model, UUID const& id)

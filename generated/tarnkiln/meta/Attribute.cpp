@@ -3,16 +3,18 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/AttributeMapImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Attribute::Impl::KEY{.index = 1};
+constinit Slot const Attribute::Impl::KEY{
+    .index = 1, .property = propertyOf<rows::properties::AttributeKey>};
 constinit Slot const Attribute::Impl::OWNER{
-    .index = 2, .opposite = &AttributeMap::Impl::ATTRIBUTES};
+    .index = 2, .opposite = &AttributeMap::Impl::ATTRIBUTES,
+    .property = propertyOf<rows::properties::AttributeOwner>};
 
 Attribute Attribute::cast(ModelElement const& element)
 {
@@ -21,7 +23,7 @@ Attribute Attribute::cast(ModelElement const& element)
 
 meta::Class const& Attribute::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Attribute);
 }
 
 Attribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}

@@ -2,15 +2,16 @@
 #include "tarnkiln/meta/AttributeMapImpl.h"
 
 #include "tarnkiln/meta/AttributeImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
 constinit Slot const AttributeMap::Impl::ATTRIBUTES{
     .index = 1, .composite = true, .single = false, .keyed = true,
-    .opposite = &Attribute::Impl::OWNER};
+    .opposite = &Attribute::Impl::OWNER,
+    .property = propertyOf<rows::properties::AttributeMapAttributes>};
 
 AttributeMap AttributeMap::cast(ModelElement const& element)
 {
@@ -19,7 +20,7 @@ AttributeMap AttributeMap::cast(ModelElement const& element)
 
 meta::Class const& AttributeMap::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::AttributeMap);
 }
 
 AttributeMap AttributeMap::create(Model const& model, UUID const& id)

@@ -2,13 +2,15 @@
 #include "tarnkiln/meta/AttributeMapAttributeImpl.h"
 
 #include "tarnkiln/meta/AttributeMapImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const AttributeMapAttribute::Impl::VALUE{.index = 3, .composite = true};
+constinit Slot const AttributeMapAttribute::Impl::VALUE{
+    .index = 3, .composite = true,
+    .property = propertyOf<rows::properties::AttributeMapAttributeValue>};
 
 AttributeMapAttribute AttributeMapAttribute::cast(ModelElement const& element)
 {
@@ -17,7 +19,7 @@ AttributeMapAttribute AttributeMapAttribute::cast(ModelElement const& element)
 
 meta::Class const& AttributeMapAttribute::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::AttributeMapAttribute);
 }
 
 AttributeMapAttribute AttributeMapAttribute::create(Model const& model, UUID const& id)

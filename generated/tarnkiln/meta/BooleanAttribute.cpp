@@ -1,13 +1,14 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/BooleanAttributeImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const BooleanAttribute::Impl::VALUE{.index = 3};
+constinit Slot const BooleanAttribute::Impl::VALUE{
+    .index = 3, .property = propertyOf<rows::properties::BooleanAttributeValue>};
 
 BooleanAttribute BooleanAttribute::cast(ModelElement const& element)
 {
@@ -16,7 +17,7 @@ BooleanAttribute BooleanAttribute::cast(ModelElement const& element)
 
 meta::Class const& BooleanAttribute::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::BooleanAttribute);
 }
 
 BooleanAttribute BooleanAttribute::create(Model const& model, UUID const& id)

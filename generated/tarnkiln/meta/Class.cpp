@@ -2,17 +2,20 @@
 #include "tarnkiln/meta/ClassImpl.h"
 
 #include "tarnkiln/meta/DynamicExtensionsImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Class::Impl::SUPERCLASS{.index = 9};
+constinit Slot const Class::Impl::SUPERCLASS{
+    .index = 9, .property = propertyOf<rows::properties::ClassSuperclass>};
 constinit Slot const Class::Impl::EXTENSIONS{
     .index = 10, .composite = true, .single = false, .keyed = true,
-    .opposite = &DynamicExtensions::Impl::OWNING_CLASS};
-constinit Slot const Class::Impl::IS_ABSTRACT{.index = 11};
+    .opposite = &DynamicExtensions::Impl::OWNING_CLASS,
+    .property = propertyOf<rows::properties::ClassExtensions>};
+constinit Slot const Class::Impl::IS_ABSTRACT{
+    .index = 11, .property = propertyOf<rows::properties::ClassIsAbstract>};
 
 Class Class::cast(ModelElement const& element)
 {
@@ -21,7 +24,7 @@ Class Class::cast(ModelElement const& element)
 
 meta::Class const& Class::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Class);
 }
 
 Class Class::create(Model const& model, UUID const& id)

@@ -1,9 +1,9 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/DataTypeImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
@@ -14,7 +14,7 @@ DataType DataType::cast(ModelElement const& element)
 
 meta::Class const& DataType::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::DataType);
 }
 
 DataType DataType::create(Model const& model, UUID const& id)

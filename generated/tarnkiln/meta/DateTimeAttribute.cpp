@@ -1,13 +1,14 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/DateTimeAttributeImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const DateTimeAttribute::Impl::VALUE{.index = 3};
+constinit Slot const DateTimeAttribute::Impl::VALUE{
+    .index = 3, .property = propertyOf<rows::properties::DateTimeAttributeValue>};
 
 DateTimeAttribute DateTimeAttribute::cast(ModelElement const& element)
 {
@@ -16,7 +17,7 @@ DateTimeAttribute DateTimeAttribute::cast(ModelElement const& element)
 
 meta::Class const& DateTimeAttribute::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::DateTimeAttribute);
 }
 
 DateTimeAttribute DateTimeAttribute::create(Model const& model, UUID const& id)

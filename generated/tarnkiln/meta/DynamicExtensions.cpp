@@ -4,19 +4,22 @@
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/ExtensionImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const DynamicExtensions::Impl::MODEL_ID{.index = 1};
+constinit Slot const DynamicExtensions::Impl::MODEL_ID{
+    .index = 1, .property = propertyOf<rows::properties::DynamicExtensionsModelID>};
 constinit Slot const DynamicExtensions::Impl::EXTENSIONS{
     .index = 2, .composite = true, .single = false, .keyed = true,
-    .opposite = &Extension::Impl::OWNER};
+    .opposite = &Extension::Impl::OWNER,
+    .property = propertyOf<rows::properties::DynamicExtensionsExtensions>};
 constinit Slot const DynamicExtensions::Impl::OWNING_CLASS{
-    .index = 3, .opposite = &Class::Impl::EXTENSIONS};
+    .index = 3, .opposite = &Class::Impl::EXTENSIONS,
+    .property = propertyOf<rows::properties::DynamicExtensionsOwningClass>};
 
 DynamicExtensions DynamicExtensions::cast(ModelElement const& element)
 {
@@ -25,7 +28,7 @@ DynamicExtensions DynamicExtensions::cast(ModelElement const& element)
 
 meta::Class const& DynamicExtensions::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::DynamicExtensions);
 }
 
 DynamicExtensions DynamicExtensions::create(Model const& model, UUID const& id)

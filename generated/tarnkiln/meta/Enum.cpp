@@ -2,17 +2,19 @@
 #include "tarnkiln/meta/EnumImpl.h"
 
 #include "tarnkiln/meta/EnumLiteralImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PrimitiveTypeImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
 constinit Slot const Enum::Impl::LITERALS{
     .index = 4, .composite = true, .single = false, .keyed = true,
-    .opposite = &EnumLiteral::Impl::PARENT_ENUM};
-constinit Slot const Enum::Impl::UNDERLYING_TYPE{.index = 5};
+    .opposite = &EnumLiteral::Impl::PARENT_ENUM,
+    .property = propertyOf<rows::properties::EnumLiterals>};
+constinit Slot const Enum::Impl::UNDERLYING_TYPE{
+    .index = 5, .property = propertyOf<rows::properties::EnumUnderlyingType>};
 
 Enum Enum::cast(ModelElement const& element)
 {
@@ -21,7 +23,7 @@ Enum Enum::cast(ModelElement const& element)
 
 meta::Class const& Enum::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Enum);
 }
 
 Enum Enum::create(Model const& model, UUID const& id)

@@ -3,16 +3,20 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const EnumLiteral::Impl::VALUE{.index = 2};
-constinit Slot const EnumLiteral::Impl::PARENT_ENUM{.index = 3, .opposite = &Enum::Impl::LITERALS};
-constinit Slot const EnumLiteral::Impl::PUBLIC_IDENTIFIER{.index = 4};
+constinit Slot const EnumLiteral::Impl::VALUE{
+    .index = 2, .property = propertyOf<rows::properties::EnumLiteralValue>};
+constinit Slot const EnumLiteral::Impl::PARENT_ENUM{
+    .index = 3, .opposite = &Enum::Impl::LITERALS,
+    .property = propertyOf<rows::properties::EnumLiteralParentEnum>};
+constinit Slot const EnumLiteral::Impl::PUBLIC_IDENTIFIER{
+    .index = 4, .property = propertyOf<rows::properties::EnumLiteralPublicIdentifier>};
 
 EnumLiteral EnumLiteral::cast(ModelElement const& element)
 {
@@ -21,7 +25,7 @@ EnumLiteral EnumLiteral::cast(ModelElement const& element)
 
 meta::Class const& EnumLiteral::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::EnumLiteral);
 }
 
 EnumLiteral EnumLiteral::create(Model const& model, UUID const& id)

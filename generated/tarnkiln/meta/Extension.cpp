@@ -3,15 +3,16 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/DynamicExtensionsImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
 constinit Slot const Extension::Impl::OWNER{
-    .index = 26, .opposite = &DynamicExtensions::Impl::EXTENSIONS};
+    .index = 26, .opposite = &DynamicExtensions::Impl::EXTENSIONS,
+    .property = propertyOf<rows::properties::ExtensionOwner>};
 
 Extension Extension::cast(ModelElement const& element)
 {
@@ -20,7 +21,7 @@ Extension Extension::cast(ModelElement const& element)
 
 meta::Class const& Extension::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Extension);
 }
 
 Extension Extension::create(Model const& model, UUID const& id)

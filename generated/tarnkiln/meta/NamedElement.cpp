@@ -1,13 +1,14 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/NamedElementImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const NamedElement::Impl::NAME{.index = 1};
+constinit Slot const NamedElement::Impl::NAME{
+    .index = 1, .property = propertyOf<rows::properties::NamedElementName>};
 
 NamedElement NamedElement::cast(ModelElement const& element)
 {
@@ -16,7 +17,7 @@ NamedElement NamedElement::cast(ModelElement const& element)
 
 meta::Class const& NamedElement::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::NamedElement);
 }
 
 NamedElement NamedElement::create(Model const& model, UUID const& id)

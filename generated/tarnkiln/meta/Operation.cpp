@@ -3,22 +3,28 @@
 
 #include "tarnkiln/collections/ElementMultimap.h"
 #include "tarnkiln/meta/ArgumentImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
 constinit Slot const Operation::Impl::ARGUMENTS{
-    .index = 6, .composite = true, .single = false, .opposite = &Argument::Impl::OPERATION};
+    .index = 6, .composite = true, .single = false, .opposite = &Argument::Impl::OPERATION,
+    .property = propertyOf<rows::properties::OperationArguments>};
 constinit Slot const Operation::Impl::OWNING_TYPE{
-    .index = 7, .opposite = &StructuredType::Impl::OWNED_OPERATIONS};
-constinit Slot const Operation::Impl::IS_ABSTRACT{.index = 8};
-constinit Slot const Operation::Impl::IS_STATIC{.index = 9};
-constinit Slot const Operation::Impl::IS_PUBLIC{.index = 10};
-constinit Slot const Operation::Impl::IS_EVENT{.index = 11};
+    .index = 7, .opposite = &StructuredType::Impl::OWNED_OPERATIONS,
+    .property = propertyOf<rows::properties::OperationOwningType>};
+constinit Slot const Operation::Impl::IS_ABSTRACT{
+    .index = 8, .property = propertyOf<rows::properties::OperationIsAbstract>};
+constinit Slot const Operation::Impl::IS_STATIC{
+    .index = 9, .property = propertyOf<rows::properties::OperationIsStatic>};
+constinit Slot const Operation::Impl::IS_PUBLIC{
+    .index = 10, .property = propertyOf<rows::properties::OperationIsPublic>};
+constinit Slot const Operation::Impl::IS_EVENT{
+    .index = 11, .property = propertyOf<rows::properties::OperationIsEvent>};
 
 Operation Operation::cast(ModelElement const& element)
 {
@@ -27,7 +33,7 @@ Operation Operation::cast(ModelElement const& element)
 
 meta::Class const& Operation::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Operation);
 }
 
 Operation Operation::create(Model const& model, UUID const& id)

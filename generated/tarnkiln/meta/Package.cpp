@@ -2,25 +2,32 @@
 #include "tarnkiln/meta/PackageImpl.h"
 
 #include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/TypeImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
 constinit Slot const Package::Impl::OWNED_TYPES{
     .index = 2, .composite = true, .single = false, .keyed = true,
-    .opposite = &Type::Impl::OWNING_PACKAGE};
+    .opposite = &Type::Impl::OWNING_PACKAGE,
+    .property = propertyOf<rows::properties::PackageOwnedTypes>};
 constinit Slot const Package::Impl::NESTED_PACKAGES{
     .index = 3, .composite = true, .single = false, .keyed = true,
-    .opposite = &Package::Impl::PARENT_PACKAGE};
-constinit Slot const Package::Impl::URI{.index = 4};
+    .opposite = &Package::Impl::PARENT_PACKAGE,
+    .property = propertyOf<rows::properties::PackageNestedPackages>};
+constinit Slot const Package::Impl::URI{
+    .index = 4, .property = propertyOf<rows::properties::PackageUri>};
 constinit Slot const Package::Impl::PARENT_PACKAGE{
-    .index = 5, .opposite = &Package::Impl::NESTED_PACKAGES};
-constinit Slot const Package::Impl::IMPORTED_PACKAGE_URIS{.index = 6, .single = false};
-constinit Slot const Package::Impl::DEFAULT_VOBJ_CATEGORY{.index = 7};
+    .index = 5, .opposite = &Package::Impl::NESTED_PACKAGES,
+    .property = propertyOf<rows::properties::PackageParentPackage>};
+constinit Slot const Package::Impl::IMPORTED_PACKAGE_URIS{
+    .index = 6, .single = false,
+    .property = propertyOf<rows::properties::PackageImportedPackageURIs>};
+constinit Slot const Package::Impl::DEFAULT_VOBJ_CATEGORY{
+    .index = 7, .property = propertyOf<rows::properties::PackageDefaultVobjCategory>};
 
 Package Package::cast(ModelElement const& element)
 {
@@ -29,7 +36,7 @@ Package Package::cast(ModelElement const& element)
 
 meta::Class const& Package::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Package);
 }
 
 Package Package::create(Model const& model, UUID const& id)

@@ -1,9 +1,9 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/PrimitiveTypeImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
@@ -14,7 +14,7 @@ PrimitiveType PrimitiveType::cast(ModelElement const& element)
 
 meta::Class const& PrimitiveType::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::PrimitiveType);
 }
 
 PrimitiveType PrimitiveType::create(Model const& model, UUID const& id)

@@ -2,35 +2,55 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 
 #include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Property::Impl::IS_DERIVED{.index = 6};
-constinit Slot const Property::Impl::IS_COMPOSITE{.index = 7};
-constinit Slot const Property::Impl::IS_READ_ONLY{.index = 8};
-constinit Slot const Property::Impl::IS_UNIQUE{.index = 9};
-constinit Slot const Property::Impl::QUALIFIED_BY{.index = 10};
-constinit Slot const Property::Impl::CUSTOM_QUALIFICATION{.index = 11};
-constinit Slot const Property::Impl::IS_QUALIFICATION_UNIQUE{.index = 12};
-constinit Slot const Property::Impl::OPPOSITE{.index = 13};
-constinit Slot const Property::Impl::PROPERTY_INDEX{.index = 14};
-constinit Slot const Property::Impl::IS_PUBLIC_ACCESSOR{.index = 15};
-constinit Slot const Property::Impl::IS_PUBLIC_MUTATOR{.index = 16};
-constinit Slot const Property::Impl::IS_TRANSIENT{.index = 17};
-constinit Slot const Property::Impl::IS_SPARSE{.index = 18};
+constinit Slot const Property::Impl::IS_DERIVED{
+    .index = 6, .property = propertyOf<rows::properties::PropertyIsDerived>};
+constinit Slot const Property::Impl::IS_COMPOSITE{
+    .index = 7, .property = propertyOf<rows::properties::PropertyIsComposite>};
+constinit Slot const Property::Impl::IS_READ_ONLY{
+    .index = 8, .property = propertyOf<rows::properties::PropertyIsReadOnly>};
+constinit Slot const Property::Impl::IS_UNIQUE{
+    .index = 9, .property = propertyOf<rows::properties::PropertyIsUnique>};
+constinit Slot const Property::Impl::QUALIFIED_BY{
+    .index = 10, .property = propertyOf<rows::properties::PropertyQualifiedBy>};
+constinit Slot const Property::Impl::CUSTOM_QUALIFICATION{
+    .index = 11, .property = propertyOf<rows::properties::PropertyCustomQualification>};
+constinit Slot const Property::Impl::IS_QUALIFICATION_UNIQUE{
+    .index = 12, .property = propertyOf<rows::properties::PropertyIsQualificationUnique>};
+constinit Slot const Property::Impl::OPPOSITE{
+    .index = 13, .property = propertyOf<rows::properties::PropertyOpposite>};
+constinit Slot const Property::Impl::PROPERTY_INDEX{
+    .index = 14, .property = propertyOf<rows::properties::PropertyPropertyIndex>};
+constinit Slot const Property::Impl::IS_PUBLIC_ACCESSOR{
+    .index = 15, .property = propertyOf<rows::properties::PropertyIsPublicAccessor>};
+constinit Slot const Property::Impl::IS_PUBLIC_MUTATOR{
+    .index = 16, .property = propertyOf<rows::properties::PropertyIsPublicMutator>};
+constinit Slot const Property::Impl::IS_TRANSIENT{
+    .index = 17, .property = propertyOf<rows::properties::PropertyIsTransient>};
+constinit Slot const Property::Impl::IS_SPARSE{
+    .index = 18, .property = propertyOf<rows::properties::PropertyIsSparse>};
 constinit Slot const Property::Impl::OWNING_TYPE{
-    .index = 19, .opposite = &StructuredType::Impl::OWNED_ATTRIBUTES};
-constinit Slot const Property::Impl::VOBJ_DISP_CATEGORY{.index = 20};
-constinit Slot const Property::Impl::VOBJ_DISP_SKIP_EMPTY{.index = 21};
-constinit Slot const Property::Impl::IS_SET_ONCE{.index = 22};
-constinit Slot const Property::Impl::IS_VOBJ_HIDDEN{.index = 23};
-constinit Slot const Property::Impl::DEFAULT_VALUE{.index = 24};
-constinit Slot const Property::Impl::IS_QUERY_INDEX{.index = 25};
+    .index = 19, .opposite = &StructuredType::Impl::OWNED_ATTRIBUTES,
+    .property = propertyOf<rows::properties::PropertyOwningType>};
+constinit Slot const Property::Impl::VOBJ_DISP_CATEGORY{
+    .index = 20, .property = propertyOf<rows::properties::PropertyVobjDispCategory>};
+constinit Slot const Property::Impl::VOBJ_DISP_SKIP_EMPTY{
+    .index = 21, .property = propertyOf<rows::properties::PropertyVobjDispSkipEmpty>};
+constinit Slot const Property::Impl::IS_SET_ONCE{
+    .index = 22, .property = propertyOf<rows::properties::PropertyIsSetOnce>};
+constinit Slot const Property::Impl::IS_VOBJ_HIDDEN{
+    .index = 23, .property = propertyOf<rows::properties::PropertyIsVobjHidden>};
+constinit Slot const Property::Impl::DEFAULT_VALUE{
+    .index = 24, .property = propertyOf<rows::properties::PropertyDefaultValue>};
+constinit Slot const Property::Impl::IS_QUERY_INDEX{
+    .index = 25, .property = propertyOf<rows::properties::PropertyIsQueryIndex>};
 
 Property Property::cast(ModelElement const& element)
 {
@@ -39,7 +59,7 @@ Property Property::cast(ModelElement const& element)
 
 meta::Class const& Property::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Property);
 }
 
 Property Property::create(Model const& model, UUID const& id)

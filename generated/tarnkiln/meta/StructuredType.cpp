@@ -1,23 +1,29 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const StructuredType::Impl::VOBJ_NAME{.index = 4};
+constinit Slot const StructuredType::Impl::VOBJ_NAME{
+    .index = 4, .property = propertyOf<rows::properties::StructuredTypeVobjName>};
 constinit Slot const StructuredType::Impl::OWNED_ATTRIBUTES{
     .index = 5, .composite = true, .single = false, .keyed = true,
-    .opposite = &Property::Impl::OWNING_TYPE};
+    .opposite = &Property::Impl::OWNING_TYPE,
+    .property = propertyOf<rows::properties::StructuredTypeOwnedAttributes>};
 constinit Slot const StructuredType::Impl::OWNED_OPERATIONS{
     .index = 6, .composite = true, .single = false, .keyed = true,
-    .opposite = &Operation::Impl::OWNING_TYPE};
-constinit Slot const StructuredType::Impl::VOBJ_COMPACT_DISPLAY{.index = 7};
-constinit Slot const StructuredType::Impl::VOBJ_DISP_CATEGORIES{.index = 8, .single = false};
+    .opposite = &Operation::Impl::OWNING_TYPE,
+    .property = propertyOf<rows::properties::StructuredTypeOwnedOperations>};
+constinit Slot const StructuredType::Impl::VOBJ_COMPACT_DISPLAY{
+    .index = 7, .property = propertyOf<rows::properties::StructuredTypeVobjCompactDisplay>};
+constinit Slot const StructuredType::Impl::VOBJ_DISP_CATEGORIES{
+    .index = 8, .single = false,
+    .property = propertyOf<rows::properties::StructuredTypeVobjDispCategories>};
 
 StructuredType StructuredType::cast(ModelElement const& element)
 {
@@ -26,7 +32,7 @@ StructuredType StructuredType::cast(ModelElement const& element)
 
 meta::Class const& StructuredType::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::StructuredType);
 }
 
 StructuredType StructuredType::create(Model const& model, UUID const& id)

@@ -2,17 +2,19 @@
 #include "tarnkiln/meta/TypeImpl.h"
 
 #include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const Type::Impl::IS_VOBJ_HIDDEN{.index = 2};
+constinit Slot const Type::Impl::IS_VOBJ_HIDDEN{
+    .index = 2, .property = propertyOf<rows::properties::TypeIsVobjHidden>};
 constinit Slot const Type::Impl::OWNING_PACKAGE{
-    .index = 3, .opposite = &Package::Impl::OWNED_TYPES};
+    .index = 3, .opposite = &Package::Impl::OWNED_TYPES,
+    .property = propertyOf<rows::properties::TypeOwningPackage>};
 
 Type Type::cast(ModelElement const& element)
 {
@@ -21,7 +23,7 @@ Type Type::cast(ModelElement const& element)
 
 meta::Class const& Type::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::Type);
 }
 
 Type Type::create(Model const& model, UUID const& id)

@@ -1,17 +1,21 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/TypedElementImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/TypeImpl.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const TypedElement::Impl::TYPE{.index = 2};
-constinit Slot const TypedElement::Impl::LOWER{.index = 3};
-constinit Slot const TypedElement::Impl::UPPER{.index = 4};
-constinit Slot const TypedElement::Impl::IS_ORDERED{.index = 5};
+constinit Slot const TypedElement::Impl::TYPE{
+    .index = 2, .property = propertyOf<rows::properties::TypedElementType>};
+constinit Slot const TypedElement::Impl::LOWER{
+    .index = 3, .property = propertyOf<rows::properties::TypedElementLower>};
+constinit Slot const TypedElement::Impl::UPPER{
+    .index = 4, .property = propertyOf<rows::properties::TypedElementUpper>};
+constinit Slot const TypedElement::Impl::IS_ORDERED{
+    .index = 5, .property = propertyOf<rows::properties::TypedElementIsOrdered>};
 
 TypedElement TypedElement::cast(ModelElement const& element)
 {
@@ -20,7 +24,7 @@ TypedElement TypedElement::cast(ModelElement const& element)
 
 meta::Class const& TypedElement::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::TypedElement);
 }
 
 TypedElement TypedElement::create(Model const& model, UUID const& id)

@@ -1,13 +1,14 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/UUIDAttributeImpl.h"
 
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
-#include "tarnkiln/support/Unbuilt.h"
 
 namespace tarn::kiln::meta {
 
-constinit Slot const UUIDAttribute::Impl::VALUE{.index = 3};
+constinit Slot const UUIDAttribute::Impl::VALUE{
+    .index = 3, .property = propertyOf<rows::properties::UUIDAttributeValue>};
 
 UUIDAttribute UUIDAttribute::cast(ModelElement const& element)
 {
@@ -16,7 +17,7 @@ UUIDAttribute UUIDAttribute::cast(ModelElement const& element)
 
 meta::Class const& UUIDAttribute::metaClass()
 {
-    return support::unbuiltClass();
+    return MetaPackageMeta::getInstance().getClass(rows::classes::UUIDAttribute);
 }
 
 UUIDAttribute UUIDAttribute::create(Model const& model, UUID const& id)

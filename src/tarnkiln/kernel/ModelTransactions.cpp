@@ -7,6 +7,7 @@
 #include "tarnkiln/kernel/internal/NestedTransaction.h"
 #include "tarnkiln/kernel/internal/TransactionGroup.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
+#include "tarnkiln/meta/internal/buildCatalogueFor.h"
 
 #include <algorithm>
 
@@ -37,6 +38,9 @@ Transaction Model::Impl::innerBeginTransaction(PrivateTag const&,
 {
     if (m_validity == ElementValidity::Invalid)
         reportException(tarnkiln::messages::ModelFrozen());
+    // Built later, it would be part of this transaction and could be taken back with it.
+    if (!m_currentTransaction && isRegistryModel())
+        internal::buildCatalogueFor(*this);
     if (m_currentTransaction)
         return Transaction(new internal::NestedTransaction(m_currentTransaction));
     if (!deep) {

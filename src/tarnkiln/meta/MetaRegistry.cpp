@@ -57,6 +57,11 @@ MetaRegistry& MetaRegistry::getInstance()
     return *registry;
 }
 
+bool MetaRegistry::isStarted()
+{
+    return startedRegistry.load(std::memory_order_acquire) != nullptr;
+}
+
 MetaRegistry::MetaRegistry()
     : m_model(Model::createRegistryModel(MetaRegistryModelID)),
       m_freezer(m_model->freeze())

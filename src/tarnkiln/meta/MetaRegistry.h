@@ -63,6 +63,8 @@ public:
     /// The one registry, made at the first call, by whichever thread comes first. It lives to the
     /// end of the process.
     static MetaRegistry& getInstance();
+    /// Whether the registry is complete; false also for the thread that is making it. Makes none.
+    static bool isStarted();
 
     /// The model in which all metamodels live.
     Model const& getModel() const { return m_model; }
@@ -88,6 +90,9 @@ public:
 
     /// The type of that name; empty if there is none. Where no type has these names, "meta.Model"
     /// and "meta.ModelElement" still stand for the classes of `Model` and `ModelElement`.
+    ///
+    /// A name of the metamodel of metamodels that is not found, one that begins with "tarn.kiln.",
+    /// makes it be built; so do its URIs and its family in the look-ups of packages.
     Type getType(ustring const& name) const;
     /// The same, empty also for a type of another kind.
     Class getClass(ustring const& name) const;

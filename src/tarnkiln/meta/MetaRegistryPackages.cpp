@@ -1,5 +1,6 @@
 /// \file
 /// The registry's root packages and families.
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/MetaRegistry.h"
 #include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/meta/internal/MetaUri.h"
@@ -8,9 +9,17 @@
 namespace tarn::kiln::meta {
 namespace {
 
-Package findPackage(std::map<ustring, Package> const& packages, ustring const& key)
+/// The entry under `key`, which belongs to `family`. The library's own metamodel is built when it
+/// is looked for.
+Package findPackage(std::map<ustring, Package> const& packages, ustring const& key,
+                    ustring const& family)
 {
-    auto const position = packages.find(key);
+    auto position = packages.find(key);
+    if (position == packages.end() && family == u"meta")
+    {
+        MetaPackageMeta::getInstance();
+        position = packages.find(key);
+    }
     return position != packages.end() ? position->second : Package();
 }
 }  // namespace
@@ -33,7 +42,7 @@ void MetaRegistry::unregisterRootPackage(ustring const& uri)
 Package MetaRegistry::getRootPackage(ustring const& uri) const
 {
     LockedConstModel const locked(*this);
-    return findPackage(m_rootPackages, uri);
+    return findPackage(m_rootPackages, uri, internal::familyOfUri(uri).value_or(ustring()));
 }
 
 Package MetaRegistry::getRootPackage(ustring const& uri, bool load)
@@ -52,7 +61,7 @@ Package MetaRegistry::getPackageForFamily(ustring const& family)
 {
     auto const find = [&] {
         LockedConstModel const locked(*this);
-        return findPackage(m_families, family);
+        return findPackage(m_families, family, family);
     };
     // A dead package counts as found: only one that was never registered is loaded.
     if (Package const found = find(); found.getImpl())

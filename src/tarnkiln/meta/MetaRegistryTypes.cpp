@@ -7,6 +7,7 @@
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/DataTypeImpl.h"
 #include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/MetaRegistry.h"
 #include "tarnkiln/meta/PrimitiveType.h"
 #include "tarnkiln/meta/PropertyImpl.h"
@@ -79,7 +80,12 @@ void MetaRegistry::updateCollectionInstantiator(Type const& type, CollectionInst
 Type MetaRegistry::getType(ustring const& name) const
 {
     LockedConstModel const locked(*this);
-    auto const position = m_types.find(name);
+    auto position = m_types.find(name);
+    if (position == m_types.end() && name.starts_with(u"tarn.kiln."))
+    {
+        MetaPackageMeta::getInstance();
+        position = m_types.find(name);
+    }
     if (position != m_types.end())
         return position->second.type;
     // Metamodels of old spell these two names so.

@@ -6,8 +6,6 @@
 namespace tarn::kiln::internal {
 
 /// Says that the registry model is described by the metamodel of metamodels, whatever it holds.
-///
-/// That metamodel is not built yet: the answer is that no package is used.
 class MetaRegistryUsageProvider final : public meta::DataModelUsageProvider
 {
 public:

@@ -1,0 +1,41 @@
+#include "tarnkiln/meta/MetaPackageMeta.h"
+
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/internal/buildCatalogueFor.h"
+
+namespace tarn::kiln::meta {
+
+MetaPackageMeta::MetaPackageMeta() : RowPackage(rows::all()) {}
+
+MetaPackageMeta& MetaPackageMeta::getInstance()
+{
+    static auto* const package = new MetaPackageMeta;
+    package->ensureBuilt();
+    return *package;
+}
+
+void MetaPackageMeta::completed()
+{
+    // The registry made these two before it could make collections.
+    getModelClass()->getOwnedAttributes();
+    getModelElementClass()->getOwnedAttributes();
+}
+
+Class const& MetaPackageMeta::getModelClass() const
+{
+    return Model::metaClass();
+}
+
+Class const& MetaPackageMeta::getModelElementClass() const
+{
+    return ModelElement::metaClass();
+}
+}  // namespace tarn::kiln::meta
+
+void tarn::kiln::internal::buildCatalogueFor(Model::Impl const& model)
+{
+    if (meta::MetaRegistry::isStarted() &&
+        meta::MetaRegistry::getInstance().getModel().getImpl() == &model)
+        meta::MetaPackageMeta::getInstance();
+}
