@@ -1,8 +1,8 @@
 // How meta packages make the elements of a metamodel, and how displays are told about them.
+#include "tarnkiln/meta/AbstractMetaPackage.h"
 #include "tarnkiln/collections/PrimitiveSequence.h"
 #include "tarnkiln/collections/PrimitiveSet.h"
 #include "tarnkiln/kernel/ListenerHolder.h"
-#include "tarnkiln/meta/AbstractMetaPackage.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/DataTypeImpl.h"
 #include "tarnkiln/meta/EnumImpl.h"
