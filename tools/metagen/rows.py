@@ -60,11 +60,15 @@ class Rows:
 
     def __init__(self, package):
         self.facts = package.facts
+        self.methods = {(cls.name, entry["name"]) for cls in package.classes
+                        for entry in cls.facts.get("operations", [])
+                        if entry["invoker"] and has_method(cls, entry["name"])}
         self.required = self.facts.get("wellKnown", {}).get("resolvedByNameInStep6", [])
         self.imports = [each for each in package.imports if not each.is_catalogue]
         self.includes = sorted({
-            *package.collection_headers, *(each.meta_package_header for each in self.imports),
-            "tarnkiln/support/ElementInstantiator.h", "tarnkiln/support/PrimitiveInstantiator.h",
+            *package.collection_headers, *self.headers_of_methods(package), *(each.meta_package_header for each in self.imports),
+            "tarnkiln/support/ElementInstantiator.h", "tarnkiln/support/InvokerInstaller.h",
+            "tarnkiln/support/PrimitiveInstantiator.h",
             "tarnkiln/support/SerializerInstaller.h"})
         self.own_types = {}
         for table, key in (("Classes", "classes"), ("DataTypes", "dataTypes"),
@@ -186,7 +190,17 @@ class Rows:
             ("isOrdered", "true" if result.get("ordered") else None),
             ("flags", " | ".join(flags) or None),
             ("arguments", arguments),
+            ("invoker", self.invoker(owner, entry)),
             ("uuid", narrow(entry["uuid"]))])
+
+    def headers_of_methods(self, package):
+        owners = {owner for owner, _ in self.methods}
+        return [cls.impl_header for cls in package.classes if cls.name in owners]
+
+    def invoker(self, owner, entry):
+        if (owner, entry["name"]) not in self.methods:
+            return None
+        return f"support::makeInvokerOf<&{owner}::Impl::{entry['name']}>"
 
     def add_enumeration(self, entry):
         literals = self.range("literals", entry["literals"])
@@ -225,6 +239,12 @@ class Rows:
                 return f"{{rows::properties::{property_name(at, name)}}}"
             at = classes[at]["superclass"]
         return "{" + f"{text(at)}, {text(name)}" + "}"
+
+
+def has_method(cls, name):
+    """Whether the class declares a function of that name; the catalogue's are written by hand."""
+    return not cls.package.is_catalogue or any(
+        f" {name}(" in each["code"] for each in cls.declarations)
 
 
 def property_name(owner, name):

@@ -2,7 +2,14 @@
 #include "tarnkiln/meta/CatalogueRows.h"
 
 #include "tarnkiln/collections/MetaCollections.h"
+#include "tarnkiln/meta/AttributeImpl.h"
+#include "tarnkiln/meta/AttributeMapImpl.h"
+#include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
+#include "tarnkiln/meta/StructuredTypeImpl.h"
+#include "tarnkiln/meta/TypeImpl.h"
 #include "tarnkiln/support/ElementInstantiator.h"
+#include "tarnkiln/support/InvokerInstaller.h"
 #include "tarnkiln/support/PrimitiveInstantiator.h"
 #include "tarnkiln/support/SerializerInstaller.h"
 
@@ -378,40 +385,67 @@ constexpr support::PropertyRow properties[] = {
 
 constexpr support::OperationRow operations[] = {
     {.name = u"getType", .type = {Classes, rows::classes::Type}, .lower = 1, .upper = 1,
-     .flags = ABSTRACT, .uuid = "c12539ff-8656-3c75-ab3f-02539f328399"},
-    {.name = u"insert", .arguments = {0, 1}, .uuid = "85a75c34-b43f-341f-8252-03ef154f53af"},
+     .flags = ABSTRACT, .invoker = support::makeInvokerOf<&Attribute::Impl::getType>,
+     .uuid = "c12539ff-8656-3c75-ab3f-02539f328399"},
+    {.name = u"insert", .arguments = {0, 1},
+     .invoker = support::makeInvokerOf<&AttributeMap::Impl::insert>,
+     .uuid = "85a75c34-b43f-341f-8252-03ef154f53af"},
     {.name = u"insertOrReplace", .arguments = {1, 1},
+     .invoker = support::makeInvokerOf<&AttributeMap::Impl::insertOrReplace>,
      .uuid = "51a524d9-9d86-34af-a099-9c6caf035ee3"},
     {.name = u"emplace", .type = {Classes, rows::classes::Attribute}, .lower = 1, .upper = 1,
-     .arguments = {2, 2}, .uuid = "11e3a00d-4556-3b7b-ae5b-7ad75ad2b0aa"},
+     .arguments = {2, 2}, .invoker = support::makeInvokerOf<&AttributeMap::Impl::emplace>,
+     .uuid = "11e3a00d-4556-3b7b-ae5b-7ad75ad2b0aa"},
     {.name = u"at", .type = {Classes, rows::classes::Attribute}, .lower = 1, .upper = 1,
-     .arguments = {4, 1}, .uuid = "d126c5eb-1c7e-3600-88d3-9f0e82593835"},
+     .arguments = {4, 1}, .invoker = support::makeInvokerOf<&AttributeMap::Impl::at>,
+     .uuid = "d126c5eb-1c7e-3600-88d3-9f0e82593835"},
     {.name = u"recursiveAt", .type = {Classes, rows::classes::Attribute}, .lower = 1, .upper = 1,
-     .arguments = {5, 1}, .uuid = "60648636-9d2f-3e7a-86a2-0908f61121da"},
-    {.name = u"eraseValue", .arguments = {6, 1}, .uuid = "72bc3dcb-578f-36ef-85ec-139c30f840bf"},
-    {.name = u"erase", .arguments = {7, 1}, .uuid = "edb45145-a046-3deb-abde-332af4fd03b5"},
-    {.name = u"removeValue", .arguments = {8, 1}, .uuid = "9057d92a-7c4e-3e90-98ad-4a3f2542b5d2"},
-    {.name = u"remove", .arguments = {9, 1}, .uuid = "7ae5eb84-9ae2-3347-8ffc-10b6a1900401"},
+     .arguments = {5, 1}, .invoker = support::makeInvokerOf<&AttributeMap::Impl::recursiveAt>,
+     .uuid = "60648636-9d2f-3e7a-86a2-0908f61121da"},
+    {.name = u"eraseValue", .arguments = {6, 1},
+     .invoker = support::makeInvokerOf<&AttributeMap::Impl::eraseValue>,
+     .uuid = "72bc3dcb-578f-36ef-85ec-139c30f840bf"},
+    {.name = u"erase", .arguments = {7, 1},
+     .invoker = support::makeInvokerOf<&AttributeMap::Impl::erase>,
+     .uuid = "edb45145-a046-3deb-abde-332af4fd03b5"},
+    {.name = u"removeValue", .arguments = {8, 1},
+     .invoker = support::makeInvokerOf<&AttributeMap::Impl::removeValue>,
+     .uuid = "9057d92a-7c4e-3e90-98ad-4a3f2542b5d2"},
+    {.name = u"remove", .arguments = {9, 1},
+     .invoker = support::makeInvokerOf<&AttributeMap::Impl::remove>,
+     .uuid = "7ae5eb84-9ae2-3347-8ffc-10b6a1900401"},
     {.name = u"doRecurse", .type = {Classes, rows::classes::Attribute}, .lower = 1, .upper = 1,
-     .flags = NOT_PUBLIC, .arguments = {10, 3}, .uuid = "86ccc13d-38d6-36f0-9399-c5f426ab274a"},
+     .flags = NOT_PUBLIC, .arguments = {10, 3},
+     .invoker = support::makeInvokerOf<&AttributeMap::Impl::doRecurse>,
+     .uuid = "86ccc13d-38d6-36f0-9399-c5f426ab274a"},
     {.name = u"instantiate", .type = {u"ModelElement"}, .lower = 1, .upper = 1,
      .arguments = {13, 2}, .uuid = "fbe5d3fc-0569-3a54-8a95-af03c34d2671"},
     {.name = u"findLiteralByValue", .type = {Classes, rows::classes::EnumLiteral}, .lower = 1,
-     .upper = 1, .arguments = {15, 1}, .uuid = "dc668744-f59a-3a7f-9bb8-f5e4ea550abc"},
+     .upper = 1, .arguments = {15, 1},
+     .invoker = support::makeInvokerOf<&Enum::Impl::findLiteralByValue>,
+     .uuid = "dc668744-f59a-3a7f-9bb8-f5e4ea550abc"},
     {.name = u"findLiteralByPublicIdentifier", .type = {Classes, rows::classes::EnumLiteral},
-     .lower = 1, .upper = 1, .arguments = {16, 1}, .uuid = "49db4368-8fa2-365b-84e2-6ea08f8ffba8"},
+     .lower = 1, .upper = 1, .arguments = {16, 1},
+     .invoker = support::makeInvokerOf<&Enum::Impl::findLiteralByPublicIdentifier>,
+     .uuid = "49db4368-8fa2-365b-84e2-6ea08f8ffba8"},
     {.name = u"createPrototype", .type = {DataTypes, rows::dataTypes::ExtensionPrototype},
-     .lower = 1, .upper = 1, .uuid = "09600bbe-603c-3cd6-9005-b15791d42191"},
+     .lower = 1, .upper = 1, .invoker = support::makeInvokerOf<&Extension::Impl::createPrototype>,
+     .uuid = "09600bbe-603c-3cd6-9005-b15791d42191"},
     {.name = u"isDynamicDefault", .type = {u"Boolean"}, .lower = 1, .upper = 1,
      .uuid = "47951ee7-39c9-33bc-b4f4-34d9c43dfe27"},
     {.name = u"getPropertyByName", .type = {Classes, rows::classes::Property}, .lower = 1,
-     .upper = 1, .arguments = {17, 1}, .uuid = "18dc90a9-9427-31b4-b3e2-29a9dad3705f"},
+     .upper = 1, .arguments = {17, 1},
+     .invoker = support::makeInvokerOf<&StructuredType::Impl::getPropertyByName>,
+     .uuid = "18dc90a9-9427-31b4-b3e2-29a9dad3705f"},
     {.name = u"getOperationsByName", .type = {Classes, rows::classes::Operation}, .lower = 0,
      .upper = support::UNBOUNDED, .arguments = {18, 1},
+     .invoker = support::makeInvokerOf<&StructuredType::Impl::getOperationsByName>,
      .uuid = "98db05c0-0fa0-3f5f-a79a-9efc6ea027a5"},
     {.name = u"isATypeOf", .type = {u"Boolean"}, .lower = 1, .upper = 1, .arguments = {19, 1},
+     .invoker = support::makeInvokerOf<&StructuredType::Impl::isATypeOf>,
      .uuid = "66da7b1a-8079-30ba-bdcf-8bbb447efd88"},
     {.name = u"isA", .type = {u"Boolean"}, .lower = 1, .upper = 1, .arguments = {20, 1},
+     .invoker = support::makeInvokerOf<&Type::Impl::isA>,
      .uuid = "e0a5940e-12d3-3ebb-bdd2-d06d70f407f8"},
 };
 

@@ -3,15 +3,19 @@
 #include "tarnkiln/collections/PrimitiveSequence.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/meta/AbstractMethodInvoker.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/DataTypeImpl.h"
 #include "tarnkiln/meta/EnumImpl.h"
 #include "tarnkiln/meta/EnumLiteralImpl.h"
+#include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 
 #include <boost/lexical_cast.hpp>
 #include <boost/uuid/uuid_io.hpp>
+
+#include <utility>
 
 namespace tarn::kiln::meta {
 namespace {
@@ -87,6 +91,12 @@ EnumLiteral AbstractMetaPackage::createEnumLiteral(ustring const& name, int valu
 void AbstractMetaPackage::setPropertyIndex(Property const& property, int index) const
 {
     property->setPropertyIndex(index);
+}
+
+void AbstractMetaPackage::setInvoker(Operation const& operation,
+                                     std::unique_ptr<AbstractMethodInvoker> invoker)
+{
+    operation->setInvoker(std::move(invoker));
 }
 
 void AbstractMetaPackage::registerRootPackage(Package const& package) const

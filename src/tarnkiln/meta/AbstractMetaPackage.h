@@ -8,6 +8,7 @@
 #include "tarnkiln/meta/MetaRegistry.h"
 
 #include <initializer_list>
+#include <memory>
 
 namespace tarn::kiln::meta {
 
@@ -44,6 +45,9 @@ public:
     /// @}
 
     void setPropertyIndex(Property const& property, int index) const;
+    /// Gives the operation what calls by reflection run, in place of what it had, which is
+    /// destroyed.
+    void setInvoker(Operation const& operation, std::unique_ptr<AbstractMethodInvoker> invoker);
 
     /// \name The registry; the caller of the first two holds a `LockedModel`
     /// @{

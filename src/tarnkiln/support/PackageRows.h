@@ -21,10 +21,6 @@
 #include <memory>
 #include <span>
 
-namespace tarn::kiln::meta {
-class AbstractMethodInvoker;
-}
-
 namespace tarn::kiln::support {
 
 /// The upper bound that stands for any number of values.

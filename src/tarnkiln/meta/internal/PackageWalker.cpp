@@ -4,6 +4,7 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/meta/AbstractMetaPackage.h"
+#include "tarnkiln/meta/AbstractMethodInvoker.h"
 #include "tarnkiln/meta/ArgumentImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/DataTypeImpl.h"
@@ -60,8 +61,8 @@ meta::Type requireType(char16_t const* name)
 }
 }  // namespace
 
-PackageWalker::PackageWalker(meta::AbstractMetaPackage const& package,
-                             support::PackageRows const& rows, support::PackageElements& elements)
+PackageWalker::PackageWalker(meta::AbstractMetaPackage& package, support::PackageRows const& rows,
+                             support::PackageElements& elements)
     : m_package(package),
       m_rows(rows),
       m_elements(elements)
@@ -278,6 +279,8 @@ void PackageWalker::connectOperation(std::size_t number, meta::StructuredType co
     operation->setLower(row.lower);
     operation->setUpper(row.upper);
     operation->setIsOrdered(row.isOrdered);
+    if (row.invoker)
+        m_package.setInvoker(operation, row.invoker(operation));
 }
 
 void PackageWalker::connectEnum(std::size_t number)

@@ -19,7 +19,7 @@ namespace tarn::kiln::internal {
 class PackageWalker
 {
 public:
-    PackageWalker(meta::AbstractMetaPackage const& package, support::PackageRows const& rows,
+    PackageWalker(meta::AbstractMetaPackage& package, support::PackageRows const& rows,
                   support::PackageElements& elements);
 
     /// \throws tarnkiln::messages::NoSuchType  (name) if a required type is not registered.
@@ -46,7 +46,7 @@ private:
     meta::Type typeOf(support::TypeReference const& reference) const;
     meta::Property propertyOf(support::PropertyReference const& reference) const;
 
-    meta::AbstractMetaPackage const& m_package;
+    meta::AbstractMetaPackage& m_package;
     support::PackageRows const& m_rows;
     support::PackageElements& m_elements;
 };
