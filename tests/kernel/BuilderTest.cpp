@@ -257,6 +257,15 @@ TEST_F(AnOrchestrator, LeavesABuilderToTheOneThatHasIt)
     first.commit();
 }
 
+TEST_F(AnOrchestrator, NeedsABuilderWithAModel)
+{
+    Plain::Builder builder;
+
+    EXPECT_RAISES_WITH(messages::CannotCreateWithoutModel, Orchestrator{&builder});
+
+    EXPECT_EQ(builder.getOrchestrator(), nullptr);
+}
+
 TEST_F(AnOrchestrator, LetsGoOfAllBuildersWhenItCommits)
 {
     Plain::Builder builder(model);

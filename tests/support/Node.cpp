@@ -1,9 +1,11 @@
 #include "tests/support/NodeImpl.h"
 
 #include "tarnkiln/collections/ElementMultimap.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
+#include "tests/support/NodeBuilder.h"
 #include "tests/support/NodeMetamodel.h"
 
 #include <atomic>
@@ -101,9 +103,20 @@ Node::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id)
     ++nodesInMemory;
 }
 
+Node::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values.getBuilder(), id)
+{
+    values.construct(*this);
+    ++nodesInMemory;
+}
+
 Node::Impl::~Impl()
 {
     --nodesInMemory;
+}
+
+void Node::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
 }
 
 void Node::Impl::setName(ustring const& name)
@@ -444,8 +457,17 @@ PrimitiveSet<ustring>& Node::Impl::getWords() const
 {
     return support::shownCollection(*this, m_words, &Impl::makeWords);
 }
+
+Node::Builder::Builder() = default;
+
+Node::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Node::Builder::~Builder() = default;
 }  // namespace testkit
 
 template class tarn::kiln::support::Record<testkit::Node::Impl,
                                            tarn::kiln::ModelElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<testkit::Node::Impl, tarn::kiln::ModelElement::Impl>;
+template class tarn::kiln::support::BuilderValues<testkit::Node::Impl,
+                                                  tarn::kiln::support::BuilderRoot>;
+template class tarn::kiln::support::BuilderTop<testkit::Node::Builder>;

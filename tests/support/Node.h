@@ -13,7 +13,8 @@ using namespace tarn::kiln;
 class Node : public ModelElement
 {
 public:
-    class Impl;  // NodeImpl.h
+    class Impl;     // NodeImpl.h
+    class Builder;  // NodeBuilder.h
 
     Node() = default;
     explicit Node(Impl* impl);  ///< Shares `impl`; null gives the empty handle.

@@ -22,6 +22,9 @@ namespace testkit {
 class Node::Impl : public support::Dispatched<Node::Impl, ModelElement::Impl>
 {
 public:
+    class BuilderImpl;                         // NodeBuilder.h
+    template <class Final> class BuilderBase;  // NodeBuilder.h
+
     using Handle = Node;
     using Storage = support::Record<Impl, ModelElement::Impl::Storage>;
 
@@ -58,7 +61,12 @@ public:
     static Slot const WORDS;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The key of `byName` and `grouped`.
     ustring const& getName() const { return m_name; }

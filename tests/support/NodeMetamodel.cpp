@@ -1,6 +1,5 @@
 #include "tests/support/NodeMetamodel.h"
 
-#include "tarnkiln/kernel/ModelElementBuilder.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/MetaRegistry.h"
@@ -8,11 +7,10 @@
 #include "tarnkiln/meta/PrimitiveTypeImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
-#include "tests/support/NodeImpl.h"
-#include "tests/support/SpecialNodeImpl.h"
+#include "tests/support/NodeBuilder.h"
+#include "tests/support/SpecialNodeBuilder.h"
 
 #include <iterator>
-#include <memory>
 
 namespace testkit {
 
@@ -140,29 +138,6 @@ meta::Property makeProperty(Model const& model, PropertyRow const& row, int inde
     made->setPropertyIndex(index);
     return made;
 }
-
-/// Builds elements without setting any of their properties.
-template <class Handle> class BareBuilder final : public ModelElement::Builder
-{
-public:
-    explicit BareBuilder(Model const& model) : Builder(model, Handle::Impl::SLOTS) {}
-
-    meta::Class const& getMetaClass() const override { return Handle::metaClass(); }
-
-    static std::unique_ptr<ModelElement::Builder> make(Model const& model)
-    {
-        return std::make_unique<BareBuilder>(model);
-    }
-
-protected:
-    ModelElement doCreate(bool proxy, UUID const& id) override
-    {
-        Handle const made(new typename Handle::Impl(getModel(), id));
-        if (!proxy)
-            made->notifyCreated();
-        return made;
-    }
-};
 }  // namespace
 
 NodeMetamodel const& NodeMetamodel::get()
@@ -196,7 +171,7 @@ NodeMetamodel::NodeMetamodel()
     }
     transaction.commit();
 
-    registry.registerType(node, BareBuilder<Node>::make);
-    registry.registerType(specialNode, BareBuilder<SpecialNode>::make);
+    registry.registerType(node, Node::Builder::instantiate);
+    registry.registerType(specialNode, SpecialNode::Builder::instantiate);
 }
 }  // namespace testkit

@@ -1,8 +1,10 @@
 #include "tests/support/SpecialNodeImpl.h"
 
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tests/support/NodeMetamodel.h"
+#include "tests/support/SpecialNodeBuilder.h"
 
 namespace testkit {
 
@@ -25,7 +27,17 @@ SpecialNode SpecialNode::create(Model const& model, UUID const& id)
 
 SpecialNode::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+SpecialNode::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 SpecialNode::Impl::~Impl() = default;
+
+void SpecialNode::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void SpecialNode::Impl::setLevel(int level)
 {
@@ -46,8 +58,17 @@ void SpecialNode::Impl::setMentor(SpecialNode const& mentor)
 {
     support::setReference(*this, m_mentor, MENTOR, mentor.getImpl());
 }
+
+SpecialNode::Builder::Builder() = default;
+
+SpecialNode::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+SpecialNode::Builder::~Builder() = default;
 }  // namespace testkit
 
 template class tarn::kiln::support::Record<testkit::SpecialNode::Impl,
                                            testkit::Node::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<testkit::SpecialNode::Impl, testkit::Node::Impl>;
+template class tarn::kiln::support::BuilderValues<testkit::SpecialNode::Impl,
+                                                  testkit::Node::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<testkit::SpecialNode::Builder>;

@@ -11,7 +11,8 @@ namespace testkit {
 class SpecialNode : public Node
 {
 public:
-    class Impl;  // SpecialNodeImpl.h
+    class Impl;     // SpecialNodeImpl.h
+    class Builder;  // SpecialNodeBuilder.h
 
     SpecialNode() = default;
     explicit SpecialNode(Impl* impl);  ///< Shares `impl`; null gives the empty handle.

@@ -13,6 +13,9 @@ namespace testkit {
 class SpecialNode::Impl : public support::Dispatched<SpecialNode::Impl, Node::Impl>
 {
 public:
+    class BuilderImpl;                         // SpecialNodeBuilder.h
+    template <class Final> class BuilderBase;  // SpecialNodeBuilder.h
+
     using Handle = SpecialNode;
     using Storage = support::Record<Impl, Node::Impl::Storage>;
 
@@ -21,7 +24,12 @@ public:
     static Slot const MENTOR;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// A number.
     int getLevel() const { return m_level; }

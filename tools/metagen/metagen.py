@@ -7,12 +7,14 @@ import sys
 
 import jinja2
 
+import builders
 import load
 import rows
 import source
 
 ROOT = pathlib.Path(__file__).resolve().parent
-PER_CLASS = {"Handle.h": "{name}.h", "Impl.h": "{name}Impl.h", "Class.cpp": "{name}.cpp"}
+PER_CLASS = {"Handle.h": "{name}.h", "Impl.h": "{name}Impl.h",
+             "Builder.h": "{name}Builder.h", "Class.cpp": "{name}.cpp"}
 ROWS = {"Rows.h": ".h", "Rows.cpp": ".cpp"}
 PER_CATALOGUE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt"}
 # What a client has besides.
@@ -44,7 +46,9 @@ def render(package, command):
             for entry in entries:
                 add(template, pattern.format(name=entry.name), c=entry)
 
-    add_each(PER_CLASS, package.classes)
+    for template, pattern in PER_CLASS.items():
+        for cls in package.classes:
+            add(template, pattern.format(name=cls.name), c=cls, b=builders.Builder(cls))
     add_each(PER_ENUMERATION, package.enumerations)
     add_each(PER_DATA_TYPE, package.data_types)
     for template, name in (PER_CATALOGUE if package.is_catalogue else PER_CLIENT).items():

@@ -22,11 +22,11 @@ def comment(text, indent=0):
     return "\n".join((prefix + line).rstrip() for line in lines)
 
 
-def fill(head, items, tail, indent):
+def fill(head, items, tail, indent, width=WIDTH):
     """A list on one line if it fits; else on lines of its own, `indent` deep, each as full as may
     be."""
     line = head + ", ".join(items) + tail
-    if len(line) <= WIDTH:
+    if len(line) <= width:
         return line
     lines, current = [head.rstrip()] if head.strip() else [], " " * indent
     for position, item in enumerate(items):
@@ -442,6 +442,10 @@ class Class:
         return self.header(f"{self.name}Impl")
 
     @property
+    def builder_header(self):
+        return self.header(f"{self.name}Builder")
+
+    @property
     def impl_includes(self):
         headers = {self.handle_header, "tarnkiln/support/Dispatch.h"}
         if self.base:
@@ -474,8 +478,9 @@ class Class:
 
     @property
     def source_includes(self):
-        headers = {"tarnkiln/support/DispatchSteps.h", "tarnkiln/support/Handle.h",
-                   self.package.meta_package_header}
+        headers = {self.builder_header, self.package.meta_package_header,
+                   "tarnkiln/support/BuilderSteps.h", "tarnkiln/support/DispatchSteps.h",
+                   "tarnkiln/support/Handle.h"}
         for prop in self.stored:
             if prop.target:
                 headers.add(prop.target.impl_header)

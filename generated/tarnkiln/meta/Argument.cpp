@@ -1,8 +1,10 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/ArgumentImpl.h"
 
+#include "tarnkiln/meta/ArgumentBuilder.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/OperationImpl.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -31,7 +33,17 @@ Argument Argument::create(Model const& model, UUID const& id)
 
 Argument::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Argument::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Argument::Impl::~Impl() = default;
+
+void Argument::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 Operation Argument::Impl::getOperation() const
 {
@@ -57,9 +69,18 @@ void Argument::Impl::setIsInput(bool input)
 {
     support::setScalar(*this, m_isInput, IS_INPUT, input);
 }
+
+Argument::Builder::Builder() = default;
+
+Argument::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Argument::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Argument::Impl, tarn::kiln::meta::TypedElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Argument::Impl, tarn::kiln::meta::TypedElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Argument::Impl, tarn::kiln::meta::TypedElement::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Argument::Builder>;

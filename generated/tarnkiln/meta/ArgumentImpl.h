@@ -21,6 +21,9 @@ class TARNKILN_EXPORT Argument::Impl
     : public support::Dispatched<Argument::Impl, TypedElement::Impl>
 {
 public:
+    class BuilderImpl;                         // ArgumentBuilder.h
+    template <class Final> class BuilderBase;  // ArgumentBuilder.h
+
     using Handle = Argument;
     using Storage = support::Record<Impl, TypedElement::Impl::Storage>;
 
@@ -29,7 +32,12 @@ public:
     static Slot const IS_INPUT;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The operation whose argument this is.
     Operation getOperation() const;

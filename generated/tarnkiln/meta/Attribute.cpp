@@ -2,8 +2,10 @@
 #include "tarnkiln/meta/AttributeImpl.h"
 
 #include "tarnkiln/collections/ElementMap.h"
+#include "tarnkiln/meta/AttributeBuilder.h"
 #include "tarnkiln/meta/AttributeMapImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -28,7 +30,17 @@ meta::Class const& Attribute::metaClass()
 
 Attribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Attribute::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values.getBuilder(), id)
+{
+    values.construct(*this);
+}
+
 Attribute::Impl::~Impl() = default;
+
+void Attribute::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void Attribute::Impl::setKey(ustring const& key)
 {
@@ -61,9 +73,18 @@ void Attribute::Impl::setOwner(AttributeMap const& owner)
     };
     support::setContainer(*this, OWNER, owner.getImpl(), requireFree);
 }
+
+Attribute::Builder::Builder() = default;
+
+Attribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Attribute::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Attribute::Impl, tarn::kiln::ModelElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Attribute::Impl, tarn::kiln::ModelElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Attribute::Impl, tarn::kiln::support::BuilderRoot>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Attribute::Builder>;

@@ -21,6 +21,9 @@ class TARNKILN_EXPORT Attribute::Impl
     : public support::Dispatched<Attribute::Impl, ModelElement::Impl>
 {
 public:
+    class BuilderImpl;                         // AttributeBuilder.h
+    template <class Final> class BuilderBase;  // AttributeBuilder.h
+
     using Handle = Attribute;
     using Storage = support::Record<Impl, ModelElement::Impl::Storage>;
 
@@ -29,7 +32,12 @@ public:
     static Slot const OWNER;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// What the map knows the attribute by.
     /// \throws tarnkiln::messages::UniquenessConstraint  if the owner has another such key.

@@ -2,7 +2,9 @@
 #include "tarnkiln/meta/AttributeMapImpl.h"
 
 #include "tarnkiln/meta/AttributeImpl.h"
+#include "tarnkiln/meta/AttributeMapBuilder.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -30,7 +32,17 @@ AttributeMap AttributeMap::create(Model const& model, UUID const& id)
 
 AttributeMap::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+AttributeMap::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values.getBuilder(), id)
+{
+    values.construct(*this);
+}
+
 AttributeMap::Impl::~Impl() = default;
+
+void AttributeMap::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 std::unique_ptr<ElementMap<ustring, Attribute>> AttributeMap::Impl::makeAttributes(Impl* owner)
 {
@@ -44,9 +56,18 @@ ElementMap<ustring, Attribute>& AttributeMap::Impl::getAttributes() const
 {
     return support::shownCollection(*this, m_attributes, &Impl::makeAttributes);
 }
+
+AttributeMap::Builder::Builder() = default;
+
+AttributeMap::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+AttributeMap::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::AttributeMap::Impl, tarn::kiln::ModelElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::AttributeMap::Impl, tarn::kiln::ModelElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::AttributeMap::Impl, tarn::kiln::support::BuilderRoot>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::AttributeMap::Builder>;

@@ -1,8 +1,10 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/AttributeMapAttributeImpl.h"
 
+#include "tarnkiln/meta/AttributeMapAttributeBuilder.h"
 #include "tarnkiln/meta/AttributeMapImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -29,7 +31,17 @@ AttributeMapAttribute AttributeMapAttribute::create(Model const& model, UUID con
 
 AttributeMapAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+AttributeMapAttribute::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 AttributeMapAttribute::Impl::~Impl() = default;
+
+void AttributeMapAttribute::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 AttributeMap AttributeMapAttribute::Impl::getValue() const
 {
@@ -45,9 +57,18 @@ void AttributeMapAttribute::Impl::setValue(AttributeMap const& value)
 {
     support::setReference(*this, m_value, VALUE, value.getImpl());
 }
+
+AttributeMapAttribute::Builder::Builder() = default;
+
+AttributeMapAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+AttributeMapAttribute::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::AttributeMapAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::AttributeMapAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::AttributeMapAttribute::Impl, tarn::kiln::meta::Attribute::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::AttributeMapAttribute::Builder>;

@@ -21,6 +21,9 @@ class TARNKILN_EXPORT AttributeMapAttribute::Impl
     : public support::Dispatched<AttributeMapAttribute::Impl, Attribute::Impl>
 {
 public:
+    class BuilderImpl;                         // AttributeMapAttributeBuilder.h
+    template <class Final> class BuilderBase;  // AttributeMapAttributeBuilder.h
+
     using Handle = AttributeMapAttribute;
     using Storage = support::Record<Impl, Attribute::Impl::Storage>;
 
@@ -28,7 +31,12 @@ public:
     static Slot const VALUE;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The map inside.
     AttributeMap getValue() const;

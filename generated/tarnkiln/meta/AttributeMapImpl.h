@@ -24,6 +24,9 @@ class TARNKILN_EXPORT AttributeMap::Impl
     : public support::Dispatched<AttributeMap::Impl, ModelElement::Impl>
 {
 public:
+    class BuilderImpl;                         // AttributeMapBuilder.h
+    template <class Final> class BuilderBase;  // AttributeMapBuilder.h
+
     using Handle = AttributeMap;
     using Storage = support::Record<Impl, ModelElement::Impl::Storage>;
 
@@ -31,7 +34,12 @@ public:
     static Slot const ATTRIBUTES;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The element that contains the map.
     ModelElement getOwner() const;

@@ -1,7 +1,9 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/BooleanAttributeImpl.h"
 
+#include "tarnkiln/meta/BooleanAttributeBuilder.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -27,15 +29,34 @@ BooleanAttribute BooleanAttribute::create(Model const& model, UUID const& id)
 
 BooleanAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+BooleanAttribute::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 BooleanAttribute::Impl::~Impl() = default;
+
+void BooleanAttribute::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void BooleanAttribute::Impl::setValue(bool value)
 {
     support::setScalar(*this, m_value, VALUE, value);
 }
+
+BooleanAttribute::Builder::Builder() = default;
+
+BooleanAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+BooleanAttribute::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::BooleanAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::BooleanAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::BooleanAttribute::Impl, tarn::kiln::meta::Attribute::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::BooleanAttribute::Builder>;

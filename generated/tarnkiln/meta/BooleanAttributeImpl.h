@@ -20,6 +20,9 @@ class TARNKILN_EXPORT BooleanAttribute::Impl
     : public support::Dispatched<BooleanAttribute::Impl, Attribute::Impl>
 {
 public:
+    class BuilderImpl;                         // BooleanAttributeBuilder.h
+    template <class Final> class BuilderBase;  // BooleanAttributeBuilder.h
+
     using Handle = BooleanAttribute;
     using Storage = support::Record<Impl, Attribute::Impl::Storage>;
 
@@ -27,7 +30,12 @@ public:
     static Slot const VALUE;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The value.
     bool getValue() const { return m_value; }

@@ -1,8 +1,10 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/ClassImpl.h"
 
+#include "tarnkiln/meta/ClassBuilder.h"
 #include "tarnkiln/meta/DynamicExtensionsImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -34,7 +36,17 @@ Class Class::create(Model const& model, UUID const& id)
 
 Class::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Class::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Class::Impl::~Impl() = default;
+
+void Class::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 Class Class::Impl::getSuperclass() const
 {
@@ -69,9 +81,18 @@ void Class::Impl::setIsAbstract(bool abstract)
 {
     support::setScalar(*this, m_isAbstract, IS_ABSTRACT, abstract);
 }
+
+Class::Builder::Builder() = default;
+
+Class::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Class::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Class::Impl, tarn::kiln::meta::StructuredType::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Class::Impl, tarn::kiln::meta::StructuredType::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Class::Impl, tarn::kiln::meta::StructuredType::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Class::Builder>;

@@ -24,6 +24,9 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Class::Impl : public support::Dispatched<Class::Impl, StructuredType::Impl>
 {
 public:
+    class BuilderImpl;                         // ClassBuilder.h
+    template <class Final> class BuilderBase;  // ClassBuilder.h
+
     using Handle = Class;
     using Storage = support::Record<Impl, StructuredType::Impl::Storage>;
 
@@ -33,7 +36,12 @@ public:
     static Slot const IS_ABSTRACT;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The class that this one extends.
     Class getSuperclass() const;

@@ -1,7 +1,9 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/DataTypeImpl.h"
 
+#include "tarnkiln/meta/DataTypeBuilder.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -24,10 +26,29 @@ DataType DataType::create(Model const& model, UUID const& id)
 
 DataType::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+DataType::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 DataType::Impl::~Impl() = default;
+
+void DataType::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
+
+DataType::Builder::Builder() = default;
+
+DataType::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+DataType::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::DataType::Impl, tarn::kiln::meta::StructuredType::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::DataType::Impl, tarn::kiln::meta::StructuredType::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::DataType::Impl, tarn::kiln::meta::StructuredType::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::DataType::Builder>;

@@ -20,13 +20,21 @@ class TARNKILN_EXPORT DataType::Impl
     : public support::Dispatched<DataType::Impl, StructuredType::Impl>
 {
 public:
+    class BuilderImpl;                         // DataTypeBuilder.h
+    template <class Final> class BuilderBase;  // DataTypeBuilder.h
+
     using Handle = DataType;
     using Storage = support::Record<Impl, StructuredType::Impl::Storage>;
 
     static constexpr unsigned long SLOTS = 9;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
 private:
 public:

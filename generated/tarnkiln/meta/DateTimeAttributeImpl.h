@@ -22,6 +22,9 @@ class TARNKILN_EXPORT DateTimeAttribute::Impl
     : public support::Dispatched<DateTimeAttribute::Impl, Attribute::Impl>
 {
 public:
+    class BuilderImpl;                         // DateTimeAttributeBuilder.h
+    template <class Final> class BuilderBase;  // DateTimeAttributeBuilder.h
+
     using Handle = DateTimeAttribute;
     using Storage = support::Record<Impl, Attribute::Impl::Storage>;
 
@@ -29,7 +32,12 @@ public:
     static Slot const VALUE;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The value.
     boost::posix_time::ptime const& getValue() const { return m_value; }

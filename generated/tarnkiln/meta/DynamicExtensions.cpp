@@ -3,8 +3,10 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/DynamicExtensionsBuilder.h"
 #include "tarnkiln/meta/ExtensionImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -38,7 +40,18 @@ DynamicExtensions DynamicExtensions::create(Model const& model, UUID const& id)
 
 DynamicExtensions::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+DynamicExtensions::Impl::Impl(BuilderImpl& values, UUID const& id)
+    : Dispatched(values.getBuilder(), id)
+{
+    values.construct(*this);
+}
+
 DynamicExtensions::Impl::~Impl() = default;
+
+void DynamicExtensions::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 std::unique_ptr<ElementMap<ustring, Extension>> DynamicExtensions::Impl::makeExtensions(Impl* owner)
 {
@@ -75,9 +88,18 @@ void DynamicExtensions::Impl::setOwningClass(Class const& owningClass)
     };
     support::setContainer(*this, OWNING_CLASS, owningClass.getImpl(), requireFree);
 }
+
+DynamicExtensions::Builder::Builder() = default;
+
+DynamicExtensions::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+DynamicExtensions::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::DynamicExtensions::Impl, tarn::kiln::ModelElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::DynamicExtensions::Impl, tarn::kiln::ModelElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::DynamicExtensions::Impl, tarn::kiln::support::BuilderRoot>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::DynamicExtensions::Builder>;

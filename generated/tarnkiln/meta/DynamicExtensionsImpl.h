@@ -24,6 +24,9 @@ class TARNKILN_EXPORT DynamicExtensions::Impl
     : public support::Dispatched<DynamicExtensions::Impl, ModelElement::Impl>
 {
 public:
+    class BuilderImpl;                         // DynamicExtensionsBuilder.h
+    template <class Final> class BuilderBase;  // DynamicExtensionsBuilder.h
+
     using Handle = DynamicExtensions;
     using Storage = support::Record<Impl, ModelElement::Impl::Storage>;
 
@@ -33,7 +36,12 @@ public:
     static Slot const OWNING_CLASS;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The id of the model that declares them.
     /// \throws tarnkiln::messages::UniquenessConstraint  if the owner has another such key.

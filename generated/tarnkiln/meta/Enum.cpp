@@ -1,9 +1,11 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/EnumImpl.h"
 
+#include "tarnkiln/meta/EnumBuilder.h"
 #include "tarnkiln/meta/EnumLiteralImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PrimitiveTypeImpl.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -33,7 +35,17 @@ Enum Enum::create(Model const& model, UUID const& id)
 
 Enum::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Enum::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Enum::Impl::~Impl() = default;
+
+void Enum::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 std::unique_ptr<ElementMap<ustring, EnumLiteral>> Enum::Impl::makeLiterals(Impl* owner)
 {
@@ -62,9 +74,18 @@ void Enum::Impl::setUnderlyingType(PrimitiveType const& underlyingType)
 {
     support::setReference(*this, m_underlyingType, UNDERLYING_TYPE, underlyingType.getImpl());
 }
+
+Enum::Builder::Builder() = default;
+
+Enum::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Enum::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Enum::Impl, tarn::kiln::meta::Type::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Enum::Impl, tarn::kiln::meta::Type::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Enum::Impl, tarn::kiln::meta::Type::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Enum::Builder>;

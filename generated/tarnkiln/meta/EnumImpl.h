@@ -24,6 +24,9 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Enum::Impl : public support::Dispatched<Enum::Impl, Type::Impl>
 {
 public:
+    class BuilderImpl;                         // EnumBuilder.h
+    template <class Final> class BuilderBase;  // EnumBuilder.h
+
     using Handle = Enum;
     using Storage = support::Record<Impl, Type::Impl::Storage>;
 
@@ -32,7 +35,12 @@ public:
     static Slot const UNDERLYING_TYPE;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The literals, by name.
     ElementMap<ustring, EnumLiteral>& getLiterals() const;

@@ -3,7 +3,9 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/EnumLiteralBuilder.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -35,7 +37,17 @@ EnumLiteral EnumLiteral::create(Model const& model, UUID const& id)
 
 EnumLiteral::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+EnumLiteral::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 EnumLiteral::Impl::~Impl() = default;
+
+void EnumLiteral::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void EnumLiteral::Impl::setValue(int value)
 {
@@ -78,9 +90,18 @@ void EnumLiteral::Impl::setName(ustring const& name)
     auto const store = [&] { NamedElement::Impl::setName(name); };
     support::changeKey(*this, getName(), name, getParentEnum(), PARENT_ENUM, requireFree, store);
 }
+
+EnumLiteral::Builder::Builder() = default;
+
+EnumLiteral::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+EnumLiteral::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::EnumLiteral::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::EnumLiteral::Impl, tarn::kiln::meta::NamedElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::EnumLiteral::Impl, tarn::kiln::meta::NamedElement::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::EnumLiteral::Builder>;

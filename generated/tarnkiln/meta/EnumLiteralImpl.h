@@ -23,6 +23,9 @@ class TARNKILN_EXPORT EnumLiteral::Impl
     : public support::Dispatched<EnumLiteral::Impl, NamedElement::Impl>
 {
 public:
+    class BuilderImpl;                         // EnumLiteralBuilder.h
+    template <class Final> class BuilderBase;  // EnumLiteralBuilder.h
+
     using Handle = EnumLiteral;
     using Storage = support::Record<Impl, NamedElement::Impl::Storage>;
 
@@ -32,7 +35,12 @@ public:
     static Slot const PUBLIC_IDENTIFIER;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The number; a sibling may have the same.
     int getValue() const { return m_value; }

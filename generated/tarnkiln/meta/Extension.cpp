@@ -3,7 +3,9 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/DynamicExtensionsImpl.h"
+#include "tarnkiln/meta/ExtensionBuilder.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -31,7 +33,17 @@ Extension Extension::create(Model const& model, UUID const& id)
 
 Extension::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Extension::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Extension::Impl::~Impl() = default;
+
+void Extension::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 DynamicExtensions Extension::Impl::getOwner() const
 {
@@ -64,9 +76,18 @@ void Extension::Impl::setName(ustring const& name)
     auto const store = [&] { Property::Impl::setName(name); };
     support::changeKey(*this, getName(), name, getOwner(), OWNER, requireFree, store);
 }
+
+Extension::Builder::Builder() = default;
+
+Extension::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Extension::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Extension::Impl, tarn::kiln::meta::Property::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Extension::Impl, tarn::kiln::meta::Property::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Extension::Impl, tarn::kiln::meta::Property::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Extension::Builder>;

@@ -22,6 +22,9 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Extension::Impl : public support::Dispatched<Extension::Impl, Property::Impl>
 {
 public:
+    class BuilderImpl;                         // ExtensionBuilder.h
+    template <class Final> class BuilderBase;  // ExtensionBuilder.h
+
     using Handle = Extension;
     using Storage = support::Record<Impl, Property::Impl::Storage>;
 
@@ -29,7 +32,12 @@ public:
     static Slot const OWNER;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The class that it extends.
     Class getExtendedMetaclass() const;

@@ -1,7 +1,9 @@
 // Made from catalogue.json by `tools/metagen/metagen.py`; do not edit.
 #include "tarnkiln/meta/IntegerAttributeImpl.h"
 
+#include "tarnkiln/meta/IntegerAttributeBuilder.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -27,15 +29,34 @@ IntegerAttribute IntegerAttribute::create(Model const& model, UUID const& id)
 
 IntegerAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+IntegerAttribute::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 IntegerAttribute::Impl::~Impl() = default;
+
+void IntegerAttribute::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void IntegerAttribute::Impl::setValue(int value)
 {
     support::setScalar(*this, m_value, VALUE, value);
 }
+
+IntegerAttribute::Builder::Builder() = default;
+
+IntegerAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+IntegerAttribute::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::IntegerAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::IntegerAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::IntegerAttribute::Impl, tarn::kiln::meta::Attribute::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::IntegerAttribute::Builder>;

@@ -2,6 +2,8 @@
 #include "tarnkiln/meta/NamedElementImpl.h"
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/NamedElementBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -27,15 +29,34 @@ NamedElement NamedElement::create(Model const& model, UUID const& id)
 
 NamedElement::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+NamedElement::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values.getBuilder(), id)
+{
+    values.construct(*this);
+}
+
 NamedElement::Impl::~Impl() = default;
+
+void NamedElement::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void NamedElement::Impl::setName(ustring const& name)
 {
     support::setScalar(*this, m_name, NAME, name);
 }
+
+NamedElement::Builder::Builder() = default;
+
+NamedElement::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+NamedElement::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::NamedElement::Impl, tarn::kiln::ModelElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::NamedElement::Impl, tarn::kiln::ModelElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::NamedElement::Impl, tarn::kiln::support::BuilderRoot>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::NamedElement::Builder>;

@@ -19,6 +19,9 @@ class TARNKILN_EXPORT NamedElement::Impl
     : public support::Dispatched<NamedElement::Impl, ModelElement::Impl>
 {
 public:
+    class BuilderImpl;                         // NamedElementBuilder.h
+    template <class Final> class BuilderBase;  // NamedElementBuilder.h
+
     using Handle = NamedElement;
     using Storage = support::Record<Impl, ModelElement::Impl::Storage>;
 
@@ -26,7 +29,12 @@ public:
     static Slot const NAME;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The name.
     ustring const& getName() const { return m_name; }

@@ -4,7 +4,9 @@
 #include "tarnkiln/collections/ElementMultimap.h"
 #include "tarnkiln/meta/ArgumentImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/OperationBuilder.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -43,7 +45,17 @@ Operation Operation::create(Model const& model, UUID const& id)
 
 Operation::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Operation::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Operation::Impl::~Impl() = default;
+
+void Operation::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 std::unique_ptr<ElementSequence<Argument>> Operation::Impl::makeArguments(Impl* owner)
 {
@@ -101,9 +113,18 @@ void Operation::Impl::setName(ustring const& name)
     auto const store = [&] { TypedElement::Impl::setName(name); };
     support::changeKey(*this, getName(), name, getOwningType(), OWNING_TYPE, requireFree, store);
 }
+
+Operation::Builder::Builder() = default;
+
+Operation::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Operation::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Operation::Impl, tarn::kiln::meta::TypedElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Operation::Impl, tarn::kiln::meta::TypedElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Operation::Impl, tarn::kiln::meta::TypedElement::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Operation::Builder>;

@@ -25,6 +25,9 @@ class TARNKILN_EXPORT Operation::Impl
     : public support::Dispatched<Operation::Impl, TypedElement::Impl>
 {
 public:
+    class BuilderImpl;                         // OperationBuilder.h
+    template <class Final> class BuilderBase;  // OperationBuilder.h
+
     using Handle = Operation;
     using Storage = support::Record<Impl, TypedElement::Impl::Storage>;
 
@@ -37,7 +40,12 @@ public:
     static Slot const IS_EVENT;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The arguments, in the order of the call.
     ElementSequence<Argument>& getArguments() const;

@@ -3,7 +3,9 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/PackageBuilder.h"
 #include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -46,7 +48,17 @@ Package Package::create(Model const& model, UUID const& id)
 
 Package::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Package::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Package::Impl::~Impl() = default;
+
+void Package::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 std::unique_ptr<ElementMap<ustring, Type>> Package::Impl::makeOwnedTypes(Impl* owner)
 {
@@ -127,9 +139,18 @@ void Package::Impl::setName(ustring const& name)
     support::changeKey(
         *this, getName(), name, getParentPackage(), PARENT_PACKAGE, requireFree, store);
 }
+
+Package::Builder::Builder() = default;
+
+Package::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Package::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Package::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Package::Impl, tarn::kiln::meta::NamedElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Package::Impl, tarn::kiln::meta::NamedElement::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Package::Builder>;

@@ -26,6 +26,9 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Package::Impl : public support::Dispatched<Package::Impl, NamedElement::Impl>
 {
 public:
+    class BuilderImpl;                         // PackageBuilder.h
+    template <class Final> class BuilderBase;  // PackageBuilder.h
+
     using Handle = Package;
     using Storage = support::Record<Impl, NamedElement::Impl::Storage>;
 
@@ -38,7 +41,12 @@ public:
     static Slot const DEFAULT_VOBJ_CATEGORY;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The types, by name.
     ElementMap<ustring, Type>& getOwnedTypes() const;

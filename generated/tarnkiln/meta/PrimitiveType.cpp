@@ -2,6 +2,8 @@
 #include "tarnkiln/meta/PrimitiveTypeImpl.h"
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/PrimitiveTypeBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -24,10 +26,29 @@ PrimitiveType PrimitiveType::create(Model const& model, UUID const& id)
 
 PrimitiveType::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+PrimitiveType::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 PrimitiveType::Impl::~Impl() = default;
+
+void PrimitiveType::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
+
+PrimitiveType::Builder::Builder() = default;
+
+PrimitiveType::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+PrimitiveType::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::PrimitiveType::Impl, tarn::kiln::meta::Type::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::PrimitiveType::Impl, tarn::kiln::meta::Type::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::PrimitiveType::Impl, tarn::kiln::meta::Type::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::PrimitiveType::Builder>;

@@ -20,13 +20,21 @@ class TARNKILN_EXPORT PrimitiveType::Impl
     : public support::Dispatched<PrimitiveType::Impl, Type::Impl>
 {
 public:
+    class BuilderImpl;                         // PrimitiveTypeBuilder.h
+    template <class Final> class BuilderBase;  // PrimitiveTypeBuilder.h
+
     using Handle = PrimitiveType;
     using Storage = support::Record<Impl, Type::Impl::Storage>;
 
     static constexpr unsigned long SLOTS = 4;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
 private:
 public:

@@ -3,7 +3,9 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/PropertyBuilder.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -69,7 +71,17 @@ Property Property::create(Model const& model, UUID const& id)
 
 Property::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Property::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Property::Impl::~Impl() = default;
+
+void Property::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void Property::Impl::setIsDerived(bool derived)
 {
@@ -218,9 +230,18 @@ void Property::Impl::setName(ustring const& name)
     auto const store = [&] { TypedElement::Impl::setName(name); };
     support::changeKey(*this, getName(), name, getOwningType(), OWNING_TYPE, requireFree, store);
 }
+
+Property::Builder::Builder() = default;
+
+Property::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Property::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Property::Impl, tarn::kiln::meta::TypedElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Property::Impl, tarn::kiln::meta::TypedElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Property::Impl, tarn::kiln::meta::TypedElement::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Property::Builder>;

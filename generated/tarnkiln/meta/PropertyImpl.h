@@ -23,6 +23,9 @@ class TARNKILN_EXPORT Property::Impl
     : public support::Dispatched<Property::Impl, TypedElement::Impl>
 {
 public:
+    class BuilderImpl;                         // PropertyBuilder.h
+    template <class Final> class BuilderBase;  // PropertyBuilder.h
+
     using Handle = Property;
     using Storage = support::Record<Impl, TypedElement::Impl::Storage>;
 
@@ -49,7 +52,12 @@ public:
     static Slot const IS_QUERY_INDEX;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// Whether the value is computed and has no slot.
     bool isDerived() const { return m_isDerived; }

@@ -2,6 +2,8 @@
 #include "tarnkiln/meta/RealAttributeImpl.h"
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/RealAttributeBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -27,15 +29,34 @@ RealAttribute RealAttribute::create(Model const& model, UUID const& id)
 
 RealAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+RealAttribute::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 RealAttribute::Impl::~Impl() = default;
+
+void RealAttribute::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void RealAttribute::Impl::setValue(double value)
 {
     support::setScalar(*this, m_value, VALUE, value);
 }
+
+RealAttribute::Builder::Builder() = default;
+
+RealAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+RealAttribute::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::RealAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::RealAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::RealAttribute::Impl, tarn::kiln::meta::Attribute::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::RealAttribute::Builder>;

@@ -20,6 +20,9 @@ class TARNKILN_EXPORT RealAttribute::Impl
     : public support::Dispatched<RealAttribute::Impl, Attribute::Impl>
 {
 public:
+    class BuilderImpl;                         // RealAttributeBuilder.h
+    template <class Final> class BuilderBase;  // RealAttributeBuilder.h
+
     using Handle = RealAttribute;
     using Storage = support::Record<Impl, Attribute::Impl::Storage>;
 
@@ -27,7 +30,12 @@ public:
     static Slot const VALUE;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The value.
     double getValue() const { return m_value; }

@@ -2,6 +2,8 @@
 #include "tarnkiln/meta/StringAttributeImpl.h"
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/StringAttributeBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -27,15 +29,34 @@ StringAttribute StringAttribute::create(Model const& model, UUID const& id)
 
 StringAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+StringAttribute::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 StringAttribute::Impl::~Impl() = default;
+
+void StringAttribute::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void StringAttribute::Impl::setValue(ustring const& value)
 {
     support::setScalar(*this, m_value, VALUE, value);
 }
+
+StringAttribute::Builder::Builder() = default;
+
+StringAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+StringAttribute::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::StringAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::StringAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::StringAttribute::Impl, tarn::kiln::meta::Attribute::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::StringAttribute::Builder>;

@@ -20,6 +20,9 @@ class TARNKILN_EXPORT StringAttribute::Impl
     : public support::Dispatched<StringAttribute::Impl, Attribute::Impl>
 {
 public:
+    class BuilderImpl;                         // StringAttributeBuilder.h
+    template <class Final> class BuilderBase;  // StringAttributeBuilder.h
+
     using Handle = StringAttribute;
     using Storage = support::Record<Impl, Attribute::Impl::Storage>;
 
@@ -27,7 +30,12 @@ public:
     static Slot const VALUE;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The value.
     ustring const& getValue() const { return m_value; }

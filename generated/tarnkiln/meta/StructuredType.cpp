@@ -4,6 +4,8 @@
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/StructuredTypeBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -42,7 +44,17 @@ StructuredType StructuredType::create(Model const& model, UUID const& id)
 
 StructuredType::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+StructuredType::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 StructuredType::Impl::~Impl() = default;
+
+void StructuredType::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void StructuredType::Impl::setVobjName(string const& vobjName)
 {
@@ -92,9 +104,18 @@ PrimitiveSequence<string>& StructuredType::Impl::getVobjDispCategories() const
 {
     return support::shownCollection(*this, m_vobjDispCategories, &Impl::makeVobjDispCategories);
 }
+
+StructuredType::Builder::Builder() = default;
+
+StructuredType::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+StructuredType::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::StructuredType::Impl, tarn::kiln::meta::Type::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::StructuredType::Impl, tarn::kiln::meta::Type::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::StructuredType::Impl, tarn::kiln::meta::Type::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::StructuredType::Builder>;

@@ -28,6 +28,9 @@ class TARNKILN_EXPORT StructuredType::Impl
     : public support::Dispatched<StructuredType::Impl, Type::Impl>
 {
 public:
+    class BuilderImpl;                         // StructuredTypeBuilder.h
+    template <class Final> class BuilderBase;  // StructuredTypeBuilder.h
+
     using Handle = StructuredType;
     using Storage = support::Record<Impl, Type::Impl::Storage>;
 
@@ -39,7 +42,12 @@ public:
     static Slot const VOBJ_DISP_CATEGORIES;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The name of the C++ class.
     string const& getVobjName() const { return m_vobjName; }

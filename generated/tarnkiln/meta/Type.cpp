@@ -4,6 +4,8 @@
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PackageImpl.h"
+#include "tarnkiln/meta/TypeBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 #include "tarnkiln/support/Keyed.h"
@@ -33,7 +35,17 @@ Type Type::create(Model const& model, UUID const& id)
 
 Type::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+Type::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 Type::Impl::~Impl() = default;
+
+void Type::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void Type::Impl::setIsVobjHidden(bool vobjHidden)
 {
@@ -72,9 +84,18 @@ void Type::Impl::setName(ustring const& name)
     support::changeKey(
         *this, getName(), name, getOwningPackage(), OWNING_PACKAGE, requireFree, store);
 }
+
+Type::Builder::Builder() = default;
+
+Type::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+Type::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::Type::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::Type::Impl, tarn::kiln::meta::NamedElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::Type::Impl, tarn::kiln::meta::NamedElement::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::Type::Builder>;

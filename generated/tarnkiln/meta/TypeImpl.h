@@ -20,6 +20,9 @@ namespace tarn::kiln::meta {
 class TARNKILN_EXPORT Type::Impl : public support::Dispatched<Type::Impl, NamedElement::Impl>
 {
 public:
+    class BuilderImpl;                         // TypeBuilder.h
+    template <class Final> class BuilderBase;  // TypeBuilder.h
+
     using Handle = Type;
     using Storage = support::Record<Impl, NamedElement::Impl::Storage>;
 
@@ -28,7 +31,12 @@ public:
     static Slot const OWNING_PACKAGE;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The names from the root package on, separated by dots.
     ustring getQualifiedName() const;

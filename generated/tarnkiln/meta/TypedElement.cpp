@@ -3,6 +3,8 @@
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/meta/TypedElementBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -34,7 +36,17 @@ TypedElement TypedElement::create(Model const& model, UUID const& id)
 
 TypedElement::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+TypedElement::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 TypedElement::Impl::~Impl() = default;
+
+void TypedElement::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 Type TypedElement::Impl::getType() const
 {
@@ -65,9 +77,18 @@ void TypedElement::Impl::setIsOrdered(bool ordered)
 {
     support::setScalar(*this, m_isOrdered, IS_ORDERED, ordered);
 }
+
+TypedElement::Builder::Builder() = default;
+
+TypedElement::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+TypedElement::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::TypedElement::Impl, tarn::kiln::meta::NamedElement::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::TypedElement::Impl, tarn::kiln::meta::NamedElement::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::TypedElement::Impl, tarn::kiln::meta::NamedElement::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::TypedElement::Builder>;

@@ -23,6 +23,9 @@ class TARNKILN_EXPORT TypedElement::Impl
     : public support::Dispatched<TypedElement::Impl, NamedElement::Impl>
 {
 public:
+    class BuilderImpl;                         // TypedElementBuilder.h
+    template <class Final> class BuilderBase;  // TypedElementBuilder.h
+
     using Handle = TypedElement;
     using Storage = support::Record<Impl, NamedElement::Impl::Storage>;
 
@@ -33,7 +36,12 @@ public:
     static Slot const IS_ORDERED;
 
     Impl(Model const& model, UUID const& id);
+    /// With what a builder was given.
+    Impl(BuilderImpl& values, UUID const& id);
     ~Impl() override;
+
+    /// Makes what the builder holds builders for, after this element itself.
+    void cascadeCreation(BuilderImpl& values);
 
     /// The type of the value.
     Type getType() const;

@@ -2,6 +2,8 @@
 #include "tarnkiln/meta/UUIDAttributeImpl.h"
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
+#include "tarnkiln/meta/UUIDAttributeBuilder.h"
+#include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
 
@@ -27,15 +29,34 @@ UUIDAttribute UUIDAttribute::create(Model const& model, UUID const& id)
 
 UUIDAttribute::Impl::Impl(Model const& model, UUID const& id) : Dispatched(model, id) {}
 
+UUIDAttribute::Impl::Impl(BuilderImpl& values, UUID const& id) : Dispatched(values, id)
+{
+    values.construct(*this);
+}
+
 UUIDAttribute::Impl::~Impl() = default;
+
+void UUIDAttribute::Impl::cascadeCreation(BuilderImpl& values)
+{
+    values.cascade(*this);
+}
 
 void UUIDAttribute::Impl::setValue(UUID const& value)
 {
     support::setScalar(*this, m_value, VALUE, value);
 }
+
+UUIDAttribute::Builder::Builder() = default;
+
+UUIDAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
+
+UUIDAttribute::Builder::~Builder() = default;
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<
     tarn::kiln::meta::UUIDAttribute::Impl, tarn::kiln::meta::Attribute::Impl::Storage>;
 template class tarn::kiln::support::Dispatched<
     tarn::kiln::meta::UUIDAttribute::Impl, tarn::kiln::meta::Attribute::Impl>;
+template class tarn::kiln::support::BuilderValues<
+    tarn::kiln::meta::UUIDAttribute::Impl, tarn::kiln::meta::Attribute::Impl::BuilderImpl>;
+template class tarn::kiln::support::BuilderTop<tarn::kiln::meta::UUIDAttribute::Builder>;

@@ -74,8 +74,19 @@ ModelElement ModelElement::Builder::createProxy(ProxyId const& id)
 
 // ---------------------------------------------------------------------------- orchestrator
 
+namespace {
+
+/// The model in which `builder` builds.
+Model const& modelOf(ModelElement::Builder const& builder)
+{
+    if (!builder.getModel().getImpl())
+        reportException(tarnkiln::messages::CannotCreateWithoutModel());
+    return builder.getModel();
+}
+} // namespace
+
 ModelElement::Builder::Orchestrator::Orchestrator(Builder* builder)
-    : m_model(builder->getModel())
+    : m_model(modelOf(*builder))
     , m_transaction(m_model->beginTransaction(/*revertible=*/true))
     , m_step(m_model.getImpl())
 {
@@ -124,6 +135,11 @@ void ModelElement::Builder::Orchestrator::registerCreatedElement(Builder* builde
                                                                  ModelElement::Impl* element)
 {
     m_created[builder] = ModelElement(element);
+}
+
+void ModelElement::Builder::Orchestrator::forgetCreatedElement(Builder* builder)
+{
+    m_created[builder] = ModelElement();
 }
 
 ModelElement ModelElement::Builder::Orchestrator::getCreatedElement(Builder* builder) const

@@ -39,6 +39,8 @@ public:
     ModelElement createProxy(ProxyId const& id);
 
     Model const& getModel() const { return m_model; }
+    /// Whether the property at that slot was given; clearing a many-valued one counts.
+    bool isSet(unsigned long index) const { return m_setProperties.test(index); }
     Orchestrator* getOrchestrator() const { return m_orchestrator; }
 
 protected:
@@ -65,6 +67,7 @@ class TARNKILN_EXPORT ModelElement::Builder::Orchestrator
 public:
     /// Opens the transaction and takes `builder` in.
     ///
+    /// \throws tarnkiln::messages::CannotCreateWithoutModel  if the builder has no model.
     /// \throws tarnkiln::messages::ModelFrozen  if the model is frozen; an outer transaction can
     ///     then only be rolled back.
     explicit Orchestrator(Builder* builder);
@@ -77,6 +80,8 @@ public:
     void removeBuilder(Builder* builder);
     /// Told by the constructor of an element that is made from `builder`.
     void registerCreatedElement(Builder* builder, ModelElement::Impl* element);
+    /// Takes that back, for what is no part of the creation.
+    void forgetCreatedElement(Builder* builder);
     /// The element made from `builder`; empty before that.
     ModelElement getCreatedElement(Builder* builder) const;
     /// Commits and lets go of all builders.

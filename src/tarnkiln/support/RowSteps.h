@@ -37,6 +37,13 @@ template <class Target> typename Target::Impl* targetOf(ModelElement const& elem
     return target;
 }
 
+/// `value` as a plain value of a field. A Boolean takes a value that holds nothing for false.
+template <class Plain> Plain plainOf(Value const& value)
+{
+    bool const isFalse = std::is_same_v<Plain, bool> && value.isAbsent();
+    return isFalse ? Plain() : value.getValue<Plain>();
+}
+
 /// Whether a dying element of another model is to stand in this reference as a proxy.
 inline bool leavesProxy(ModelElement::Impl const& element, ModelElement::Impl const* target)
 {
@@ -134,11 +141,9 @@ struct Steps<Scalar<FIELD, SLOT, SETTER>> : PlainFieldSteps<FIELD, SLOT>
     using Plain = FieldType<FIELD>;
 
     static bool has(Owner const& /*element*/) { return true; }
-    /// A Boolean takes a value that holds nothing for false.
     static bool set(Owner& element, Value const& value)
     {
-        bool const isFalse = std::is_same_v<Plain, bool> && value.isAbsent();
-        (element.*SETTER)(isFalse ? Plain() : value.getValue<Plain>());
+        (element.*SETTER)(plainOf<Plain>(value));
         return true;
     }
 };
