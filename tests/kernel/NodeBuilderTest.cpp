@@ -93,7 +93,7 @@ TEST_F(BuiltValues, AreThoseOfTheSetters)
     EXPECT_EQ(made->getTag(), "red");
     EXPECT_EQ(made->getToken(), uuidOf(7));
     EXPECT_EQ(made->getRank(), boost::optional<int>(4));
-    EXPECT_EQ(made->getNote(), boost::optional<ustring>(u"seen"));
+    EXPECT_EQ(made->getNote().value(), u"seen");
     EXPECT_THAT(made->getNumbers().getEntries(), ElementsAre(3, 1, 3));
     EXPECT_THAT(made->getLabels().getEntries(), ElementsAre(u"x", u"y"));
     EXPECT_THAT(made->getWords().getEntries(), ElementsAre(u"a", u"b"));
@@ -377,7 +377,7 @@ TEST_F(ReflectiveBuilding, GivesTheSameElementAsTheSetters)
     EXPECT_EQ(made->getTag(), "red");
     EXPECT_EQ(made->getToken(), uuidOf(7));
     EXPECT_EQ(made->getRank(), boost::optional<int>(4));
-    EXPECT_EQ(made->getNote(), boost::optional<ustring>(u"seen"));
+    EXPECT_EQ(made->getNote().value(), u"seen");
     EXPECT_EQ(made->getBuddy(), other);
     EXPECT_EQ(made->getLeft(), other);
     EXPECT_THAT(names(made->getOwned()), ElementsAre(u"other"));
