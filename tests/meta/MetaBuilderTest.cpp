@@ -1,6 +1,7 @@
 // How elements of metamodels are described by builders and made.
 #include "tarnkiln/kernel/Freezer.h"
 #include "tarnkiln/meta/ArgumentBuilder.h"
+#include "tarnkiln/meta/AttributeBuilder.h"
 #include "tarnkiln/meta/AttributeMapAttributeBuilder.h"
 #include "tarnkiln/meta/AttributeMapBuilder.h"
 #include "tarnkiln/meta/BooleanAttributeBuilder.h"
@@ -339,6 +340,17 @@ TEST_F(MetaBuilderContents, OfAnAttributeMapAreOfAnyKind)
 }
 
 // ---------------------------------------------------------------------------- failures
+
+TEST_F(MetaBuilderFailures, OfAnAbstractClassMakeNothing)
+{
+    Attribute::Builder builder(m_model);
+
+    EXPECT_RAISES(messages::NoSuchOperation, builder.create());
+    EXPECT_RAISES(messages::NoSuchOperation, builder.createProxy(ProxyId()));
+
+    EXPECT_EQ(m_model->getElementCount(), 0u);
+    EXPECT_EQ(m_model->getCurrentTransaction(), nullptr);
+}
 
 TEST_F(MetaBuilderFailures, OfNamesThatSiblingsShareLeaveNothingBehind)
 {

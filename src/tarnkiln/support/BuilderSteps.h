@@ -381,7 +381,17 @@ template <class Final> ModelElement BuilderTop<Final>::doCreate(bool proxy, UUID
 template <class Final> auto BuilderTop<Final>::construct(UUID const& id)
 {
     using Handle = typename Final::Handle;
-    return Handle(new typename Handle::Impl(self().m_values, id));
+    using Impl = typename Handle::Impl;
+    Impl* made = nullptr;
+    if constexpr (std::is_abstract_v<Impl>)
+    {
+        meta::Class const& metaClass = getMetaClass();
+        reportException(tarnkiln::messages::NoSuchOperation(
+            u"create", metaClass ? metaClass->getQualifiedName() : ustring()));
+    }
+    else
+        made = new Impl(self().m_values, id);
+    return Handle(made);
 }
 
 /// The element that the present creation makes of this builder, made now unless it has been.
