@@ -66,7 +66,9 @@ class Rows:
         self.required = self.facts.get("wellKnown", {}).get("resolvedByNameInStep6", [])
         self.imports = [each for each in package.imports if not each.is_catalogue]
         self.includes = sorted({
-            *package.collection_headers, *self.headers_of_methods(package), *(each.meta_package_header for each in self.imports),
+            *package.collection_headers, *self.headers_of_methods(package),
+            *(each.builder_header for each in package.classes if not each.abstract),
+            *(each.meta_package_header for each in self.imports),
             "tarnkiln/support/ElementInstantiator.h", "tarnkiln/support/InvokerInstaller.h",
             "tarnkiln/support/PrimitiveInstantiator.h",
             "tarnkiln/support/SerializerInstaller.h"})
@@ -151,7 +153,12 @@ class Rows:
             ("isAbstract", "true" if entry["abstract"] else None),
             ("properties", properties), ("operations", operations),
             ("collection", f"{collection}<{entry['name']}>"),
+            ("builder", self.builder(entry) if is_class else None),
             ("uuid", narrow(entry["uuid"]))])
+
+    def builder(self, entry):
+        """What makes builders of a class; there is none for an abstract one."""
+        return None if entry["abstract"] else f"{entry['name']}::Builder::instantiate"
 
     def add_property(self, owner, entry):
         flags = [flag for key, flag in FLAGS.items() if entry.get(key)]

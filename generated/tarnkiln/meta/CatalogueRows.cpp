@@ -2,12 +2,35 @@
 #include "tarnkiln/meta/CatalogueRows.h"
 
 #include "tarnkiln/collections/MetaCollections.h"
+#include "tarnkiln/meta/ArgumentBuilder.h"
 #include "tarnkiln/meta/AttributeImpl.h"
+#include "tarnkiln/meta/AttributeMapAttributeBuilder.h"
+#include "tarnkiln/meta/AttributeMapBuilder.h"
 #include "tarnkiln/meta/AttributeMapImpl.h"
+#include "tarnkiln/meta/BooleanAttributeBuilder.h"
+#include "tarnkiln/meta/ClassBuilder.h"
+#include "tarnkiln/meta/DataTypeBuilder.h"
+#include "tarnkiln/meta/DateTimeAttributeBuilder.h"
+#include "tarnkiln/meta/DynamicExtensionsBuilder.h"
+#include "tarnkiln/meta/EnumBuilder.h"
 #include "tarnkiln/meta/EnumImpl.h"
+#include "tarnkiln/meta/EnumLiteralBuilder.h"
+#include "tarnkiln/meta/ExtensionBuilder.h"
 #include "tarnkiln/meta/ExtensionImpl.h"
+#include "tarnkiln/meta/IntegerAttributeBuilder.h"
+#include "tarnkiln/meta/NamedElementBuilder.h"
+#include "tarnkiln/meta/OperationBuilder.h"
+#include "tarnkiln/meta/PackageBuilder.h"
+#include "tarnkiln/meta/PrimitiveTypeBuilder.h"
+#include "tarnkiln/meta/PropertyBuilder.h"
+#include "tarnkiln/meta/RealAttributeBuilder.h"
+#include "tarnkiln/meta/StringAttributeBuilder.h"
+#include "tarnkiln/meta/StructuredTypeBuilder.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
+#include "tarnkiln/meta/TypeBuilder.h"
 #include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/meta/TypedElementBuilder.h"
+#include "tarnkiln/meta/UUIDAttributeBuilder.h"
 #include "tarnkiln/support/ElementInstantiator.h"
 #include "tarnkiln/support/InvokerInstaller.h"
 #include "tarnkiln/support/PrimitiveInstantiator.h"
@@ -37,7 +60,7 @@ constexpr support::StructuredTypeRow classes[] = {
     {.name = u"Argument", .vobjName = "tarn.kiln.meta.Argument", .package = 3,
      .superclass = {Classes, rows::classes::TypedElement}, .properties = {0, 2},
      .collection = support::makeElementCollection<Argument>,
-     .uuid = "0ac604e1-8fe9-35a8-bf88-6aec0ae37690"},
+     .builder = Argument::Builder::instantiate, .uuid = "0ac604e1-8fe9-35a8-bf88-6aec0ae37690"},
     {.name = u"Attribute", .vobjName = "tarn.kiln.meta.Attribute", .package = 3,
      .superclass = {u"ModelElement"}, .isAbstract = true, .properties = {2, 2},
      .operations = {0, 1}, .collection = support::makeElementCollection<Attribute>,
@@ -45,90 +68,100 @@ constexpr support::StructuredTypeRow classes[] = {
     {.name = u"AttributeMap", .vobjName = "tarn.kiln.meta.AttributeMap", .package = 3,
      .superclass = {u"ModelElement"}, .properties = {4, 2}, .operations = {1, 10},
      .collection = support::makeElementCollection<AttributeMap>,
-     .uuid = "83e57a44-bf12-3fa3-8d20-d87241daf556"},
+     .builder = AttributeMap::Builder::instantiate, .uuid = "83e57a44-bf12-3fa3-8d20-d87241daf556"},
     {.name = u"AttributeMapAttribute", .vobjName = "tarn.kiln.meta.AttributeMapAttribute",
      .package = 3, .superclass = {Classes, rows::classes::Attribute}, .properties = {6, 1},
      .collection = support::makeElementCollection<AttributeMapAttribute>,
+     .builder = AttributeMapAttribute::Builder::instantiate,
      .uuid = "a6c03b25-1d7d-32f4-8cf0-484d9bd6e41b"},
     {.name = u"BooleanAttribute", .vobjName = "tarn.kiln.meta.BooleanAttribute", .package = 3,
      .superclass = {Classes, rows::classes::Attribute}, .properties = {7, 1},
      .collection = support::makeElementCollection<BooleanAttribute>,
+     .builder = BooleanAttribute::Builder::instantiate,
      .uuid = "c95caece-a302-3001-816a-44da6cb64b04"},
     {.name = u"Class", .vobjName = "tarn.kiln.meta.Class", .package = 3,
      .superclass = {Classes, rows::classes::StructuredType}, .properties = {8, 3},
      .operations = {11, 1}, .collection = support::makeElementCollection<Class>,
-     .uuid = "b18e5add-a952-3131-9850-b3c0b47a8a41"},
+     .builder = Class::Builder::instantiate, .uuid = "b18e5add-a952-3131-9850-b3c0b47a8a41"},
     {.name = u"DataType", .vobjName = "tarn.kiln.meta.DataType", .package = 3,
      .superclass = {Classes, rows::classes::StructuredType},
      .collection = support::makeElementCollection<DataType>,
-     .uuid = "bc247589-5688-3c4e-8ce5-71abab16821d"},
+     .builder = DataType::Builder::instantiate, .uuid = "bc247589-5688-3c4e-8ce5-71abab16821d"},
     {.name = u"DateTimeAttribute", .vobjName = "tarn.kiln.meta.DateTimeAttribute", .package = 3,
      .superclass = {Classes, rows::classes::Attribute}, .properties = {11, 1},
      .collection = support::makeElementCollection<DateTimeAttribute>,
+     .builder = DateTimeAttribute::Builder::instantiate,
      .uuid = "2afc5a31-d113-3d44-b4ce-b4da50c343e1"},
     {.name = u"DynamicExtensions", .vobjName = "tarn.kiln.meta.DynamicExtensions", .package = 3,
      .superclass = {u"ModelElement"}, .properties = {12, 3},
      .collection = support::makeElementCollection<DynamicExtensions>,
+     .builder = DynamicExtensions::Builder::instantiate,
      .uuid = "9335db1e-8108-391b-8464-fa5e3f615aee"},
     {.name = u"Enum", .vobjName = "tarn.kiln.meta.Enum", .package = 3,
      .superclass = {Classes, rows::classes::Type}, .properties = {15, 2}, .operations = {12, 2},
-     .collection = support::makeElementCollection<Enum>,
+     .collection = support::makeElementCollection<Enum>, .builder = Enum::Builder::instantiate,
      .uuid = "6a0e699c-b935-307d-87c2-c93afdfa20a0"},
     {.name = u"EnumLiteral", .vobjName = "tarn.kiln.meta.EnumLiteral", .package = 3,
      .superclass = {Classes, rows::classes::NamedElement}, .properties = {17, 3},
      .collection = support::makeElementCollection<EnumLiteral>,
-     .uuid = "58363972-fef9-3d9c-a5bd-8b8ad8c51991"},
+     .builder = EnumLiteral::Builder::instantiate, .uuid = "58363972-fef9-3d9c-a5bd-8b8ad8c51991"},
     {.name = u"Extension", .vobjName = "tarn.kiln.meta.Extension", .package = 3,
      .superclass = {Classes, rows::classes::Property}, .properties = {20, 2}, .operations = {14, 1},
      .collection = support::makeElementCollection<Extension>,
-     .uuid = "6f615d73-2a99-3432-885c-022136c188c9"},
+     .builder = Extension::Builder::instantiate, .uuid = "6f615d73-2a99-3432-885c-022136c188c9"},
     {.name = u"IntegerAttribute", .vobjName = "tarn.kiln.meta.IntegerAttribute", .package = 3,
      .superclass = {Classes, rows::classes::Attribute}, .properties = {22, 1},
      .collection = support::makeElementCollection<IntegerAttribute>,
+     .builder = IntegerAttribute::Builder::instantiate,
      .uuid = "82a2f120-d8fa-3e30-ac48-069beeaa0f85"},
     {.name = u"NamedElement", .vobjName = "tarn.kiln.meta.NamedElement", .package = 3,
      .superclass = {u"ModelElement"}, .properties = {23, 1},
      .collection = support::makeElementCollection<NamedElement>,
-     .uuid = "20d093d1-df86-300b-8537-a7f62cbd2706"},
+     .builder = NamedElement::Builder::instantiate, .uuid = "20d093d1-df86-300b-8537-a7f62cbd2706"},
     {.name = u"Operation", .vobjName = "tarn.kiln.meta.Operation", .package = 3,
      .superclass = {Classes, rows::classes::TypedElement}, .properties = {24, 6},
      .collection = support::makeElementCollection<Operation>,
-     .uuid = "7d3a6aa7-6514-3d45-add1-a86ab6e8922e"},
+     .builder = Operation::Builder::instantiate, .uuid = "7d3a6aa7-6514-3d45-add1-a86ab6e8922e"},
     {.name = u"Package", .vobjName = "tarn.kiln.meta.Package", .package = 3,
      .superclass = {Classes, rows::classes::NamedElement}, .properties = {30, 11},
      .collection = support::makeElementCollection<Package>,
-     .uuid = "37242744-9be0-3eb9-b2d1-57cb3a6cbfa3"},
+     .builder = Package::Builder::instantiate, .uuid = "37242744-9be0-3eb9-b2d1-57cb3a6cbfa3"},
     {.name = u"PrimitiveType", .vobjName = "tarn.kiln.meta.PrimitiveType", .package = 3,
      .superclass = {Classes, rows::classes::Type},
      .collection = support::makeElementCollection<PrimitiveType>,
+     .builder = PrimitiveType::Builder::instantiate,
      .uuid = "ac18b87c-dcc8-3ba6-a3d2-48b1517bc1b2"},
     {.name = u"Property", .vobjName = "tarn.kiln.meta.Property", .package = 3,
      .superclass = {Classes, rows::classes::TypedElement}, .properties = {41, 20},
      .operations = {15, 1}, .collection = support::makeElementCollection<Property>,
-     .uuid = "831bd3d5-f65b-307d-a9a8-5788c0f91692"},
+     .builder = Property::Builder::instantiate, .uuid = "831bd3d5-f65b-307d-a9a8-5788c0f91692"},
     {.name = u"RealAttribute", .vobjName = "tarn.kiln.meta.RealAttribute", .package = 3,
      .superclass = {Classes, rows::classes::Attribute}, .properties = {61, 1},
      .collection = support::makeElementCollection<RealAttribute>,
+     .builder = RealAttribute::Builder::instantiate,
      .uuid = "a1265474-52d3-35e0-acce-7e1887e4756c"},
     {.name = u"StringAttribute", .vobjName = "tarn.kiln.meta.StringAttribute", .package = 3,
      .superclass = {Classes, rows::classes::Attribute}, .properties = {62, 1},
      .collection = support::makeElementCollection<StringAttribute>,
+     .builder = StringAttribute::Builder::instantiate,
      .uuid = "63042dc4-ca2b-349d-8c1e-076f46353a0f"},
     {.name = u"StructuredType", .vobjName = "tarn.kiln.meta.StructuredType", .package = 3,
      .superclass = {Classes, rows::classes::Type}, .properties = {63, 5}, .operations = {16, 3},
      .collection = support::makeElementCollection<StructuredType>,
+     .builder = StructuredType::Builder::instantiate,
      .uuid = "4f24d802-42e9-34f1-ac25-33c2ef335414"},
     {.name = u"Type", .vobjName = "tarn.kiln.meta.Type", .package = 3,
      .superclass = {Classes, rows::classes::NamedElement}, .properties = {68, 3},
      .operations = {19, 1}, .collection = support::makeElementCollection<Type>,
-     .uuid = "430b3cfc-a0e5-3526-a67c-3249711fc291"},
+     .builder = Type::Builder::instantiate, .uuid = "430b3cfc-a0e5-3526-a67c-3249711fc291"},
     {.name = u"TypedElement", .vobjName = "tarn.kiln.meta.TypedElement", .package = 3,
      .superclass = {Classes, rows::classes::NamedElement}, .properties = {71, 4},
      .collection = support::makeElementCollection<TypedElement>,
-     .uuid = "9b001de4-cf53-34ef-bb15-5ff37dd7cf79"},
+     .builder = TypedElement::Builder::instantiate, .uuid = "9b001de4-cf53-34ef-bb15-5ff37dd7cf79"},
     {.name = u"UUIDAttribute", .vobjName = "tarn.kiln.meta.UUIDAttribute", .package = 3,
      .superclass = {Classes, rows::classes::Attribute}, .properties = {75, 1},
      .collection = support::makeElementCollection<UUIDAttribute>,
+     .builder = UUIDAttribute::Builder::instantiate,
      .uuid = "ac93d064-fe68-3635-8bc6-e6f1be2cfffe"},
 };
 
