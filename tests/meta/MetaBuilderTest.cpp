@@ -1,25 +1,6 @@
 // How elements of metamodels are described by builders and made.
 #include "tarnkiln/kernel/Freezer.h"
-#include "tarnkiln/meta/ArgumentBuilder.h"
-#include "tarnkiln/meta/AttributeBuilder.h"
-#include "tarnkiln/meta/AttributeMapAttributeBuilder.h"
-#include "tarnkiln/meta/AttributeMapBuilder.h"
-#include "tarnkiln/meta/BooleanAttributeBuilder.h"
-#include "tarnkiln/meta/ClassBuilder.h"
-#include "tarnkiln/meta/DataTypeBuilder.h"
-#include "tarnkiln/meta/DateTimeAttributeBuilder.h"
-#include "tarnkiln/meta/DynamicExtensionsBuilder.h"
-#include "tarnkiln/meta/EnumBuilder.h"
-#include "tarnkiln/meta/EnumLiteralBuilder.h"
-#include "tarnkiln/meta/ExtensionBuilder.h"
-#include "tarnkiln/meta/IntegerAttributeBuilder.h"
-#include "tarnkiln/meta/OperationBuilder.h"
-#include "tarnkiln/meta/PackageBuilder.h"
-#include "tarnkiln/meta/PrimitiveTypeBuilder.h"
-#include "tarnkiln/meta/PropertyBuilder.h"
-#include "tarnkiln/meta/RealAttributeBuilder.h"
-#include "tarnkiln/meta/StringAttributeBuilder.h"
-#include "tarnkiln/meta/UUIDAttributeBuilder.h"
+#include "tests/meta/MetaBuilders.h"
 #include "tests/meta/MetamodelSketch.h"
 #include "tests/support/ExpectRaises.h"
 #include "tests/support/Uuids.h"
@@ -235,13 +216,7 @@ TEST_F(MetaBuilderFields, ReachAttributesOfEveryKind)
 template <class C> class BuilderOfEveryClass : public MetamodelSketch
 {};
 
-using ConcreteClasses =
-    ::testing::Types<Argument, AttributeMap, AttributeMapAttribute, BooleanAttribute, Class,
-                     DataType, DateTimeAttribute, DynamicExtensions, Enum, EnumLiteral, Extension,
-                     IntegerAttribute, NamedElement, Operation, Package, PrimitiveType, Property,
-                     RealAttribute, StringAttribute, StructuredType, Type, TypedElement,
-                     UUIDAttribute>;
-TYPED_TEST_SUITE(BuilderOfEveryClass, ConcreteClasses);
+TYPED_TEST_SUITE(BuilderOfEveryClass, ConcreteMetaClasses);
 
 TYPED_TEST(BuilderOfEveryClass, MakesAnElementOfThatClass)
 {

@@ -1,16 +1,7 @@
 // How builders of metamodel elements are driven by the properties that the metamodel describes.
 #include "tarnkiln/kernel/Value.h"
-#include "tarnkiln/meta/AttributeBuilder.h"
-#include "tarnkiln/meta/ClassBuilder.h"
-#include "tarnkiln/meta/EnumLiteralBuilder.h"
-#include "tarnkiln/meta/ExtensionBuilder.h"
-#include "tarnkiln/meta/MetaRegistry.h"
-#include "tarnkiln/meta/OperationBuilder.h"
-#include "tarnkiln/meta/PackageBuilder.h"
-#include "tarnkiln/meta/StandardTypes.h"
-#include "tarnkiln/meta/StringAttributeBuilder.h"
+#include "tests/meta/MetaBuilders.h"
 #include "tests/meta/MetamodelSketch.h"
-#include "tests/meta/RegistrySession.h"
 #include "tests/support/ExpectRaises.h"
 #include "tests/support/Uuids.h"
 
@@ -19,7 +10,6 @@
 
 namespace tarn::kiln::meta {
 
-using ::testing::ElementsAre;
 using testkit::uuidOf;
 
 class ReflectiveMetaBuilder : public MetamodelSketch
@@ -94,12 +84,6 @@ protected:
 template <class C> class ReflectiveBuilderOf : public ReflectiveMetaBuilder
 {};
 
-using ConcreteMetaClasses =
-    ::testing::Types<Argument, AttributeMap, AttributeMapAttribute, BooleanAttribute, Class,
-                     DataType, DateTimeAttribute, DynamicExtensions, Enum, EnumLiteral, Extension,
-                     IntegerAttribute, NamedElement, Operation, Package, PrimitiveType, Property,
-                     RealAttribute, StringAttribute, StructuredType, Type, TypedElement,
-                     UUIDAttribute>;
 TYPED_TEST_SUITE(ReflectiveBuilderOf, ConcreteMetaClasses);
 
 TYPED_TEST(ReflectiveBuilderOf, IsInTheRegistry)
