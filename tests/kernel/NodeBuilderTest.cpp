@@ -4,6 +4,8 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/meta/ClassBuilder.h"
+#include "tarnkiln/meta/DataModelUsageProvider.h"
+#include "tarnkiln/meta/Package.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tests/support/ExpectRaises.h"
@@ -14,6 +16,10 @@
 
 #include <boost/optional/optional_io.hpp>
 #include <gmock/gmock.h>
+
+#include <functional>
+#include <memory>
+#include <stdexcept>
 
 namespace testkit {
 
@@ -63,8 +69,30 @@ protected:
         return result;
     }
 
+    /// Calls `seen` for each node that the model gets from now on, before it is in a container.
+    void whenAnnounced(std::function<void(Node const&)> seen)
+    {
+        m_model->setUsageProvider(std::make_unique<Announcements>(std::move(seen)));
+    }
+
     Model const m_model = Model::create(ModelConstellation());
     Node::Builder m_builder{m_model};
+
+private:
+    class Announcements : public meta::DataModelUsageProvider
+    {
+    public:
+        explicit Announcements(std::function<void(Node const&)> seen) : m_seen(std::move(seen)) {}
+
+        std::vector<meta::Package> getUsedPackages() const override { return {}; }
+        void elementCreated(ModelElement::Impl* element) override
+        {
+            m_seen(Node::cast(ModelElement(element)));
+        }
+
+    private:
+        std::function<void(Node const&)> m_seen;
+    };
 };
 
 using BuiltValues = NodeBuilding;
@@ -158,19 +186,13 @@ TEST_F(BuiltValues, AreMarkedInTheBuilderByTheirSlots)
 
 TEST_F(BuiltValues, AreThereWhenTheElementIsAnnounced)
 {
-    ScriptedListener listener;
-    listen(m_model, listener);
     std::vector<std::size_t> seen;
-    listener.onPrepare = [&](Report const& report) {
-        for (ModelElement const& created : report->getCreated())
-            seen.push_back(Node::cast(created)->getNumbers().size());
-    };
+    whenAnnounced([&](Node const& made) { seen.push_back(made->getNumbers().size()); });
     m_builder.addNumbers({1, 2});
 
     build(m_builder);
 
     EXPECT_THAT(seen, ElementsAre(2));
-    m_model->removeListener(&listener);
 }
 
 // ---------------------------------------------------------------------------- references
@@ -290,22 +312,32 @@ TEST_F(BuiltContents, NestToAnyDepthInOneTransaction)
 TEST_F(BuiltContents, AreCreatedAfterTheirContainerInTheOrderOfTheProperties)
 {
     std::vector<ustring> order;
-    ScriptedListener listener;
-    listen(m_model, listener);
-    listener.onPrepare = [&](Report const& report) {
-        for (ModelElement const& created : report->getCreated())
-            order.push_back(Node::cast(created)->getName());
-    };
-    m_builder.setName(u"root").addByName(named(u"third")).setCore(named(u"second"));
+    whenAnnounced([&](Node const& made) { order.push_back(made->getName()); });
     auto first = named(u"first");
     first->addChildren(named(u"first's child"));
-    m_builder.addChildren(std::move(first));
+    m_builder.setName(u"root").addByName(named(u"fourth")).setCore(named(u"third"));
+    m_builder.addChildren(std::move(first)).addChildren(named(u"second"));
 
     build(m_builder);
 
-    EXPECT_THAT(order, ::testing::UnorderedElementsAre(u"root", u"first", u"first's child",
-                                                       u"second", u"third"));
-    m_model->removeListener(&listener);
+    EXPECT_THAT(order,
+                ElementsAre(u"root", u"first", u"first's child", u"second", u"third", u"fourth"));
+}
+
+TEST_F(BuiltContents, AreBuiltWhenTheReferencesAreSet)
+{
+    std::vector<bool> hadParent;
+    Node const parent = make();
+    whenAnnounced([&](Node const& made) {
+        if (made->getName() == u"child")
+            hadParent.push_back(parent->getChildren().size() == 1);
+    });
+    SpecialNode::Builder builder(m_model);
+    builder.addChildren(named(u"child")).setParent(parent);
+
+    builder.create();
+
+    EXPECT_THAT(hadParent, ElementsAre(true));
 }
 
 TEST_F(BuiltContents, AreMadeAnewEachTime)
@@ -654,6 +686,40 @@ TEST_F(FailedBuilding, RestoresWhatTheReferencesChanged)
     EXPECT_EQ(left->getRight(), partner);
     EXPECT_TRUE(parent->getChildren().empty());
     EXPECT_EQ(m_model->getElementCount(), 3u);
+}
+
+TEST_F(FailedBuilding, TakesBackWhatWasBuiltBeforeTheModelRefusedAPart)
+{
+    long const before = Node::liveCount();
+    {
+        Node::Builder builder(m_model);
+        builder.setName(u"root").addChildren(named(u"first")).addChildren(named(u"second"));
+        whenAnnounced([](Node const& made) {
+            if (made->getName() == u"second")
+                throw std::runtime_error("no");
+        });
+
+        EXPECT_THROW(builder.create(), std::runtime_error);
+    }
+
+    EXPECT_EQ(m_model->getElementCount(), 0u);
+    EXPECT_THAT(m_model->getTopLevelElements(), IsEmpty());
+    EXPECT_EQ(Node::liveCount(), before);
+}
+
+TEST_F(FailedBuilding, GivesADeadElementIfAListenerRefusesIt)
+{
+    ScriptedListener listener;
+    listen(m_model, listener);
+    listener.onValidate = [](Report const&) { return false; };
+    m_builder.addChildren(named(u"child"));
+
+    Node const made = build(m_builder);
+
+    EXPECT_FALSE(made);
+    EXPECT_EQ(m_model->getElementCount(), 0u);
+    EXPECT_EQ(m_builder.getOrchestrator(), nullptr);
+    m_model->removeListener(&listener);
 }
 
 TEST_F(FailedBuilding, MayBeTriedAgain)
