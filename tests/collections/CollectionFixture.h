@@ -42,6 +42,23 @@ public:
     std::vector<ModelElement> changed;
 };
 
+/// Has a model tell a listener what happens, for as long as this lives.
+template <class L> class Listening
+{
+public:
+    Listening(Model const& model, L& listener) : m_model(model), m_listener(listener)
+    {
+        m_model->addListener(&m_listener);
+    }
+    Listening(Listening const&) = delete;
+    Listening& operator=(Listening const&) = delete;
+    ~Listening() { m_model->removeListener(&m_listener); }
+
+private:
+    Model const m_model;
+    L& m_listener;
+};
+
 /// Leaves transactions shallow.
 class ShallowCounter : public Listener
 {

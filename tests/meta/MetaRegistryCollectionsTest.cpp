@@ -1,6 +1,6 @@
 /// \file
 /// The collections that the registry makes for properties.
-#include "tarnkiln/collections/AbstractOwnedCollection.h"
+#include "tarnkiln/collections/ReflectiveDataTypeCollection.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/DataTypeImpl.h"
@@ -8,6 +8,7 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tests/meta/RegistrySession.h"
+#include "tests/support/ExpectRaises.h"
 
 namespace tarn::kiln::meta {
 namespace {
@@ -138,7 +139,12 @@ TEST_F(CollectionOfADataType, IsMadeByTheInstantiatorOfATypeOfTheRegistry)
     EXPECT_NE(dynamic_cast<IdleCollection*>(collection.get()), nullptr);
 }
 
-TEST_F(CollectionOfADataType, IsNullForATypeOfAnotherModel)
+TEST_F(CollectionOfADataType, IsNullForATypeOfTheRegistryWithoutAnEntry)
+{
+    EXPECT_EQ(instantiate(), nullptr);
+}
+
+TEST_F(CollectionOfADataType, IsAReflectiveSequenceForATypeOfAnotherModel)
 {
     registry().registerType(type.get(), make<IdleCollection>, nullptr);
     Model const model = Model::createRegistryModel(u"test://types");
@@ -147,22 +153,68 @@ TEST_F(CollectionOfADataType, IsNullForATypeOfAnotherModel)
     Property const list = Property::create(model);
     list->setType(foreign);
 
-    EXPECT_EQ(registry().instantiateDynamicCollection(ModelElement(), list), nullptr);
+    for (bool const ordered : {false, true})
+    {
+        list->setIsOrdered(ordered);
+        Collection const collection(registry().instantiateDynamicCollection(foreign, list));
+        auto const* const sequence = dynamic_cast<ReflectiveDataTypeSequence*>(collection.get());
+        ASSERT_NE(sequence, nullptr);
+        EXPECT_EQ(sequence->getCollectionType(), foreign);
+        EXPECT_EQ(sequence->getOwner(), foreign.getImpl());
+        EXPECT_EQ(sequence->getCollectionProperty(), list);
+    }
 }
 
-TEST_F(CollectionOfADataType, IsNullForAQualifiedProperty)
+/// The qualifying property of the collection.
+class CollectionOfAQualifiedDataType : public CollectionOfADataType
 {
-    registry().registerType(type.get(), make<IdleCollection>, nullptr);
-    RegistryElement<Property> const key(u"key");
+protected:
+    CollectionOfAQualifiedDataType() { qualify(StandardTypes::stringMeta, 1); }
+
+    void qualify(Type const& keyType, unsigned int upper, bool unique = true)
     {
         RegistrySession session;
-        key->setType(StandardTypes::stringMeta);
-        key->setUpper(1);
-        property->setQualifiedBy(key);
+        key->setType(keyType);
+        key->setUpper(upper);
+        property->setQualifiedBy(key.get());
+        property->setIsQualificationUnique(unique);
         session.commit();
     }
 
+    RegistryElement<Property> key{u"key"};
+};
+
+TEST_F(CollectionOfAQualifiedDataType, IsAssociativeEvenIfTheTypeHasAnInstantiator)
+{
+    registry().registerType(type.get(), make<IdleCollection>, nullptr);
+    for (bool const unique : {false, true})
+    {
+        qualify(StandardTypes::stringMeta, 1, unique);
+        Collection const collection = instantiate();
+        auto const* const keyed =
+            dynamic_cast<ReflectiveDataTypeAssociative<ustring>*>(collection.get());
+        ASSERT_NE(keyed, nullptr);
+        EXPECT_EQ(keyed->isQualificationUnique(), unique);
+        EXPECT_EQ(keyed->getKeyType(), StandardTypes::stringMeta);
+    }
+}
+
+TEST_F(CollectionOfAQualifiedDataType, IsNullForAKeyOfManyValuesWithoutTypeOrOfAClass)
+{
+    qualify(StandardTypes::stringMeta, 2);
     EXPECT_EQ(instantiate(), nullptr);
+    qualify(Type(), 1);
+    EXPECT_EQ(instantiate(), nullptr);
+    RegistryElement<Class> const keyClass(u"KeyClass");
+    qualify(keyClass.get(), 1);
+    EXPECT_EQ(instantiate(), nullptr);
+}
+
+TEST_F(CollectionOfAQualifiedDataType, IsRefusedForAKeyOfAnotherType)
+{
+    qualify(StandardTypes::booleanMeta, 1);
+
+    EXPECT_RAISES_WITH(messages::UnsupportedQualification, instantiate(), u"Boolean");
 }
 }  // namespace
 }  // namespace tarn::kiln::meta

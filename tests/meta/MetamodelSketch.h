@@ -1,6 +1,7 @@
 /// \file
 /// A model like the registry's, for metamodel elements of a test's own.
 #pragma once
+#include "tarnkiln/kernel/ModelConstellation.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/EnumImpl.h"
@@ -59,5 +60,12 @@ protected:
     void expectConsistent() { EXPECT_THAT(m_model->checkInvariants(), ::testing::IsEmpty()); }
 
     Model m_model = Model::createRegistryModel(u"sketch");
+};
+
+/// The same in an ordinary model, whose elements may refer to those of the registry.
+class OrdinarySketch : public MetamodelSketch
+{
+protected:
+    OrdinarySketch() { m_model = Model::create(ModelConstellation()); }
 };
 }  // namespace tarn::kiln::meta

@@ -23,6 +23,7 @@
 #include "tarnkiln/meta/PackageBuilder.h"
 #include "tarnkiln/meta/PrimitiveTypeBuilder.h"
 #include "tarnkiln/meta/PropertyBuilder.h"
+#include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/RealAttributeBuilder.h"
 #include "tarnkiln/meta/StringAttributeBuilder.h"
 #include "tarnkiln/meta/StructuredTypeBuilder.h"
@@ -465,6 +466,7 @@ constexpr support::OperationRow operations[] = {
      .lower = 1, .upper = 1, .invoker = support::makeInvokerOf<&Extension::Impl::createPrototype>,
      .uuid = "09600bbe-603c-3cd6-9005-b15791d42191"},
     {.name = u"isDynamicDefault", .type = {u"Boolean"}, .lower = 1, .upper = 1,
+     .invoker = support::makeInvokerOf<&Property::Impl::isDynamicDefault>,
      .uuid = "47951ee7-39c9-33bc-b4f4-34d9c43dfe27"},
     {.name = u"getPropertyByName", .type = {Classes, rows::classes::Property}, .lower = 1,
      .upper = 1, .arguments = {17, 1},

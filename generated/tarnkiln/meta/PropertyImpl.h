@@ -158,6 +158,17 @@ public:
     /// The owner's qualified name, a dot and the name; the name alone without an owner.
     ustring identifier() const override;
 
+    /// Whether `defaultValue` computes another value at each call: a random UUID, the present time.
+    bool isDynamicDefault() const;
+
+    /// The value that new elements start with; absent if there is no text for it. A text may be
+    /// in any flavour of the type. For an enumeration it is the name of a literal, and "random" is
+    /// a new UUID, "now" the local time in whole seconds.
+    ///
+    /// None for many values, without a live type, for classes, data types and `HostArray`, if no
+    /// flavour can read the text, and if the type has no absent value.
+    boost::optional<Value> defaultValue() const;
+
 private:
     bool m_isDerived = false;
     bool m_isComposite = false;

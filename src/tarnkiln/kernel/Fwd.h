@@ -18,6 +18,7 @@ class ModelConstellation;
 class ModelElement;
 class ModelId;
 class ProxyId;
+class ReflectiveDataType;
 class ReportData;
 class Transaction;
 class Value;

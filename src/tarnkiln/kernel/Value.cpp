@@ -3,14 +3,20 @@
 #include "tarnkiln/Assert.h"
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/internal/TypeKind.h"
-#include "tarnkiln/kernel/internal/ValuePayload.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/DataTypeImpl.h"
+#include "tarnkiln/meta/DatatypeSerializer.h"
 #include "tarnkiln/meta/Enum.h"
 #include "tarnkiln/meta/EnumImpl.h"
 #include "tarnkiln/meta/EnumLiteralImpl.h"
+#include "tarnkiln/meta/MetaRegistry.h"
 #include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/PropertySerializer.h"
+#include "tarnkiln/meta/PropertySerializerRegistry.h"
+#include "tarnkiln/meta/ReflectiveDataType.h"
 #include "tarnkiln/meta/StandardTypes.h"
+#include "tarnkiln/support/ValuePayload.h"
 
 #include <exception>
 #include <memory>
@@ -21,6 +27,15 @@ namespace tarn::kiln {
 using internal::qualifiedName;
 using tarnkiln::messages::CannotCastIncompatibleTypes;
 using tarnkiln::messages::InvalidValue;
+
+namespace {
+
+bool isInRegistry(meta::Type const& type)
+{
+    meta::MetaRegistry::LockedConstModel const locked(meta::MetaRegistry::getInstance());
+    return type->getModelImpl() == locked.getModel().getImpl();
+}
+}  // namespace
 
 Value Value::createEnumValue(meta::EnumLiteral const& literal)
 {
@@ -46,13 +61,46 @@ Value Value::createCollectionValue(meta::Property const& property,
     return result;
 }
 
-Value Value::createEmptyValue(meta::Type const& type, bool /*required*/)
+Value Value::createReflectiveDataTypeValue(ReflectiveDataType const& value)
 {
-    if (!internal::classImpl(type))
-        reportException(InvalidValue());
-    Value result(ValueMeta(type), nullptr);
-    result.storeElement(ModelElement());
+    Value result(ValueMeta(value.getDataType()), nullptr);
+    result.setPayload(new ReflectiveDataType(value));
+    result.setReflective();
     return result;
+}
+
+Value Value::createReflectiveDataTypeValue(meta::DataType const& type, bool required)
+{
+    if (required)
+        return createReflectiveDataTypeValue(ReflectiveDataType(type));
+    Value result(ValueMeta(type, ValueFlags::OptionalSingle), nullptr);
+    result.setReflective();
+    return result;
+}
+
+Value Value::createEmptyValue(meta::Type const& type, bool required)
+{
+    if (internal::classImpl(type))
+    {
+        Value result(ValueMeta(type), nullptr);
+        result.storeElement(ModelElement());
+        return result;
+    }
+    auto const& registry = meta::PropertySerializerRegistry::getInstance();
+    if (meta::DataType const dataType = meta::DataType::cast(type); dataType.getImpl())
+    {
+        if (auto const* const serializer = registry.getDatatypeSerializer(dataType))
+            return required ? serializer->createDefaultValue()
+                            : serializer->createEmptyOptionalValue();
+        if (!dataType || isInRegistry(type))
+            reportException(InvalidValue());
+        return createReflectiveDataTypeValue(dataType, required);
+    }
+    auto const* const serializer = registry.getPropertySerializer(type, "");
+    if (!serializer)
+        reportException(InvalidValue());
+    return required ? serializer->createDefaultValue(type)
+                    : serializer->createEmptyOptionalValue(type);
 }
 
 Value Value::createEmptyValue(meta::Property const& property)
@@ -138,6 +186,35 @@ boost::optional<long> Value::getEnumNumber() const
         failCast();
     auto const* const number = payload<int>();
     return number ? boost::optional<long>(*number) : boost::none;
+}
+
+ReflectiveDataType Value::toReflectiveDataType() const
+{
+    auto const fail = [] [[noreturn]] {
+        reportException(CannotCastIncompatibleTypes(qualifiedName(meta::DataType::metaClass())));
+    };
+    meta::DataType const type = meta::DataType::cast(m_type);
+    if (!type.getImpl())
+        fail();
+    if (m_reflective)
+    {
+        if (m_flags == ValueFlags::OptionalSingle)
+            reportException(InvalidValue());
+        auto const* const held = payload<ReflectiveDataType>();
+        return held ? *held : ReflectiveDataType(type);
+    }
+
+    auto const* const serializer =
+        meta::PropertySerializerRegistry::getInstance().getDatatypeSerializer(type);
+    if (!serializer)
+        fail();
+    ReflectiveDataType result(type);
+    for (auto const& [name, property] : type->getOwnedAttributes())
+    {
+        if (property)
+            result.setPropertyValue(property, serializer->getPropertyValue(*this, property));
+    }
+    return result;
 }
 
 void Value::checkCompatibleWithProperty(meta::Property const& property) const

@@ -18,6 +18,10 @@
 #include <cstddef>
 #include <vector>
 
+namespace tarn::kiln::support {
+struct PayloadAccess;
+}
+
 namespace tarn::kiln {
 
 /// A scalar, an element, a data type value or a collection, with its type and shape.
@@ -27,6 +31,7 @@ namespace tarn::kiln {
 /// | scalar, optional scalar | the scalar; nothing if absent | has its own |
 /// | element | a handle; may be empty | refers to the same element |
 /// | literal of an enumeration | its number | has its own |
+/// | value of a data type | its C++ class, or a `ReflectiveDataType` | has its own |
 /// | unmanaged collection | a `std::vector` or `std::set` | has its own |
 /// | managed collection | an element's collection, which it does not own | shares it |
 ///
@@ -64,13 +69,28 @@ public:
     ///     that is no enumeration.
     static Value createOptionalEnumValue(meta::Property const& property,
                                          boost::optional<long> const& number);
+    /// A `Single` value of the data type, marked as reflective.
+    static Value createReflectiveDataTypeValue(ReflectiveDataType const& value);
+    /// The same with all fields at their defaults, or an absent one if it is not `required`.
+    ///
+    /// \throws tarnkiln::messages::NoSuchType  (qualified name) if one is required of a type that is
+    ///     empty or dead.
+    static Value createReflectiveDataTypeValue(meta::DataType const& type, bool required);
     /// A value that shares `collection`, an element's value of `property`. Null is none.
     static Value createCollectionValue(meta::Property const& property,
                                        AbstractOwnedCollection* collection);
-    /// The value of a property that has none: of a class, a `Single` value with an empty handle.
-    /// Types other than classes have no empty values.
+    /// The value of a property that has none.
     ///
-    /// \throws tarnkiln::messages::InvalidValue  if there is none for `type`.
+    /// | Type | Required | Optional |
+    /// |---|---|---|
+    /// | a class | an empty handle | the same |
+    /// | a data type with a serializer | the serializer's default value | its absent one |
+    /// | a data type without, outside the registry | a reflective value | an absent one |
+    /// | all others, by their serializer | its default value | its absent one |
+    ///
+    /// \throws tarnkiln::messages::InvalidValue  if a type of the last row, or a data type of the
+    ///     registry, has no serializer.
+    /// \throws std::bad_cast  for an enumeration without literals.
     static Value createEmptyValue(meta::Type const& type, bool required);
     /// The same for the property's type, required if the lower bound is 1.
     ///
@@ -137,6 +157,13 @@ public:
     ///     that was assigned to a value of another kind.
     std::vector<Value> extractEntryValues() const;
 
+    /// The fields of a value of a data type, whichever form it has.
+    ///
+    /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  (qualified name of the class of data
+    ///     types) if it is of another type, or of one that has no serializer.
+    /// \throws tarnkiln::messages::InvalidValue  if it is reflective and absent.
+    ReflectiveDataType toReflectiveDataType() const;
+
     /// Whether there is no payload; never so for a value that holds an empty handle.
     bool isAbsent() const { return !m_data; }
     /// @}
@@ -158,6 +185,7 @@ public:
 
 private:
     template <class T> friend struct support::ValueAccess;
+    friend struct support::PayloadAccess;
 
     using Deleter = void (*)(void*);
     using Cloner = void* (*)(void*);

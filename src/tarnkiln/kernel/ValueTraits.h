@@ -12,6 +12,7 @@
 
 #include <concepts>
 #include <set>
+#include <type_traits>
 #include <vector>
 
 namespace boost::posix_time {
@@ -23,12 +24,20 @@ namespace tarn::kiln::support {
 template <class T, class... Types>
 concept OneOf = (std::same_as<T, Types> || ...);
 
+/// Whether `T` stands for a data type of a metamodel; generated code says so.
+template <class T> inline constexpr bool isDataType = false;
+
 /// Plain values.
 template <class T>
 concept PlainScalar =
     OneOf<T, bool, signed char, unsigned char, short, unsigned short, int, unsigned int, long,
           unsigned long, double, ustring, string, UUID, boost::posix_time::ptime,
-          meta::TransactionOrigin, meta::ExtensionPrototype, meta::Language>;
+          meta::TransactionOrigin, meta::ExtensionPrototype, meta::Language> ||
+    isDataType<T>;
+
+/// Enumerations of metamodels; their values are carried by the numbers of the literals.
+template <class T>
+concept Literals = std::is_enum_v<T> && !PlainScalar<T>;
 
 /// Handles of elements; `T` must be a complete type.
 template <class T>

@@ -2,7 +2,10 @@
 
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/ExtensionPrototypeDatatypeSerializer.h"
+#include "tarnkiln/meta/TransactionOriginDatatypeSerializer.h"
 #include "tarnkiln/meta/internal/buildCatalogueFor.h"
+#include "tarnkiln/support/SerializerInstaller.h"
 
 namespace tarn::kiln::meta {
 
@@ -20,6 +23,11 @@ void MetaPackageMeta::completed()
     // The registry made these two before it could make collections.
     getModelClass()->getOwnedAttributes();
     getModelElementClass()->getOwnedAttributes();
+
+    support::installDatatypeSerializer<ExtensionPrototypeDatatypeSerializer>(
+        getDataType(rows::dataTypes::ExtensionPrototype));
+    support::installDatatypeSerializer<TransactionOriginDatatypeSerializer>(
+        getDataType(rows::dataTypes::TransactionOrigin));
 }
 
 Class const& MetaPackageMeta::getModelClass() const

@@ -103,10 +103,28 @@ public:
     std::unique_ptr<ModelElement::Builder> instantiateBuilder(Class const& metaClass,
                                                               Model const& model) const;
     /// A new collection for the many-valued property of `owner`, or a snapshot if that is empty;
-    /// the caller owns it. Null if the property's type, and no other of its name, is not
-    /// registered with a function for it. Data types that are not generated have no collections.
+    /// the caller owns it.
+    ///
+    /// | Type of the property | Collection |
+    /// |---|---|
+    /// | a data type, with a qualifying property | `ReflectiveDataTypeAssociative`; null if that |
+    /// |                                         | has many values, no type, or a class as type |
+    /// | a data type outside the registry model | `ReflectiveDataTypeSequence` |
+    /// | any other | what the function registered with the type makes; null if the type, and |
+    /// |           | no other of its name, is not registered with one |
+    ///
+    /// \throws tarnkiln::messages::UnsupportedQualification  as below.
     AbstractOwnedCollection* instantiateDynamicCollection(ModelElement const& owner,
                                                           Property const& property) const;
+    /// A new collection of values of `dataType` by the value of `keyProperty`; the caller owns it.
+    ///
+    /// \throws tarnkiln::messages::UnsupportedQualification  (qualified name of the key's type)
+    ///     unless that is an integral type, a type of texts, `UUID` or an enumeration.
+    AbstractOwnedCollection* createReflectiveDataTypeAssociative(DataType const& dataType,
+                                                                 Property const& keyProperty,
+                                                                 ModelElement const& owner,
+                                                                 Property const& property,
+                                                                 bool uniqueKeys) const;
     /// @}
 
     /// \name Packages and families

@@ -10,7 +10,6 @@
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/MetaRegistry.h"
 #include "tarnkiln/meta/PrimitiveType.h"
-#include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/meta/TypeImpl.h"
 
@@ -114,22 +113,6 @@ std::unique_ptr<ModelElement::Builder> MetaRegistry::instantiateBuilder(Class co
         return nullptr;
     TypeEntry const* const entry = findEntry(metaClass);
     return entry && entry->builderInstantiator ? entry->builderInstantiator(model) : nullptr;
-}
-
-AbstractOwnedCollection* MetaRegistry::instantiateDynamicCollection(ModelElement const& owner,
-                                                                    Property const& property) const
-{
-    LockedConstModel const locked(*this);
-    Type const type = property->getType();
-    if (!type)
-        return nullptr;
-    bool const isDataType = DataType::cast(type).getImpl() != nullptr;
-    bool const isOurs = type->getModelImpl() == m_model.getImpl();
-    if (isDataType && (!isOurs || property->getQualifiedBy()))
-        return nullptr;
-    TypeEntry const* const entry = findEntry(type);
-    return entry && entry->collectionInstantiator ? entry->collectionInstantiator(owner, property)
-                                                  : nullptr;
 }
 
 MetaRegistry::TypeEntry const* MetaRegistry::findEntry(Type const& type) const

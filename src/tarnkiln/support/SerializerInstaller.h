@@ -1,6 +1,8 @@
 /// \file
 /// What the rows of a metamodel name to give a type its text forms.
 #pragma once
+#include "tarnkiln/meta/DataType.h"
+#include "tarnkiln/meta/DatatypeSerializer.h"
 #include "tarnkiln/meta/EnumPropertySerializer.h"
 #include "tarnkiln/meta/PropertySerializerRegistry.h"
 #include "tarnkiln/meta/TransientOnlyPropertySerializer.h"
@@ -26,5 +28,13 @@ template <class E> void installEnumSerializers(meta::Type const& type)
         type, std::make_unique<meta::EnumPropertySerializerAsValue<E>>(type), "ID");
     registry.registerPropertySerializer(
         type, std::make_unique<meta::EnumPropertySerializerAsPublicId<E>>(type), "PublicID");
+}
+
+/// Registers what takes the values of a data type apart.
+template <class Serializer> void installDatatypeSerializer(meta::Type const& type)
+{
+    auto const dataType = meta::DataType::cast(type);
+    meta::PropertySerializerRegistry::getInstance().registerDatatypeSerializer(
+        dataType, std::make_unique<Serializer>(dataType));
 }
 }  // namespace tarn::kiln::support
