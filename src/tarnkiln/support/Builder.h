@@ -73,7 +73,7 @@ template <auto... FIELDS> struct BuilderFields
 constexpr int NO_SUCH_PROPERTY = -1;
 
 /// Where the values of the classes without superclass end: what nobody answered, nobody knows.
-class BuilderRoot
+class TARNKILN_EXPORT BuilderRoot
 {
 public:
     explicit BuilderRoot(ModelElement::Builder& builder) : m_builder(builder) {}

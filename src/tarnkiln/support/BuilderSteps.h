@@ -54,7 +54,7 @@ struct BuilderSteps<Optional<FIELD, SLOT, SETTER>> : NoBuilderSteps
 
     template <class Plain> static bool take(Plain& field, Value const& value)
     {
-        field = value.getValue<Plain>();
+        field = PlainField<Plain>::fromValue(value);
         return true;
     }
     static void construct(FieldOwner<FIELD>& element, auto const& field) { element.*FIELD = field; }
@@ -220,7 +220,7 @@ struct BuilderSteps<Values<FIELD, SLOT, MAKE, GETTER>> : NoBuilderSteps
         }
         std::vector<T> added;
         for (Value const& entry : value.extractEntryValues())
-            added.push_back(entry.getValue<T>());
+            added.push_back(plainOf<T>(entry));
         field.insert(field.end(), added.begin(), added.end());
         return true;
     }

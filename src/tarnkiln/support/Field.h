@@ -22,6 +22,28 @@ inline void refuseProxy(ModelElement::Impl const& element)
         reportException(tarnkiln::messages::CannotModifyProxy());
 }
 
+/// Fails with `CannotSetReadOnlyProperty` if a property that can be set once has a value already.
+/// A document that is read may set it nevertheless.
+template <class T>
+void refuseSecondValue(ModelElement::Impl const& element, T const& present,
+                       ustring const& propertyName)
+{
+    refuseProxy(element);
+    if (element.isLive() && !element.getModelImpl()->isParsing() && !(present == T()))
+        reportException(tarnkiln::messages::CannotSetReadOnlyProperty(propertyName));
+}
+
+/// The same for a reference; the target that it has may be given again.
+inline void refuseSecondTarget(ModelElement::Impl const& element,
+                               ModelElement::Impl const* present, ModelElement::Impl const* target,
+                               ustring const& propertyName)
+{
+    refuseProxy(element);
+    bool const isSet = present && present != target && present->isLive();
+    if (element.isLive() && !element.getModelImpl()->isParsing() && isSet)
+        reportException(tarnkiln::messages::CannotSetReadOnlyProperty(propertyName));
+}
+
 /// Stores a plain value. A destroyed element ignores it.
 template <class T>
 void setScalar(ModelElement::Impl& element, T& field, Slot const& slot,
@@ -63,9 +85,12 @@ Target* resolve(ModelElement::Impl const& element, CountedPointer<Target>& field
 
 /// Stores the target of a single reference, be it contained or not, and keeps the other end in
 /// step.
-template <class Target>
+///
+/// \param requireFree  called before anything changes, if there is a target; fails if the other end
+///                     has no room.
+template <class Target, class RequireFree>
 void setReference(ModelElement::Impl& element, CountedPointer<Target>& field, Slot const& slot,
-                  std::type_identity_t<Target>* value)
+                  std::type_identity_t<Target>* value, RequireFree requireFree)
 {
     refuseProxy(element);
     if (value == field.get() || !element.isLive())
@@ -73,6 +98,8 @@ void setReference(ModelElement::Impl& element, CountedPointer<Target>& field, Sl
     ModelElement const self(&element);
     CountedPointer<Target> const added(value);
     CountedPointer<Target> const removed = field;
+    if (value && value->isLive())
+        requireFree();
     element.checkCompatibleModel(value, slot);
 
     JoiningTransaction transaction(element);
@@ -88,6 +115,13 @@ void setReference(ModelElement::Impl& element, CountedPointer<Target>& field, Sl
     if (oldLives && slot.composite && !slot.opposite)
         element._basicSetUncontained(removed.get());
     transaction.commit();
+}
+
+template <class Target>
+void setReference(ModelElement::Impl& element, CountedPointer<Target>& field, Slot const& slot,
+                  std::type_identity_t<Target>* value)
+{
+    setReference(element, field, slot, value, [] {});
 }
 
 /// The container, if the element is held by the property opposite of `slot`; else null.

@@ -36,4 +36,46 @@ void changeKey(ModelElement::Impl& element, Key const& present, Key const& key, 
         element._inverseAddThis(owner.getImpl(), *toOwner.opposite, /*force=*/true);
     transaction.commit();
 }
+
+/// One of several owners that keep an element by its key.
+///
+/// `requireFree` fails if the key is taken there.
+template <class Owner, class RequireFree> struct KeyedBy
+{
+    Owner owner;
+    Slot const& toOwner;
+    RequireFree requireFree;
+};
+template <class Owner, class RequireFree>
+KeyedBy(Owner, Slot const&, RequireFree) -> KeyedBy<Owner, RequireFree>;
+
+/// For a collection that admits several elements of one key.
+inline constexpr auto anyKey = [] {};
+
+/// The same for an element that stands in collections of several owners.
+template <class Key, class Store, class... Owner, class... RequireFree>
+void changeKey(ModelElement::Impl& element, Key const& present, Key const& key, Store store,
+               KeyedBy<Owner, RequireFree> const&... places)
+{
+    if (key == present || !element.isLive())
+        return;
+    auto const whereOwned = [](auto const& place, auto step) {
+        if (place.owner)
+            step(place);
+    };
+    (whereOwned(places, [](auto const& place) { place.requireFree(); }), ...);
+    ModelElement const self(&element);
+
+    JoiningTransaction transaction(element);
+    auto const leave = [&](auto const& place) {
+        element._inverseRemoveThis(place.owner.getImpl(), *place.toOwner.opposite);
+    };
+    (whereOwned(places, leave), ...);
+    store();
+    auto const join = [&](auto const& place) {
+        element._inverseAddThis(place.owner.getImpl(), *place.toOwner.opposite, /*force=*/true);
+    };
+    (whereOwned(places, join), ...);
+    transaction.commit();
+}
 }  // namespace tarn::kiln::support

@@ -8,6 +8,7 @@
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/support/Field.h"
+#include "tarnkiln/support/PlainField.h"
 #include "tarnkiln/support/Record.h"
 #include "tarnkiln/support/Rows.h"
 
@@ -41,7 +42,7 @@ template <class Target> typename Target::Impl* targetOf(ModelElement const& elem
 template <class Plain> Plain plainOf(Value const& value)
 {
     bool const isFalse = std::is_same_v<Plain, bool> && value.isAbsent();
-    return isFalse ? Plain() : value.getValue<Plain>();
+    return isFalse ? Plain() : PlainField<Plain>::fromValue(value);
 }
 
 /// Whether a dying element of another model is to stand in this reference as a proxy.
@@ -126,11 +127,11 @@ template <auto FIELD, Slot const& SLOT> struct PlainFieldSteps : FieldSteps<FIEL
     static Value get(Owner const& element, meta::Property const& property,
                      internal::ReflectionPrivateTag const& /*tag*/)
     {
-        return Value::createPrimitiveValue(property, element.*FIELD);
+        return PlainField<Plain>::toValue(property, element.*FIELD);
     }
     static Value old(auto const& /*record*/, Plain const& old, meta::Property const& property)
     {
-        return Value::createPrimitiveValue(property, old);
+        return PlainField<Plain>::toValue(property, old);
     }
 };
 
@@ -156,7 +157,7 @@ struct Steps<Optional<FIELD, SLOT, SETTER>> : PlainFieldSteps<FIELD, SLOT>
     static bool has(Owner const& element) { return (element.*FIELD).has_value(); }
     static bool set(Owner& element, Value const& value)
     {
-        (element.*SETTER)(value.getValue<FieldType<FIELD>>());
+        (element.*SETTER)(PlainField<FieldType<FIELD>>::fromValue(value));
         return true;
     }
 };
