@@ -11,6 +11,7 @@ METAGEN = ROOT / "tools/metagen/metagen.py"
 CATALOGUE = ROOT / "src/tarnkiln/meta/catalogue.json"
 OVERLAY = ROOT / "src/tarnkiln/meta/catalogue.cpp.json"
 GENERATED = ROOT / "generated/tarnkiln/meta"
+GOLDEN = ROOT / "tests/metagen/golden"
 
 
 def run(description, output, *options):
@@ -39,6 +40,41 @@ class GeneratedCatalogue(unittest.TestCase):
         for path in sorted(GENERATED.glob("*.h")) + sorted(GENERATED.glob("*.cpp")):
             for number, line in enumerate(path.read_text().splitlines(), 1):
                 self.assertLessEqual(len(line), 100, f"{path.name}:{number}")
+
+
+class GeneratedClient(unittest.TestCase):
+    """The output for a metamodel of three classes, to be read when a template changes.
+
+    Made anew by `tools/metagen/metagen.py tests/metagen/golden/garden.json
+    tests/metagen/golden/garden`.
+    """
+
+    def test_looks_like_the_golden_one(self):
+        result = run(GOLDEN / "garden.json", GOLDEN / "garden", "--check")
+
+        self.assertEqual(result.returncode, 0, result.stdout + result.stderr)
+
+    def test_has_no_line_that_is_too_long(self):
+        for path in sorted((GOLDEN / "garden").iterdir()):
+            for number, line in enumerate(path.read_text().splitlines(), 1):
+                self.assertLessEqual(len(line), 100, f"{path.name}:{number}")
+
+    def test_lies_where_it_is_included(self):
+        with tempfile.TemporaryDirectory() as folder:
+            run(GOLDEN / "garden.json", folder, "--root")
+            listed = run(GOLDEN / "garden.json", folder, "--root", "--list").stdout.split()
+
+            written = [str(path.relative_to(folder))
+                       for path in sorted(pathlib.Path(folder).glob("acme/garden/*"))]
+            self.assertEqual(written, sorted(listed))
+            self.assertIn("acme/garden/Bed.h", written)
+
+    def test_depends_on_the_generator_and_all_descriptions(self):
+        inputs = run(GOLDEN / "garden.json", "nowhere", "--inputs").stdout.split()
+
+        for path in [GOLDEN / "garden.json", CATALOGUE, OVERLAY, METAGEN,
+                     METAGEN.parent / "templates/Class.cpp.jinja"]:
+            self.assertIn(str(path), inputs)
 
 
 class StaleOutput(unittest.TestCase):

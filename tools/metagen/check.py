@@ -20,6 +20,18 @@ def capital(name):
     return name[0].upper() + name[1:]
 
 
+def cpp_name(entry):
+    """The name in C++; the catalogue's names are the same there."""
+    return entry.get("cppName", entry["name"])
+
+
+def accessors(prop):
+    """The functions that stand for a property."""
+    name = capital(cpp_name(prop))
+    getter = cpp_name(prop) if re.match("is[A-Z]", cpp_name(prop)) else f"get{name}"
+    return [getter, f"get{name}Impl", f"has{name}", f"set{name}", f"make{name}"]
+
+
 class Rules:
     """The rules for the types of one package.
 
@@ -70,11 +82,11 @@ class Rules:
         for kind in ("classes", "dataTypes", "enumerations"):
             for place, entry in self.each(f"/{kind}", self.facts[kind]):
                 self.check_word(f"{place}/name", entry["name"], words.LIBRARY)
-                self.check_once(f"{place}/name", entry["name"], seen, "type")
+                self.check_once(f"{place}/name", entry["name"], seen, "a type")
 
     def check_once(self, place, name, seen, kind):
         if name in seen:
-            self.refuse(place, f"there is a {kind} {name} already, at {seen[name]}")
+            self.refuse(place, f"there is {kind} {name} already, at {seen[name]}")
         seen.setdefault(name, place)
 
     def check_word(self, place, name, also=frozenset()):
@@ -138,21 +150,26 @@ class Rules:
 
     def check_members(self, place, cls):
         """No two members of a class have one name, nor does one hide what all elements have."""
-        seen = {}
+        seen, functions = {}, {}
         for where, prop in self.each(f"{place}/properties", cls["properties"]):
-            self.check_word(f"{where}/name", prop["name"])
-            self.check_once(f"{where}/name", prop["name"], seen, "property")
-            inherited = self.find(cls["superclass"], prop["name"])
-            if inherited:
+            self.check_word(f"{where}/name", cpp_name(prop))
+            self.check_once(f"{where}/name", prop["name"], seen, "a property")
+            if self.find(cls["superclass"], prop["name"]):
                 self.refuse(f"{where}/name", f"a superclass has a property {prop['name']}")
-            for prefix in ("get", "is", "has", "set"):
-                member = prefix + capital(prop["name"])
-                if member in words.MEMBERS:
-                    self.refuse(f"{where}/name", f"{member} means something else for every element")
+            for function in accessors(prop):
+                functions.setdefault(function, prop["name"])
+                if function in words.MEMBERS:
+                    self.refuse(f"{where}/name",
+                                f"{function} means something else for every element")
+                elif functions[function] != prop["name"]:
+                    self.refuse(f"{where}/name", f"{function} stands for {functions[function]}")
         for where, operation in self.each(f"{place}/operations", cls["operations"]):
-            self.check_word(f"{where}/name", operation["name"], words.MEMBERS)
+            name = cpp_name(operation)
+            self.check_word(f"{where}/name", name, words.MEMBERS)
+            if name in functions:
+                self.refuse(f"{where}/name", f"{name} stands for {functions[name]}")
             types = ", ".join(argument["type"] for argument in operation["arguments"])
-            self.check_once(f"{where}/name", f"{operation['name']}({types})", seen, "operation")
+            self.check_once(f"{where}/name", f"{operation['name']}({types})", seen, "an operation")
 
     # Properties
 
@@ -267,15 +284,15 @@ class Rules:
         seen = {}
         for where, argument in self.each(f"{place}/arguments", operation["arguments"]):
             self.check_word(f"{where}/name", argument["name"])
-            self.check_once(f"{where}/name", argument["name"], seen, "argument")
+            self.check_once(f"{where}/name", argument["name"], seen, "an argument")
             if "typeKind" in argument:
                 self.check_type(f"{where}/type", argument)
 
     def check_fields(self, place, entry):
         seen = {}
         for where, prop in self.each(f"{place}/properties", entry["properties"]):
-            self.check_word(f"{where}/name", prop["name"])
-            self.check_once(f"{where}/name", prop["name"], seen, "property")
+            self.check_word(f"{where}/name", cpp_name(prop))
+            self.check_once(f"{where}/name", prop["name"], seen, "a property")
             self.check_bounds(where, prop)
             if prop["typeKind"] == "Class":
                 self.refuse(f"{where}/type", "a field of a data type can't be an element")
@@ -294,10 +311,12 @@ class Rules:
             self.leads_to(prop["type"], wanted, (*seen, name)) for prop in fields)
 
     def check_literals(self, place, entry):
-        seen = {}
+        seen, enumerators = {}, {}
         for where, literal in self.each(f"{place}/literals", entry["literals"]):
-            self.check_word(f"{where}/name", capital(literal["name"]))
-            self.check_once(f"{where}/name", literal["name"], seen, "literal")
+            self.check_word(f"{where}/name", capital(cpp_name(literal)))
+            self.check_once(f"{where}/name", literal["name"], seen, "a literal")
+            self.check_once(f"{where}/name", capital(cpp_name(literal)), enumerators,
+                            "an enumerator")
 
     # UUIDs
 
@@ -320,9 +339,14 @@ class Rules:
     def check_uuid(self, place, text):
         if not UUID_FORM.fullmatch(text):
             self.refuse(place, f"{text!r} is no UUID in lower case")
-        elif text in self.uuids:
+        elif text in self.uuids and not self.is_misnamed(place):
             self.refuse(place, f"the UUID {text} belongs to {self.uuids[text]}")
         self.uuids.setdefault(text, place)
+
+    def is_misnamed(self, place):
+        """Whether a name on the way to `place` is refused; UUIDs that are made repeat with it."""
+        return any(place.startswith(found.removesuffix("name"))
+                   for found, reason in self.problems.found if found.endswith("/name"))
 
 
 def check_overlay(problems, overlay, facts):

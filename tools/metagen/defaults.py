@@ -10,7 +10,7 @@ INTEGERS = {"Integer": (32, True), "Integer8": (8, True), "Integer16": (16, True
 BOOLEANS = {"true": "true", "1": "true", "false": "false", "0": "false"}
 DYNAMIC = {"UUID": "random", "DateTime": "now"}
 REAL = re.compile(r"[+-]?(\d+[.]?\d*|[.]\d+)([eE][+-]?\d+)?")
-DATE_TIME = re.compile(r"\d{8}T\d{6}([.,]\d{1,6})?")
+DATE_TIME = re.compile(r"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d|\d{8}T\d{6})([.,]\d{1,6})?")
 SPECIAL_TIMES = {"not-a-date-time": "not_a_date_time", "+infinity": "pos_infin",
                  "-infinity": "neg_infin"}
 UNPARSED = "does not parse as"
@@ -28,7 +28,7 @@ def expression(type_name, text):
     if type_name in INTEGERS:
         return integer(text, *INTEGERS[type_name])
     parse = {"Boolean": boolean, "Real": real, "UUID": uuid_bytes, "DateTime": date_time,
-             "String": wide_text, "StdString": json.dumps}.get(type_name)
+             "String": wide_text, "StdString": narrow_text}.get(type_name)
     if parse is None:
         raise NoDefault(f"{type_name} has no text form")
     return parse(text)
@@ -71,7 +71,9 @@ def uuid_bytes(text):
         return "tarn::kiln::ElementImpl::generateNewUuid()"
     if not re.fullmatch(r"[0-9a-fA-F]{8}(-[0-9a-fA-F]{4}){3}-[0-9a-fA-F]{12}", text):
         raise NoDefault(UNPARSED)
-    return "UUID{{" + ", ".join(f"0x{byte:02x}" for byte in uuid.UUID(text).bytes) + "}}"
+    numbers = [f"0x{byte:02x}" for byte in uuid.UUID(text).bytes]
+    halves = [", ".join(numbers[:8]), ", ".join(numbers[8:])]
+    return "UUID{{" + (",\n" + " " * 8).join(halves) + "}}"
 
 
 def date_time(text):
@@ -81,8 +83,15 @@ def date_time(text):
         return f"boost::posix_time::ptime(boost::posix_time::{SPECIAL_TIMES[text]})"
     if not DATE_TIME.fullmatch(text):
         raise NoDefault(UNPARSED)
-    return f'boost::posix_time::from_iso_string("{text}")'
+    return f'boost::posix_time::from_iso_string("{re.sub("[-:]", "", text)}")'
 
 
 def wide_text(text):
-    return "u" + json.dumps(text)
+    return "u" + narrow_text(text)
+
+
+def narrow_text(text):
+    """A literal; what JSON escapes by a number C++ takes as an octal one."""
+    quoted = json.dumps(text, ensure_ascii=False)
+    return re.sub(r"(?<!\\)((?:\\\\)*)\\u00([0-9a-f]{2})",
+                  lambda found: f"{found[1]}\\{int(found[2], 16):03o}", quoted)

@@ -27,6 +27,10 @@ def load(file, catalogue, imported):
     return normal.facts(), normal.overlay(), packages
 
 
+def cpp_name(entry):
+    return entry["cpp"].get("name", entry["name"])
+
+
 def capital(name):
     return name[0].upper() + name[1:]
 
@@ -121,6 +125,7 @@ class Normal:
         lower = entry.get("lower", 0 if many else 1)
         return {
             "name": entry["name"],
+            "cppName": cpp_name(entry),
             "index": entry.get("index"),
             "type": entry["type"],
             "typeKind": kind,
@@ -154,6 +159,7 @@ class Normal:
         path = f"{entry['name']}({types})"
         return {
             "name": entry["name"],
+            "cppName": cpp_name(entry),
             "result": self.multiplicity(entry["result"]) if "result" in entry else None,
             "abstract": entry["abstract"],
             "static": entry["static"],
@@ -185,6 +191,7 @@ class Normal:
             value = literal.get("value", value)
             literals.append({
                 "name": literal["name"],
+                "cppName": cpp_name(literal),
                 "value": value,
                 "publicIdentifier": literal.get("publicIdentifier"),
                 "uuid": self.uuid(literal, entry["name"], literal["name"]),

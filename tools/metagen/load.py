@@ -1,4 +1,5 @@
 """Loads descriptions: the catalogue's, which is in two files, and those of clients."""
+import functools
 import pathlib
 
 import check
@@ -20,6 +21,7 @@ def package(file, above=()):
     return from_description(file, lambda imported: package(imported, (*above, path)))
 
 
+@functools.cache
 def catalogue():
     """The metamodel of the library, on which all others stand."""
     installed = ROOT / "catalogue.json"

@@ -5,7 +5,10 @@ import difflib
 import pathlib
 import sys
 
-import jinja2
+try:
+    import jinja2
+except ImportError:
+    sys.exit("metagen needs the Python package Jinja2; on Debian it is called python3-jinja2")
 
 import builders
 import load
@@ -21,7 +24,9 @@ PER_CATALOGUE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt
 PER_CLIENT = {"Fwd.h": "Fwd.h"}
 META_PACKAGE = {"MetaPackage.h": ".h", "MetaPackage.cpp": ".cpp"}
 PER_ENUMERATION = {"Enumeration.h": "{name}.h"}
-PER_DATA_TYPE = {"DataType.h": "{name}.h", "DataType.cpp": "{name}.cpp"}
+PER_DATA_TYPE = {"DataType.h": "{name}.h", "DataType.cpp": "{name}.cpp",
+                 "DatatypeSerializer.h": "{name}DatatypeSerializer.h",
+                 "DatatypeSerializer.cpp": "{name}DatatypeSerializer.cpp"}
 
 
 def environment():
@@ -62,9 +67,9 @@ def render(package, command):
 
 
 def write(files, output):
-    output.mkdir(parents=True, exist_ok=True)
     for name, text in sorted(files.items()):
         path = output / name
+        path.parent.mkdir(parents=True, exist_ok=True)
         if not path.exists() or path.read_text() != text:
             path.write_text(text)
 
@@ -91,6 +96,8 @@ def main():
     parser.add_argument("description", type=pathlib.Path,
                         help="NAME.json; of the catalogue the facts, beside which NAME.cpp.json lies")
     parser.add_argument("output", type=pathlib.Path, help="the folder of the generated files")
+    parser.add_argument("--root", action="store_true",
+                        help="the files go into the folder below that by which they are included")
     choice = parser.add_mutually_exclusive_group()
     choice.add_argument("--check", action="store_true",
                         help="change nothing, print a diff and fail if stale")
@@ -108,6 +115,8 @@ def main():
         print("\n".join(inputs(package)))
         return 0
     files = render(package, "tools/metagen/metagen.py" if package.is_catalogue else "metagen.py")
+    if arguments.root:
+        files = {f"{package.include}/{name}": text for name, text in files.items()}
     if arguments.list:
         print("\n".join(sorted(files)))
         return 0

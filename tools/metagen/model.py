@@ -7,6 +7,7 @@ Everything that templates print is computed here; they only lay it out.
 import re
 import textwrap
 
+import operations
 import words
 
 WIDTH = 100
@@ -41,7 +42,7 @@ def fill(head, items, tail, indent, width=WIDTH):
 
 def spoken(name):
     """`EnumLiteral` as a reader says it: "enum literal"."""
-    words = re.findall(r"[A-Z]+(?=[A-Z][a-z])|[A-Z][a-z]*|[A-Z]+", name)
+    words = re.findall(r"[A-Z]+(?=[A-Z][a-z])|[A-Z][a-z0-9]*|[A-Z]+", capital(name))
     return " ".join(word if word.isupper() and len(word) > 1 else word.lower() for word in words)
 
 
@@ -91,6 +92,7 @@ class Property:
         # A property that may not be set from outside still has a setter, for the class itself.
         self.is_settable = facts.get("setOnce", False) or not facts["readOnly"]
         self.is_set_once = facts.get("setOnce", False)
+        self.rekeyed = []
 
     def link(self):
         """Finds what the description names; all classes exist by now."""
@@ -99,7 +101,6 @@ class Property:
         self.opposite = self.target and self.target.find(self.facts["opposite"])
         self.qualifier = self.target and self.target.find(self.facts["qualifiedBy"])
         self.is_container = bool(self.opposite and self.opposite.composite)
-        self.rekeyed = []
 
     @property
     def kind(self):
@@ -263,6 +264,33 @@ class Property:
         return fill(f"        support::{kind}<", arguments, ">" + end, 12)
 
     @property
+    def setter_head(self):
+        """The declaration of the setter in its class."""
+        virtual = "virtual " if self.overridden else ""
+        return f"{virtual}void {self.setter}({self.parameter});"
+
+    @property
+    def guards(self):
+        """What a setter refuses before anything else."""
+        if not self.is_set_once:
+            return []
+        name = f'u"{self.name}"'
+        if self.kind == "container":
+            return [self.call("support::refuseSecondTarget", "*this", f"{self.getter}Impl()",
+                              f"{self.argument}.getImpl()", name)]
+        if self.is_element:
+            return [self.call("support::refuseSecondTarget", "*this", f"{self.field}.get()",
+                              f"{self.argument}.getImpl()", name)]
+        return [self.call("support::refuseSecondValue", "*this", self.field, name)]
+
+    @property
+    def code(self):
+        """The declaration of the getter of a derived property."""
+        if "code" in self.cpp:
+            return self.cpp["code"]
+        return f"{self.owner.package.carrier(self.facts)} {self.getter}() const;"
+
+    @property
     def field_pointer(self):
         return f"&Impl::{self.field}"
 
@@ -280,13 +308,18 @@ class Property:
 
     @property
     def doc(self):
-        text = sentence(self.cpp["doc"] or f"the {spoken(self.name)}")
+        text = sentence(self.cpp["doc"] or self.spoken_name)
         if self.is_set_once:
-            text += ("\nCan be set once: \\throws tarnkiln::messages::CannotSetReadOnlyProperty  if "
-                     "it has a value.")
+            text += ("\n\\throws tarnkiln::messages::CannotSetReadOnlyProperty  if it has a value "
+                     "already.")
         if any(rekeyed.unique for rekeyed in self.rekeyed):
             text += "\n" + self.rekeyed[0].key_failure
         return comment(text, 4)
+
+    @property
+    def spoken_name(self):
+        question = re.match(r"is(?=[A-Z])", self.name)
+        return f"whether it is {spoken(self.name[2:])}" if question else f"the {spoken(self.name)}"
 
     @property
     def overridden(self):
@@ -303,7 +336,7 @@ class Rekeyed:
         self.collection = to_owner.opposite
         self.key = self.collection.qualifier
         self.unique = self.collection.facts["qualificationUnique"]
-        self.action = f"changeIn{capital(to_owner.cpp_name)}"
+        self.require_free_name = f"requireFreeIn{capital(to_owner.cpp_name)}"
 
     @property
     def key_failure(self):
@@ -332,6 +365,19 @@ class Rekeyed:
                              self.key.argument, f"{self.to_owner.getter}()", self.to_owner.constant,
                              "requireFree", store)
 
+    @staticmethod
+    def body(rekeyed):
+        """The template of a setter of the key, for one collection or for several."""
+        return "bodies/change key.jinja" if len(rekeyed) == 1 else "bodies/change keys.jinja"
+
+    def change_all(self, rekeyed):
+        """The change of the key in the collections of several owners."""
+        owners = [f"support::KeyedBy{{{each.to_owner.getter}(), {each.to_owner.constant}, "
+                  f"{each.require_free_name if each.unique else 'support::anyKey'}}}"
+                  for each in rekeyed]
+        return self.key.call("support::changeKey", "*this", f"{self.key.getter}()",
+                             self.key.argument, "store", *owners)
+
 
 class Class:
     def __init__(self, facts, cpp, package):
@@ -347,6 +393,18 @@ class Class:
                            for entry in facts["properties"]]
         self.declarations = cpp.get("declarations", [])
         self.unmodelled_fields = cpp.get("fields", [])
+        self.operations = [operations.Operation(entry, cpp["operations"][position], self)
+                           for position, entry in enumerate(facts["operations"])
+                           if "operations" in cpp]
+
+    def method(self, facts):
+        """A pointer to the function that stands for an operation."""
+        position = self.facts["operations"].index(facts)
+        name = facts.get("cppName", facts["name"])
+        pointer = f"&{self.name}::Impl::{name}"
+        if not self.operations or sum(each.name == name for each in self.operations) == 1:
+            return pointer
+        return f"{self.operations[position].pointer_type}({pointer})"
 
     def link(self):
         for prop in self.properties:
@@ -465,7 +523,15 @@ class Class:
                 headers.add("<boost/optional.hpp>")
             if prop.many:
                 headers.add("<memory>")
+        for typed in self.carried:
+            headers |= self.package.carrier_headers(typed)
         return sorted_blocks({h for h in headers | self.value_headers if h.startswith("<")})
+
+    @property
+    def carried(self):
+        """The facts of what getters and operations take or give by value."""
+        derived = [p.facts for p in self.accessors if not p.stored and "code" not in p.cpp]
+        return derived + [typed for each in self.operations for typed in each.typed]
 
     @property
     def value_headers(self):
@@ -474,6 +540,8 @@ class Class:
         for prop in self.stored:
             if not prop.is_element and "include" in prop.value:
                 headers.add(prop.value["include"])
+            if prop.facts["default"] and prop.facts["type"] == "DateTime":
+                headers.add("<boost/date_time/posix_time/posix_time.hpp>")
         return headers
 
     @property
@@ -484,11 +552,24 @@ class Class:
         for prop in self.stored:
             if prop.target:
                 headers.add(prop.target.impl_header)
+        headers |= self.headers_above
         for rekeyed in self.rekeyed:
             headers.add("tarnkiln/support/Keyed.h")
             headers.add(rekeyed.collection.collection_header)
         headers.discard(self.impl_header)
         return sorted(headers)
+
+    @property
+    def headers_above(self):
+        """What the references of superclasses need, which the record of the class holds too.
+
+        The sources of the catalogue have them by other ways.
+        """
+        headers, above = set(), None if self.package.is_catalogue else self.base
+        while above:
+            headers |= {prop.target.impl_header for prop in above.stored if prop.target}
+            above = above.base
+        return headers
 
     # C++
 
@@ -532,4 +613,10 @@ class Class:
     @property
     def accessors(self):
         """The properties that have a getter; derived ones may be written by hand."""
-        return [p for p in self.properties if p.stored or "code" in p.cpp]
+        return [p for p in self.properties
+                if p.stored or "code" in p.cpp or not self.package.is_catalogue]
+
+    @property
+    def private_setters(self):
+        """Setters for the class itself, of properties that others can only read."""
+        return [p for p in self.stored if not p.many and not p.is_settable]

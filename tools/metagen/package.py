@@ -108,9 +108,38 @@ class Package:
             return f"{value['cpp']}::{value['literals'][text]}"
         return defaults.expression(type_name, text)
 
+    def plain(self, typed):
+        """The C++ type of one value."""
+        is_element = typed["typeKind"] == "Class"
+        return self.handle(typed["type"]) if is_element else self.types[typed["type"]]["cpp"]
+
+    def carrier(self, typed):
+        """What holds the values of a result or of a derived property."""
+        if typed["upper"] > 1:
+            return f"std::vector<{self.plain(typed)}>"
+        is_optional = typed["lower"] == 0 and typed["typeKind"] != "Class"
+        return f"boost::optional<{self.plain(typed)}>" if is_optional else self.plain(typed)
+
+    def parameter(self, typed, name):
+        """The parameter of a function that takes such values."""
+        by_value = typed["typeKind"] != "Class" and self.types[typed["type"]]["byValue"]
+        carrier = self.carrier(typed)
+        by_value = by_value and carrier == self.plain(typed)
+        return f"{carrier} {name}" if by_value else f"{carrier} const& {name}"
+
+    def carrier_headers(self, typed):
+        """Headers of the C++ types around the plain ones."""
+        carrier = self.carrier(typed)
+        headers = {"std::vector": "<vector>", "boost::optional": "<boost/optional.hpp>"}
+        return {header for name, header in headers.items() if carrier.startswith(name)}
+
     @property
     def is_catalogue(self):
         return self.namespace == "tarn::kiln::meta"
+
+    @property
+    def value_types(self):
+        return sorted(self.data_types + self.enumerations, key=lambda each: each.name)
 
     @property
     def meta_package_header(self):

@@ -3,6 +3,7 @@
 `src/tarnkiln/support/PackageRows.h` explains the form. A row that refers to a type of the same
 metamodel gives its number; any other type is given by its qualified name.
 """
+import defaults
 import model
 
 FLAGS = {"ordered": "ORDERED", "unique": "UNIQUE", "composite": "COMPOSITE", "derived": "DERIVED",
@@ -22,7 +23,7 @@ VALUE_COLLECTION = "support::makePrimitiveCollection"
 
 def text(value):
     """A literal of UTF-16 text."""
-    return 'u"' + value.replace("\\", "\\\\").replace('"', '\\"') + '"'
+    return defaults.wide_text(value)
 
 
 def narrow(value):
@@ -59,6 +60,7 @@ class Rows:
     """All tables, in the order in which the walker reads them."""
 
     def __init__(self, package):
+        self.metamodel = package
         self.facts = package.facts
         self.methods = {(cls.name, entry["name"]) for cls in package.classes
                         for entry in cls.facts.get("operations", [])
@@ -68,6 +70,7 @@ class Rows:
         self.includes = sorted({
             *package.collection_headers, *self.headers_of_methods(package),
             *(each.builder_header for each in package.classes if not each.abstract),
+            *(each.serializer_header for each in package.data_types),
             *(each.meta_package_header for each in self.imports),
             "tarnkiln/support/ElementInstantiator.h", "tarnkiln/support/InvokerInstaller.h",
             "tarnkiln/support/PrimitiveInstantiator.h",
@@ -154,11 +157,18 @@ class Rows:
             ("properties", properties), ("operations", operations),
             ("collection", f"{collection}<{entry['name']}>"),
             ("builder", self.builder(entry) if is_class else None),
+            ("serializers", None if is_class else self.datatype_serializer(entry)),
             ("uuid", narrow(entry["uuid"]))])
 
     def builder(self, entry):
         """What makes builders of a class; there is none for an abstract one."""
         return None if entry["abstract"] else f"{entry['name']}::Builder::instantiate"
+
+    def datatype_serializer(self, entry):
+        """What enters the serializer of a data type; the catalogue's are entered by hand."""
+        if self.metamodel.is_catalogue:
+            return None
+        return f"support::installDatatypeSerializer<{entry['name']}DatatypeSerializer>"
 
     def add_property(self, owner, entry):
         flags = [flag for key, flag in FLAGS.items() if entry.get(key)]
@@ -178,9 +188,9 @@ class Rows:
 
     def add_operation(self, owner, entry):
         arguments = self.range("arguments", entry["arguments"])
+        operation = self.operation_name(owner, entry)
         for argument in entry["arguments"]:
-            name = property_name(owner, entry["name"]) + model.capital(argument["name"])
-            self.tables["arguments"].add(name, [
+            self.tables["arguments"].add(operation + model.capital(argument["name"]), [
                 ("name", text(argument["name"])), ("type", self.type(argument["type"])),
                 ("lower", bound(argument["lower"])), ("upper", bound(argument["upper"])),
                 ("isOrdered", "true" if argument["ordered"] else None),
@@ -189,7 +199,7 @@ class Rows:
         flags = [flag for key, flag in OPERATION_FLAGS.items() if entry[key]]
         flags += [] if entry["public"] else ["NOT_PUBLIC"]
         result = entry["result"] or {}
-        self.tables["operations"].add(property_name(owner, entry["name"]), [
+        self.tables["operations"].add(operation, [
             ("name", text(entry["name"])),
             ("type", self.type(result["type"]) if result else None),
             ("lower", bound(result["lower"]) if result else None),
@@ -204,10 +214,18 @@ class Rows:
         owners = {owner for owner, _ in self.methods}
         return [cls.impl_header for cls in package.classes if cls.name in owners]
 
+    def operation_name(self, owner, entry):
+        """Several operations of a class may share a name; those after the first are counted."""
+        name, count = property_name(owner, entry["name"]), 1
+        while (name if count == 1 else f"{name}{count}") in self.tables["operations"].names:
+            count += 1
+        return name if count == 1 else f"{name}{count}"
+
     def invoker(self, owner, entry):
-        if (owner, entry["name"]) not in self.methods:
+        if (owner, entry["name"]) not in self.methods or not entry["invoker"]:
             return None
-        return f"support::makeInvokerOf<&{owner}::Impl::{entry['name']}>"
+        method = self.metamodel.by_name[owner].method(entry)
+        return f"support::makeInvokerOf<{method}>".replace("static_cast<", "static_cast<\n" + " " * 9)
 
     def add_enumeration(self, entry):
         literals = self.range("literals", entry["literals"])

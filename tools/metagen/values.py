@@ -38,8 +38,10 @@ class Enumeration:
     def qualified(self):
         return f"{self.package.namespace}::{self.name}"
 
-    def literal(self, name):
-        return next(literal for literal in self.literals if literal.name == name)
+    @property
+    def includes(self):
+        headers = {"tarnkiln/meta/StandardTypeOf.h", self.package.export_header}
+        return sorted(headers - {None})
 
     @property
     def carried(self):
@@ -59,12 +61,16 @@ class Field(model.Property):
         return "optional" if self.facts["lower"] == 0 else "scalar"
 
     @property
-    def setter_head(self):
+    def setter_line(self):
         return f"    void {self.setter}({self.parameter}) {{ {self.field} = {self.argument}; }}"
 
 
 class DataType:
     """A class of plain values with fields."""
+
+    @property
+    def article(self):
+        return model.article(self.name)
 
     def __init__(self, facts, cpp, package):
         self.facts = facts
@@ -94,12 +100,40 @@ class DataType:
         return f"{self.package.namespace}::{self.name}"
 
     @property
+    def payload_line(self):
+        """Tells `Value` that it may hold these."""
+        head = "template <>\ninline constexpr bool tarn::kiln::support::isDataType<"
+        return f"{head}{self.qualified}> = true;"
+
+    @property
+    def serializer(self):
+        return f"{self.name}DatatypeSerializer"
+
+    @property
+    def serializer_header(self):
+        return f"{self.package.include}/{self.serializer}.h"
+
+    @property
+    def serializer_head(self):
+        return model.fill(f"class {self.package.export_word}{self.serializer} final ",
+                          [f": public meta::DefaultDatatypeSerializer<{self.name}>"], "", 4)
+
+    @property
+    def serializer_fields(self):
+        """The fields as the serializer reaches them."""
+        return ",\n".join(
+            model.fill(" " * 10 + "field<", [f"&{self.name}::{field.getter}",
+                                             f"&{self.name}::{field.setter}"],
+                       f'>(u"{field.name}")', 12).lstrip("\n") for field in self.fields)
+
+    @property
     def headers(self):
         return {field.value["include"] for field in self.fields if "include" in field.value}
 
     @property
     def includes(self):
-        return sorted({*self.package.common_headers, "tarnkiln/support/ValueTraits.h"}
+        return sorted({*self.package.common_headers, "tarnkiln/kernel/Types.h",
+                       "tarnkiln/kernel/ValueTraits.h", "tarnkiln/meta/StandardTypeOf.h"}
                       | {h for h in self.headers if not h.startswith("<")})
 
     @property
