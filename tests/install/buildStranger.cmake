@@ -19,6 +19,7 @@ if(SANITIZERS)
     set(flags -DCMAKE_CXX_FLAGS=-fsanitize=${SANITIZERS})
 endif()
 run(${CMAKE_COMMAND} -S ${STRANGER_DIR} -B ${WORK_DIR}/build -G ${GENERATOR}
-    -DCMAKE_CXX_COMPILER=${CXX_COMPILER} -DCMAKE_PREFIX_PATH=${prefix} ${flags})
+    -DCMAKE_CXX_COMPILER=${CXX_COMPILER} -DCMAKE_PREFIX_PATH=${prefix}
+    -DPython3_EXECUTABLE=${PYTHON} ${flags})
 run(${CMAKE_COMMAND} --build ${WORK_DIR}/build)
 run(${WORK_DIR}/build/stranger)
