@@ -7,15 +7,33 @@
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/MetaRegistry.h"
+#include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 
 namespace tarn::kiln {
 
 ModelElement ModelElement::createProxy(Model const& model, meta::Class const& metaClass,
                                        ProxyId const& id)
 {
-    std::unique_ptr<Builder> const builder = metaClass->instantiateBuilder(model);
-    if (!builder)
-        reportException(tarnkiln::messages::NoSuchType(internal::qualifiedName(metaClass)));
-    return builder->createProxy(id);
+    if (std::unique_ptr<Builder> const builder = metaClass->instantiateBuilder(model))
+        return builder->createProxy(id);
+    {
+        meta::MetaRegistry::LockedModel const locked(meta::MetaRegistry::getInstance());
+        bool const isRegistered = metaClass->getModelImpl() == locked.getModel().getImpl();
+        if (isRegistered || metaClass->isAbstract())
+            reportException(tarnkiln::messages::NoSuchType(internal::qualifiedName(metaClass)));
+    }
+    ModelElement const proxy(
+        new ReflectiveModelElementImpl(model, metaClass, ElementImpl::generateNewUuid()));
+    proxy->_becomeProxy(id, ElementImpl::ElementValidity::Constructing);
+    return proxy;
 }
-} // namespace tarn::kiln
+
+ModelElement ModelElement::createReflective(Model const& model, meta::Class const& metaClass,
+                                            UUID const& id)
+{
+    ModelElement const element(new ReflectiveModelElementImpl(model, metaClass, id));
+    element->notifyCreated();
+    return element;
+}
+}  // namespace tarn::kiln

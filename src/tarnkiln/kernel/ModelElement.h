@@ -26,9 +26,21 @@ public:
 
     /// A stand-in of class `metaClass`, in `model`, for the element that `id` names.
     ///
-    /// \throws tarnkiln::messages::NoSuchType  if no builder is registered for the class.
+    /// If no builder is registered for the class, the stand-in is a reflective element.
+    /// \throws tarnkiln::messages::NoSuchType  (qualified name of the class) if such a class is
+    ///     abstract or lies in the registry model: it can't be used.
     static ModelElement createProxy(Model const& model, meta::Class const& metaClass,
                                     ProxyId const& id);
+    /// A new element of a class that has no generated code; the nil UUID stands for a fresh one.
+    ///
+    /// The class may be any, an abstract one too, and keeps the properties that it has now.
+    /// \throws tarnkiln::messages::CannotCreateWithoutModel  if `model` is empty or dead.
+    /// \throws tarnkiln::messages::CannotUsePropertyWithoutType, UnsupportedQualification,
+    ///     InvalidValue  if a property of the class is incomplete: see
+    ///     `ReflectiveModelElementImpl`.
+    /// \throws tarnkiln::messages::UUIDConflict  if the model has an element with that UUID.
+    static ModelElement createReflective(Model const& model, meta::Class const& metaClass,
+                                         UUID const& id = {});
 
     /// The class of all elements.
     static meta::Class const& metaClass();

@@ -57,6 +57,9 @@ Value Value::createCollectionValue(meta::Property const& property,
                                    AbstractOwnedCollection* collection)
 {
     Value result(ValueMeta(property), nullptr);
+    // Where a property has one value, the collection as a whole is that value.
+    if (result.m_flags == ValueFlags::OptionalSingle)
+        result.m_flags = ValueFlags::Single;
     result.m_data = collection;
     return result;
 }

@@ -166,6 +166,9 @@ public:
     void registerOwnershipConverter(Type const& type,
                                     std::unique_ptr<ValueOwnershipConverter> converter);
     void unregisterOwnershipConverter(Type const& type);
+    /// Whether any type has a converter; without one the two functions below change nothing. Takes
+    /// no lock.
+    bool hasOwnershipConverters() const { return !m_converters.empty(); }
     /// The copy of `value` that an element may keep. Takes no lock.
     Value convertValueForOwnership(Value const& value);
     /// Lets go of a value that `convertValueForOwnership` gave. Takes no lock.

@@ -1,0 +1,219 @@
+// How reflective elements keep step with the other ends of their references, and how they end.
+#include "tarnkiln/collections/ReferenceCollection.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/ReflectiveModelElementImpl.h"
+#include "tarnkiln/meta/internal/DependentCollections.h"
+#include "tarnkiln/meta/internal/ReflectiveCells.h"
+
+#include <algorithm>
+
+namespace tarn::kiln {
+
+using internal::DependentCollections;
+using internal::SlotKind;
+
+namespace {
+
+/// Whether the slot refers to elements that neither are contained by this one nor contain it.
+bool isPlainReference(internal::ReflectiveSlot const& slot)
+{
+    bool const isReference =
+        slot.kind() == SlotKind::Reference || slot.kind() == SlotKind::References;
+    return isReference && !Feature(slot.property()).isComposite();
+}
+
+bool isDying(ModelElement::Impl const& source, ModelElement const& target)
+{
+    return target && !target->isProxy() && target->getModelImpl() != source.getModelImpl();
+}
+}  // namespace
+
+void ReflectiveModelElementImpl::inverseAdd(ModelElement const& element,
+                                            meta::Property const& property)
+{
+    ReflectiveSlot const* const slot = layout().find(property);
+    ModelElement const self(this);
+    switch (slot ? slot->kind() : SlotKind::Other)
+    {
+    case SlotKind::References:
+        _basicAdd(&loaded(*slot), element);
+        return;
+    case SlotKind::Container:
+        if (containerBy(*slot) == element.getImpl())
+            return;
+        notifyModifying(slot->index());
+        makeUncontained();
+        basicSetContainer(element.getImpl(), Feature(property).opposite(), slot->index());
+        return;
+    case SlotKind::Reference: {
+        ModelElement const removed(basicTarget(*slot));
+        if (removed == element)
+            return;
+        notifyModifying(slot->index());
+        Feature const opposite = Feature(property).opposite();
+        if (removed && opposite)
+            _inverseRemoveThis(removed.getImpl(), opposite);
+        basicSetTarget(*slot, element);
+        return;
+    }
+    default:
+        ModelElement::Impl::inverseAdd(element, property);
+    }
+}
+
+void ReflectiveModelElementImpl::inverseRemove(ModelElement const& element,
+                                               meta::Property const& property)
+{
+    ReflectiveSlot const* const slot = layout().find(property);
+    ModelElement const self(this);
+    switch (slot ? slot->kind() : SlotKind::Other)
+    {
+    case SlotKind::References:
+        _basicRemove(&loaded(*slot), element);
+        return;
+    case SlotKind::Container:
+        if (containerBy(*slot) != element.getImpl())
+            return;
+        notifyModifying(slot->index());
+        basicSetContainer(nullptr, Feature(), NO_INDEX);
+        return;
+    case SlotKind::Reference:
+        if (!refersTo(*slot, element))
+            return;
+        notifyModifying(slot->index());
+        basicSetTarget(*slot, ModelElement());
+        return;
+    default:
+        ModelElement::Impl::inverseRemove(element, property);
+    }
+}
+
+bool ReflectiveModelElementImpl::inverseContainsProxyTo(ModelElement const& element,
+                                                        meta::Property const& property) const
+{
+    ReflectiveSlot const* const slot = layout().find(property);
+    switch (slot ? slot->kind() : SlotKind::Other)
+    {
+    case SlotKind::References: {
+        if (_basicContainsProxyTo(&loaded(*slot), element))
+            return true;
+        std::vector<ModelElement> const present = members(*slot);
+        return std::find(present.begin(), present.end(), element) != present.end();
+    }
+    case SlotKind::Container:
+        return true;
+    case SlotKind::Reference:
+        if (!refersTo(*slot, element))
+            return false;
+        basicSetTarget(*slot, element);
+        return true;
+    default:
+        return ModelElement::Impl::inverseContainsProxyTo(element, property);
+    }
+}
+
+// ---------------------------------------------------------------------------- the end
+
+/// Collections that keep this element by a reference go first, while that still tells the key.
+void ReflectiveModelElementImpl::disassociateIncoming()
+{
+    for (ReflectiveSlot const& slot : layout().slots())
+    {
+        if (slot.kind() == SlotKind::Reference && !slot.dependents().empty())
+            DependentCollections(*this, slot).leave();
+    }
+    for (ReflectiveSlot const& slot : layout().slots())
+    {
+        Feature const opposite = Feature(slot.property()).opposite();
+        if (!isPlainReference(slot) || !opposite)
+            continue;
+        bool const isSingle = slot.kind() == SlotKind::Reference;
+        std::vector<ModelElement> const targets =
+            isSingle ? std::vector<ModelElement>(1, ModelElement(basicTarget(slot)))
+                     : members(slot);
+        if (targets.empty() || !targets.front().getImpl())
+            continue;
+        notifyModifying(slot.index());
+        for (ModelElement const& target : targets)
+        {
+            if (target)
+                _inverseRemoveThis(target.getImpl(), opposite);
+        }
+        if (isSingle)
+            basicSetTarget(slot, ModelElement());
+        else
+            _basicClear(&loaded(slot));
+    }
+}
+
+void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
+{
+    auto const destroyChild = [&](ModelElement const& child) {
+        child->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
+    };
+    for (ReflectiveSlot const& slot : layout().slots())
+    {
+        bool const isComposite = Feature(slot.property()).isComposite();
+        if (slot.kind() == SlotKind::Reference && basicTarget(slot))
+        {
+            if (isComposite)
+                destroyChild(ModelElement(basicTarget(slot)));
+            notifyModifying(slot.index());
+            basicSetTarget(slot, ModelElement());
+        }
+        std::vector<ModelElement> const children = members(slot);
+        if (children.empty())
+            continue;
+        if (isComposite)
+            std::for_each(children.begin(), children.end(), destroyChild);
+        _basicClear(static_cast<ReferenceCollection*>(m_cells->getCollection(slot)));
+    }
+}
+
+void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
+                                                            boost::optional<ProxyId>& cachedId)
+{
+    auto const leaveProxy = [&](ModelElement const& target, Feature const& opposite) {
+        if (!multiModel || !opposite || !isDying(*this, target))
+            return;
+        if (!cachedId)
+            cachedId = _getPersistentProxyId();
+        _convertToProxy(target.getImpl(), opposite, *cachedId);
+    };
+    for (ReflectiveSlot const& slot : layout().slots())
+    {
+        if (!isPlainReference(slot))
+            continue;
+        Feature const opposite = Feature(slot.property()).opposite();
+        if (slot.kind() == SlotKind::Reference)
+        {
+            leaveProxy(ModelElement(basicTarget(slot)), opposite);
+            basicSetTarget(slot, ModelElement());
+            continue;
+        }
+        std::vector<ModelElement> const present = members(slot);
+        for (ModelElement const& member : present)
+            leaveProxy(member, opposite);
+        if (!present.empty())
+            _basicClear(static_cast<ReferenceCollection*>(m_cells->getCollection(slot)));
+    }
+}
+
+void ReflectiveModelElementImpl::convertToProxy(meta::Property const&, ProxyId const&,
+                                                ModelElement const&)
+{}
+
+void ReflectiveModelElementImpl::basicDisassociateAll()
+{
+    for (ReflectiveSlot const& slot : layout().slots())
+    {
+        if (slot.kind() == SlotKind::Reference)
+            basicSetTarget(slot, ModelElement());
+        else if (slot.kind() != SlotKind::References)
+            continue;
+        else if (AbstractOwnedCollection* const present = m_cells->getCollection(slot))
+            present->basicDropContents();
+    }
+}
+}  // namespace tarn::kiln

@@ -1,0 +1,260 @@
+// How reflective elements answer what they hold.
+#include "tarnkiln/collections/AbstractPrimitiveCollection.h"
+#include "tarnkiln/collections/GenericMapInterface.h"
+#include "tarnkiln/collections/ReferenceCollection.h"
+#include "tarnkiln/collections/StringToStringMap.h"
+#include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/TypeKind.h"
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/Extension.h"
+#include "tarnkiln/meta/MetaRegistry.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/ReflectiveModelElementImpl.h"
+#include "tarnkiln/meta/StandardTypes.h"
+#include "tarnkiln/meta/internal/ReflectiveCells.h"
+
+namespace tarn::kiln {
+
+using internal::SlotKind;
+
+bool ReflectiveModelElementImpl::mayRead(meta::Property const& property,
+                                         ReflectionPrivateTag const& tag) const
+{
+    return property && getMetaClass() && getMetaClass()->isATypeOf(property) &&
+           (property->isPublicAccessor() || !(tag == PUBLIC_ACCESS));
+}
+
+bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property,
+                                                  ReflectionPrivateTag const& tag) const
+{
+    ReflectiveSlot const* const slot = mayRead(property, tag) ? layout().find(property) : nullptr;
+    if (!slot)
+        return ModelElement::Impl::hasPropertyValue(property, PUBLIC_ACCESS);
+    switch (slot->kind())
+    {
+    case SlotKind::Container:
+        return containerBy(*slot) != nullptr;
+    case SlotKind::Reference:
+        return basicTarget(*slot) && basicTarget(*slot)->isLive();
+    case SlotKind::References:
+        return shown(*slot, tag).getGenericInterface()->genericSize() > 0;
+    case SlotKind::Values: {
+        auto const* const values =
+            static_cast<AbstractPrimitiveCollection*>(m_cells->getCollection(*slot));
+        return values && values->size() > 0;
+    }
+    case SlotKind::Annotations: {
+        auto const* const map = static_cast<StringToStringMap*>(m_cells->getCollection(*slot));
+        return map && !map->empty();
+    }
+    default:
+        return property->getLower() != 0 ||
+               !slot->holds(m_cells->get(*slot), Value::createEmptyValue(property));
+    }
+}
+
+Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& property,
+                                                   ReflectionPrivateTag const& tag) const
+{
+    ReflectiveSlot const* const slot = mayRead(property, tag) ? layout().find(property) : nullptr;
+    if (!slot)
+        return ModelElement::Impl::getPropertyValue(
+            property, meta::Extension::cast(property) ? tag : PUBLIC_ACCESS);
+    switch (slot->kind())
+    {
+    case SlotKind::Container:
+        return Value::createElementValue(property, ModelElement(containerBy(*slot)));
+    case SlotKind::Reference:
+        return Value::createElementValue(property, ModelElement(target(*slot, tag)));
+    case SlotKind::References: {
+        Value value = Value::createCollectionValue(property, &shown(*slot, tag));
+        value.setReflective();
+        return value;
+    }
+    case SlotKind::Values:
+    case SlotKind::Annotations:
+        return Value::createCollectionValue(property, made(*slot));
+    default:
+        return slot->read(m_cells->get(*slot));
+    }
+}
+
+// ---------------------------------------------------------------------------- references
+
+/// The container, if it holds this element in the very property that is the opposite.
+ModelElement::Impl* ReflectiveModelElementImpl::containerBy(ReflectiveSlot const& slot) const
+{
+    Feature const opposite = Feature(slot.property()).opposite();
+    return opposite && getContainment() == opposite ? basicContainer() : nullptr;
+}
+
+ModelElement::Impl* ReflectiveModelElementImpl::basicTarget(ReflectiveSlot const& slot) const
+{
+    return m_cells->get(slot).pointer<ModelElement::Impl>();
+}
+
+/// Changes nothing but the handle; putting a target in the place of its proxy is no change.
+void ReflectiveModelElementImpl::basicSetTarget(ReflectiveSlot const& slot,
+                                                ModelElement const& target) const
+{
+    internal::ReflectiveCell const old = m_cells->get(slot);
+    internal::ReflectiveCell cell;
+    cell.point(target.getImpl());
+    if (target.getImpl())
+        target.getImpl()->addRef();
+    m_cells->set(slot, cell);
+    slot.release(old);
+}
+
+ModelElement::Impl* ReflectiveModelElementImpl::target(ReflectiveSlot const& slot,
+                                                       ReflectionPrivateTag const& tag) const
+{
+    ModelElement::Impl* const present = basicTarget(slot);
+    if (!present || !present->isProxy() || !getModelImpl() || tag == NO_PROXY_RESOLVE)
+        return present;
+    ModelElement const proxy(present);
+    ModelElement const found = tag == IN_MEMORY_ONLY ? getModelImpl()->peekResolveProxy(this, proxy)
+                                                     : getModelImpl()->resolveProxy(this, proxy);
+    if (!found || found->isProxy())
+        return basicTarget(slot);
+    meta::Class const& metaClass = found->getMetaClass();
+    if (!metaClass || !metaClass->isA(slot.property()->getType()))
+        return basicTarget(slot);
+    Feature const feature = slot.property();
+    Feature const opposite = feature.opposite();
+    if (opposite && !feature.isComposite() && !_inverseContainsThis(found.getImpl(), opposite))
+        return basicTarget(slot);
+    if (basicTarget(slot) == present)  // loading may have changed it
+        basicSetTarget(slot, found);
+    return basicTarget(slot);
+}
+
+bool ReflectiveModelElementImpl::refersTo(ReflectiveSlot const& slot,
+                                          ModelElement const& element) const
+{
+    ModelElement::Impl* const present = basicTarget(slot);
+    if (!present || present == element.getImpl())
+        return present != nullptr;
+    return present->isProxy() && getModelImpl() &&
+           getModelImpl()->peekResolveProxy(this, ModelElement(present)) == element;
+}
+
+ModelElement::Impl* ReflectiveModelElementImpl::basicGetReference(Slot const& slot) const
+{
+    ReflectiveSlot const* const own = layout().findByIndex(slot.index);
+    if (own && own->kind() == SlotKind::Reference)
+        return basicTarget(*own);
+    return own && own->kind() == SlotKind::Container ? containerBy(*own) : nullptr;
+}
+
+std::vector<ModelElement> ReflectiveModelElementImpl::referred(ReflectiveSlot const& slot) const
+{
+    switch (slot.kind())
+    {
+    case SlotKind::Container:
+        return {ModelElement(containerBy(slot))};
+    case SlotKind::Reference:
+        return {ModelElement(target(slot, PRIVILEGED_ACCESS))};
+    case SlotKind::References:
+        return shown(slot, PRIVILEGED_ACCESS).getAllValues();
+    default:
+        return {};
+    }
+}
+
+void ReflectiveModelElementImpl::visitReferences(ReferenceVisitor const& visit) const
+{
+    for (ReflectiveSlot const& slot : layout().slots())
+    {
+        if (slot.kind() == SlotKind::Reference && basicTarget(slot))
+            visit(ModelElement(basicTarget(slot)), slot.property());
+        for (ModelElement const& member : members(slot))
+            visit(member, slot.property());
+    }
+}
+
+// ---------------------------------------------------------------------------- collections
+
+AbstractOwnedCollection* ReflectiveModelElementImpl::made(ReflectiveSlot const& slot) const
+{
+    if (AbstractOwnedCollection* const present = m_cells->getCollection(slot))
+        return present;
+    auto* const self = const_cast<ReflectiveModelElementImpl*>(this);
+    return m_cells->publish(slot, slot.makeCollection(self));
+}
+
+ReferenceCollection& ReflectiveModelElementImpl::loaded(ReflectiveSlot const& slot) const
+{
+    auto* const collection = static_cast<ReferenceCollection*>(made(slot));
+    if (m_cells->get(slot).state != internal::CellState::Loaded && m_cells->markLoaded(slot))
+        _loadCollectionContents(collection);
+    return *collection;
+}
+
+/// Stand-ins that a set or a map keeps aside give way to their targets, if these are there by now.
+ReferenceCollection& ReflectiveModelElementImpl::shown(ReflectiveSlot const& slot,
+                                                       ReflectionPrivateTag const& tag) const
+{
+    if (tag == IN_MEMORY_ONLY)
+        return *static_cast<ReferenceCollection*>(made(slot));
+    ReferenceCollection& collection = loaded(slot);
+    bool const keepsProxiesAside = !collection.getGenericInterface()->isSequenceInterface();
+    if (keepsProxiesAside && !(tag == NO_PROXY_RESOLVE) && getModelImpl() &&
+        !getModelImpl()->isParsing())
+        collection.resolveAll();
+    return collection;
+}
+
+std::vector<ModelElement> ReflectiveModelElementImpl::members(ReflectiveSlot const& slot) const
+{
+    if (slot.kind() != SlotKind::References)
+        return {};
+    auto const* const present = static_cast<ReferenceCollection*>(m_cells->getCollection(slot));
+    return present ? present->getAllValuesAndProxies() : std::vector<ModelElement>();
+}
+
+AbstractOwnedCollection*
+ReflectiveModelElementImpl::instantiateCollection(meta::Property const& property, bool owned) const
+{
+    auto* const owner = owned ? const_cast<ReflectiveModelElementImpl*>(this) : nullptr;
+    ReflectiveSlot const* const slot = layout().find(property);
+    if (slot && slot->kind() == SlotKind::References)
+        return slot->makeCollection(owner).release();
+    return internal::ReferenceCollectionRecipe(property).make(owner).release();
+}
+
+AbstractOwnedCollection*
+ReflectiveModelElementImpl::instantiatePrimitiveCollection(meta::Property const& property,
+                                                           bool owned) const
+{
+    auto* const owner = owned ? const_cast<ReflectiveModelElementImpl*>(this) : nullptr;
+    return meta::MetaRegistry::getInstance().instantiateDynamicCollection(ModelElement(owner),
+                                                                          property);
+}
+
+// ---------------------------------------------------------------------------- keys
+
+Value ReflectiveModelElementImpl::unwrapKey(Value const& value)
+{
+    if (value.getFlags() > ValueFlags::Single || !internal::classImpl(value.getType()))
+        return value;
+    ModelElement const element = value.getValue<ModelElement>();
+    return Value(meta::StandardTypes::uuidMeta, element ? element->getUuid() : UUID());
+}
+
+void ReflectiveModelElementImpl::checkUniqueness(ModelElement const& owner,
+                                                 meta::Property const& collectionProperty,
+                                                 Value const& key)
+{
+    if (!collectionProperty->isQualificationUnique() || !owner)
+        return;
+    Value const value = owner->getPropertyValue(collectionProperty, PRIVILEGED_ACCESS);
+    GenericCollectionInterface* const collection =
+        value.getValue<ReferenceCollection&>().getGenericInterface();
+    if (collection->isMapInterface() &&
+        static_cast<GenericMapInterface*>(collection)->genericFind(key))
+        reportException(tarnkiln::messages::UniquenessConstraint());
+}
+}  // namespace tarn::kiln

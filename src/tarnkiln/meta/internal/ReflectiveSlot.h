@@ -1,0 +1,87 @@
+/// \file
+/// One stored property of the elements of a class that is known at run time.
+#pragma once
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/meta/Property.h"
+#include "tarnkiln/meta/Type.h"
+#include "tarnkiln/meta/internal/ReferenceCollectionRecipe.h"
+#include "tarnkiln/meta/internal/ReflectiveCell.h"
+#include "tarnkiln/meta/internal/SlotKind.h"
+
+#include <boost/optional.hpp>
+
+#include <cstdint>
+#include <memory>
+#include <vector>
+
+namespace tarn::kiln::internal {
+
+/// What was decided about a property when the layout of its class was made, and how its cells are
+/// read, kept and freed.
+///
+/// Access rights, shape and opposite are asked of the property itself, each time.
+///
+/// Threads: immutable once its layout is made.
+class ReflectiveSlot
+{
+public:
+    /// \throws tarnkiln::messages::CannotUsePropertyWithoutType  (name) if the type is not live.
+    /// \throws tarnkiln::messages::UnsupportedQualification  as `ReferenceCollectionRecipe`, and as
+    ///     the registry for collections of data types.
+    /// \throws tarnkiln::messages::InvalidValue  if a single value has none to start with.
+    explicit ReflectiveSlot(meta::Property const& property);
+
+    meta::Property const& property() const { return m_property; }
+    SlotKind kind() const { return m_kind; }
+    /// The slot in change records: the property's index; `NO_INDEX` for -1.
+    unsigned long index() const { return m_index; }
+    /// The slots whose elements keep this element by the key that is this slot's value.
+    std::vector<std::uint16_t> const& dependents() const { return m_dependents; }
+    void addDependent(std::uint16_t slot) { m_dependents.push_back(slot); }
+    /// The property that qualifies the opposite; empty if there is none.
+    meta::Property const& oppositeQualifier() const { return m_oppositeQualifier; }
+
+    /// What a new element starts with, kept as an element keeps it.
+    ReflectiveCell keepInitial() const;
+
+    /// \name Cells of plain values
+    /// @{
+    /// The same value as was kept.
+    Value read(ReflectiveCell cell) const;
+    /// A copy of `value` as cells hold it.
+    ReflectiveCell keep(Value const& value) const;
+    /// The same value as `value`, with the shape `Single` if it has the shape `OptionalSingle` and
+    /// holds something.
+    Value asRequired(Value const& value) const;
+    /// Whether `read` would give a value equal to `value`.
+    bool holds(ReflectiveCell cell, Value const& value) const;
+    /// @}
+
+    /// \name All cells
+    /// @{
+    /// Frees what the cell holds, after the ownership converter of a plain value was told.
+    void release(ReflectiveCell cell) const noexcept;
+    /// A copy for a record: plain values pass the ownership converter, references are counted,
+    /// collections give a snapshot.
+    ReflectiveCell copy(ReflectiveCell cell) const;
+    /// A new collection for the slot; may be null for plain values of types that have none.
+    std::unique_ptr<AbstractOwnedCollection> makeCollection(ModelElement::Impl* owner) const;
+    /// @}
+
+private:
+    bool isEmpty(Value const& value) const;
+    bool isPackable(Value const& value) const;
+    bool isInitialShared() const;
+    ReflectiveCell copyPlain(ReflectiveCell cell) const;
+
+    meta::Property m_property;
+    meta::Type m_type;  ///< Of the property when the layout was made.
+    meta::Property m_oppositeQualifier;
+    SlotKind m_kind;
+    unsigned long m_index;
+    boost::optional<ReferenceCollectionRecipe> m_recipe;  ///< Of `References`.
+    boost::optional<Value> m_empty;  ///< What `CellState::Empty` stands for; optional values only.
+    boost::optional<Value> m_initial;  ///< None, if it is to be found anew for each element.
+    std::vector<std::uint16_t> m_dependents;
+};
+}  // namespace tarn::kiln::internal
