@@ -1,14 +1,41 @@
 // What holds for the collections of all kinds.
+#include "tarnkiln/collections/ReflectiveElementMap.h"
+#include "tarnkiln/collections/ReflectiveElementMultimap.h"
+#include "tarnkiln/collections/ReflectiveElementSequence.h"
+#include "tarnkiln/collections/ReflectiveUnorderedElementSet.h"
 #include "tests/collections/CollectionFixture.h"
+#include "tests/support/NodeMetamodel.h"
+#include "tests/support/RuntimeMetamodel.h"
 
 #include <numeric>
 
 namespace testkit {
 namespace {
 
-/// A kind of collection: where a node has it, what goes in, and what is in there.
+/// What has the collections of hand-written classes.
+struct OfNode
+{
+    using Owner = Node;
+    static constexpr bool IS_GIVEN_BY_SLOT = true;
+
+    static Owner owner(Model const& model) { return Node::create(model); }
+};
+
+/// What has those of reflective elements. The class is that of nodes.
+struct OfReflective
+{
+    using Owner = ModelElement;
+    static constexpr bool IS_GIVEN_BY_SLOT = false;
+
+    static Owner owner(Model const& model)
+    {
+        return ModelElement::createReflective(model, NodeMetamodel::get().node);
+    }
+};
+
+/// A kind of collection: where its owner has it, what goes in, and what is in there.
 /// `entry(model, i)` makes something to add; entries of different numbers differ.
-template <class C> struct Values
+template <class C> struct Values : OfNode
 {
     using Collection = C;
     using Entry = typename C::value_type;
@@ -62,18 +89,11 @@ struct Words : Texts<PrimitiveSet<ustring>>
     static void remove(Collection& collection, Entry const& entry) { collection.erase(entry); }
 };
 
-template <class C> struct References
+template <class C> struct ReferenceContents
 {
     using Collection = C;
-    using Entry = Node;
     using Contents = std::vector<ModelElement>;
 
-    static Entry entry(Model const& model, int number)
-    {
-        Node const made = Node::create(model);
-        made->setName(ustring(1, static_cast<char16_t>(u'a' + number)));
-        return made;
-    }
     /// Sorted for a set, whose order says nothing.
     static Contents contents(C const& collection)
     {
@@ -83,6 +103,18 @@ template <class C> struct References
                 return left.getImpl() < right.getImpl();
             });
         return result;
+    }
+};
+
+template <class C> struct References : OfNode, ReferenceContents<C>
+{
+    using Entry = Node;
+
+    static Entry entry(Model const& model, int number)
+    {
+        Node const made = Node::create(model);
+        made->setName(ustring(1, static_cast<char16_t>(u'a' + number)));
+        return made;
     }
 };
 
@@ -145,6 +177,90 @@ struct Grouped : Inserting<ElementMultimap<ustring, Node>>
     }
 };
 
+// ---------------------------------------------------------------------------- reflective elements
+
+template <class Base, Slot const& SLOT> struct ReflectiveValues : Base
+{
+    using typename Base::Collection;
+    using Owner = OfReflective::Owner;
+    static constexpr bool IS_GIVEN_BY_SLOT = false;
+
+    static Owner owner(Model const& model) { return OfReflective::owner(model); }
+    static Collection& of(ModelElement const& element)
+    {
+        return dynamic_cast<Collection&>(valuesOf(element, SLOT.property()));
+    }
+};
+
+using ReflectiveNumbers = ReflectiveValues<Numbers, Node::Impl::NUMBERS>;
+using ReflectiveLabels = ReflectiveValues<Labels, Node::Impl::LABELS>;
+using ReflectiveWords = ReflectiveValues<Words, Node::Impl::WORDS>;
+
+template <class C, Slot const& SLOT>
+struct ReflectiveReferences : OfReflective, ReferenceContents<C>
+{
+    using Collection = C;
+    using Entry = ModelElement;
+
+    static Entry entry(Model const& model, int number)
+    {
+        ModelElement const made = owner(model);
+        set(made, Node::Impl::NAME.property(), ustring(1, static_cast<char16_t>(u'a' + number)));
+        return made;
+    }
+    static Collection& of(ModelElement const& element)
+    {
+        return dynamic_cast<Collection&>(referencesOf(element, SLOT.property()));
+    }
+    static void add(C& collection, Entry const& entry)
+    {
+        collection.getGenericInterface()->genericAdd(entry);
+    }
+    static void remove(C& collection, Entry const& entry)
+    {
+        collection.getGenericInterface()->genericRemove(entry);
+    }
+    template <class... Arguments>
+    static std::unique_ptr<C> snapshotOf(Arguments const&... arguments)
+    {
+        return std::make_unique<C>(nullptr, NodeMetamodel::get().node, arguments...,
+                                   SLOT.property().getImpl(),
+                                   SLOT.opposite ? SLOT.opposite->property().getImpl() : nullptr);
+    }
+};
+
+template <Slot const& SLOT, bool UNIQUE>
+struct ReflectiveSequence : ReflectiveReferences<ReflectiveElementSequence, SLOT>
+{
+    static auto snapshot() { return ReflectiveSequence::snapshotOf(UNIQUE); }
+};
+
+using ReflectiveOwned = ReflectiveSequence<Node::Impl::OWNED, true>;
+using ReflectiveLinks = ReflectiveSequence<Node::Impl::LINKS, true>;
+using ReflectiveChildren = ReflectiveSequence<Node::Impl::CHILDREN, true>;
+using ReflectiveParts = ReflectiveSequence<Node::Impl::PARTS, false>;
+
+struct ReflectiveMarks : ReflectiveReferences<ReflectiveUnorderedElementSet, Node::Impl::MARKS>
+{
+    static auto snapshot() { return snapshotOf(); }
+};
+
+ustring reflectiveKeyOf(ModelElement::Impl* member)
+{
+    return get<ustring>(ModelElement(member), Node::Impl::NAME.property());
+}
+
+struct ReflectiveByName : ReflectiveReferences<ReflectiveElementMap<ustring>, Node::Impl::BY_NAME>
+{
+    static auto snapshot() { return snapshotOf(reflectiveKeyOf); }
+};
+
+struct ReflectiveGrouped
+    : ReflectiveReferences<ReflectiveElementMultimap<ustring>, Node::Impl::GROUPED>
+{
+    static auto snapshot() { return snapshotOf(reflectiveKeyOf); }
+};
+
 template <class Kind> class OwnedCollection : public CollectionFixture
 {
 protected:
@@ -153,7 +269,7 @@ protected:
     void add(typename Kind::Entry const& added) { Kind::add(collection, added); }
     void remove(typename Kind::Entry const& removed) { Kind::remove(collection, removed); }
 
-    Node const owner = node(u"owner");
+    typename Kind::Owner const owner = Kind::owner(model);
     typename Kind::Collection& collection = Kind::of(owner);
     typename Kind::Entry const first = entry(0);
     typename Kind::Entry const second = entry(1);
@@ -166,14 +282,20 @@ class KindNames
 public:
     template <class Kind> static std::string GetName(int index)
     {
-        static char const* const NAMES[] = {"Numbers",  "Labels", "Words", "Owned",  "Links",
-                                            "Children", "Parts",  "Marks", "ByName", "Grouped"};
-        return NAMES[index];
+        static char const* const NAMES[] = {"Numbers", "Labels",   "Words",      "Owned",
+                                            "Links",   "Children", "Parts",      "Marks",
+                                            "ByName",  "Grouped",  "Attributes", "Operations"};
+        constexpr int UNLIKE_NODES = 10;
+        return index < UNLIKE_NODES ? NAMES[index]
+                                    : std::string("Reflective") + NAMES[index - UNLIKE_NODES];
     }
 };
 
 using Kinds =
-    ::testing::Types<Numbers, Labels, Words, Owned, Links, Children, Parts, Marks, ByName, Grouped>;
+    ::testing::Types<Numbers, Labels, Words, Owned, Links, Children, Parts, Marks, ByName, Grouped,
+                     ReflectiveNumbers, ReflectiveLabels, ReflectiveWords, ReflectiveOwned,
+                     ReflectiveLinks, ReflectiveChildren, ReflectiveParts, ReflectiveMarks,
+                     ReflectiveByName, ReflectiveGrouped>;
 TYPED_TEST_SUITE(OwnedCollection, Kinds, KindNames);
 
 TYPED_TEST(OwnedCollection, CommitsAChangeOutsideATransactionByItself)
@@ -284,7 +406,7 @@ TYPED_TEST(OwnedCollection, IsAsItWasAfterARollback)
 
 TYPED_TEST(OwnedCollection, IsEmptyAfterARollbackIfItWasMadeInTheTransaction)
 {
-    Node const fresh = this->node(u"fresh");
+    auto const fresh = TypeParam::owner(this->model);
     Transaction const transaction = this->model->beginTransaction(/*revertible=*/true);
 
     TypeParam::add(TypeParam::of(fresh), this->first);
@@ -395,7 +517,8 @@ TYPED_TEST(OwnedCollection, TellsAboutItsPlace)
 {
     EXPECT_EQ(this->collection.getOwner(), this->owner.getImpl());
     EXPECT_TRUE(this->collection.getCollectionFeature());
-    EXPECT_TRUE(this->collection.getCollectionFeature().slot());
+    EXPECT_EQ(this->collection.getCollectionFeature().slot() != nullptr,
+              TypeParam::IS_GIVEN_BY_SLOT);
 }
 }  // namespace
 }  // namespace testkit
