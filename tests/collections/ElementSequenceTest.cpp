@@ -264,6 +264,40 @@ TEST_F(PlainSequence, BasicOperationsTestNothing)
     EXPECT_TRUE(unique.empty());
 }
 
+TEST_F(PlainSequence, WithoutUpkeepLosesAnEntryWhereverItLies)
+{
+    for (std::size_t size = 1; size <= 5; ++size)
+    {
+        for (std::size_t place = 0; place < size; ++place)
+        {
+            unique.basicClear();
+            std::vector<Node> members;
+            for (std::size_t i = 0; i < size; ++i)
+            {
+                members.push_back(node(u"x"));
+                unique.basicAdd(members.back());
+            }
+
+            unique.basicRemove(members[place]);
+            unique.basicRemove(members[place]);
+
+            std::vector<ModelElement> expected(members.begin(), members.end());
+            expected.erase(expected.begin() + static_cast<std::ptrdiff_t>(place));
+            EXPECT_EQ(expected, unique.getAllValues());
+        }
+    }
+}
+
+TEST_F(PlainSequence, WithoutUpkeepLosesTheFirstOfSeveralEqualEntries)
+{
+    for (Node const& each : {a, b, a, c})
+        sequence.basicAdd(each);
+
+    sequence.basicRemove(a);
+
+    EXPECT_EQ(namesIn(sequence), (Names{u"b", u"a", u"c"}));
+}
+
 // ---------------------------------------------------------------------------- element class
 
 TEST_F(PlainSequence, RefusesElementsOfAWrongClass)

@@ -156,6 +156,50 @@ TEST_F(ChangeRecord, ClearTheContainerThatIsWhatItWas)
     EXPECT_FALSE(alsoModified.isContainerChanged());
 }
 
+TEST_F(ChangeRecord, TakeTheContainerAgainAfterItWasWhatItWas)
+{
+    Node const container = Node::create(model);
+    container->getChildren().push_back(node);
+    Storage storage(UUID{}, model, Node::metaClass(), Node::Impl::SLOTS);
+    storage.setOldContainer(container, propertyAt(Node::Impl::CHILDREN));
+    ASSERT_FALSE(storage.revertUnchanged(node.getImpl()));
+
+    storage.setOldContainer(ModelElement(), meta::Property());
+
+    EXPECT_TRUE(storage.isContainerChanged());
+    EXPECT_EQ(ModelElement(), storage.getOldContainer());
+    EXPECT_FALSE(storage.getOldContainmentProperty());
+}
+
+TEST_F(ChangeRecord, HaveNoRoomForPropertiesThatDidNotChange)
+{
+    EXPECT_EQ(sizeof(Storage), sizeof(Node::Impl::Storage));
+    EXPECT_EQ(sizeof(Storage), sizeof(SpecialNode::Impl::Storage));
+}
+
+TEST_F(ChangeRecord, KeepTheirElementInMemoryOnlyWhenTold)
+{
+    auto record = std::make_unique<Changes>(UUID{}, model, Node::metaClass(), 5);
+    std::uint32_t const handles = node.getImpl()->getRefCount();
+    record->setElement(node.getImpl());
+    EXPECT_EQ(nullptr, record->getKeptElement());
+    EXPECT_EQ(handles, node.getImpl()->getRefCount());
+
+    record->keepElement(node.getImpl());
+    record->keepElement(node.getImpl());
+    EXPECT_EQ(node.getImpl(), record->getKeptElement());
+    EXPECT_EQ(handles + 1, node.getImpl()->getRefCount());
+
+    record->releaseElement();
+    record->releaseElement();
+    EXPECT_EQ(nullptr, record->getKeptElement());
+    EXPECT_EQ(handles, node.getImpl()->getRefCount());
+
+    record->keepElement(node.getImpl());
+    record.reset();
+    EXPECT_EQ(handles, node.getImpl()->getRefCount());
+}
+
 TEST_F(ChangeRecord, HaveNoOldValueOfAPropertyThatIsNoneOfTheirs)
 {
     Storage const base(UUID{}, model, Node::metaClass(), Node::Impl::SLOTS);

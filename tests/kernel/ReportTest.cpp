@@ -315,6 +315,44 @@ TEST_F(Reports, OutliveTheirTransactionWithTheOldValues)
     EXPECT_EQ(0, report->getOldValue(node, propertyAt(Node::Impl::COUNT)).getValue<int>());
 }
 
+TEST_F(Reports, KnowElementsThatLaterTransactionsHaveChanged)
+{
+    Node const other = Node::create(model);
+    Report const first = reportOf([&] {
+        node->setCount(1);
+        other->setCount(10);
+    });
+    Report const second = reportOf([&] {
+        other->setCount(20);
+        node->setTag("x");
+    });
+
+    meta::Property const& count = propertyAt(Node::Impl::COUNT);
+    EXPECT_TRUE(first->isChanged(node, count));
+    EXPECT_TRUE(first->isChanged(other, count));
+    EXPECT_EQ(0, first->getOldValue(other, count).getValue<int>());
+    EXPECT_EQ(10, second->getOldValue(other, count).getValue<int>());
+    EXPECT_FALSE(second->isChanged(node, count));
+}
+
+TEST_F(Reports, TellElementsOfOneUuidApartInLaterTransactionsToo)
+{
+    UUID const id = node->getUuid();
+    node->setCount(5);
+    Node successor;
+    Report const first = reportOf([&] {
+        node->destroy();
+        successor = Node::create(model, id);
+    });
+    Report const second = reportOf([&] { successor->setCount(6); });
+
+    meta::Property const& count = propertyAt(Node::Impl::COUNT);
+    EXPECT_EQ(0, second->getOldValue(successor, count).getValue<int>());
+    EXPECT_THAT(first->getChangedProperties(successor), IsEmpty());
+    EXPECT_THAT(first->getCreated(), ElementsAre(successor));
+    EXPECT_THAT(first->getDestroyed(), ElementsAre(node));
+}
+
 TEST_F(Reports, OfARollbackHoldTheValuesThatWereTakenBack)
 {
     Node const target = Node::create(model);

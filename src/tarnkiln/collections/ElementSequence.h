@@ -114,6 +114,7 @@ protected:
 private:
     void resolveAt(std::size_t index) const;
     std::size_t find(ModelElement const& element, std::size_t likelyIndex = 0) const;
+    std::size_t findForRemoval(ModelElement const& element) const;
     void countIn(ModelElement const& element) const;
     void countOut(ModelElement const& element) const;
 
@@ -419,7 +420,7 @@ template <class T> void ElementSequence<T>::basicAdd(ModelElement const& element
 
 template <class T> void ElementSequence<T>::basicRemove(ModelElement const& element)
 {
-    std::size_t const index = find(element);
+    std::size_t const index = findForRemoval(element);
     if (index == m_entries.size())
         return;
     AbstractOwnedCollection::Operation operation(*this);
@@ -472,6 +473,23 @@ std::size_t ElementSequence<T>::find(ModelElement const& element, std::size_t li
     auto const place = std::find_if(m_entries.begin(), m_entries.end(),
                                     [&](T const& entry) { return entry == element; });
     return static_cast<std::size_t>(place - m_entries.begin());
+}
+
+/// The same for an element that leaves: where it can be in here only once, it is looked for from
+/// both ends, since what leaves often came last.
+template <class T>
+std::size_t ElementSequence<T>::findForRemoval(ModelElement const& element) const
+{
+    if (!m_unique || m_filter)
+        return find(element);
+    for (std::size_t front = 0, back = m_entries.size(); front < back; ++front)
+    {
+        if (m_entries[--back] == element)
+            return back;
+        if (m_entries[front] == element)
+            return front;
+    }
+    return m_entries.size();
 }
 
 template <class T> void ElementSequence<T>::countIn(ModelElement const& element) const

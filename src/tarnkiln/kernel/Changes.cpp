@@ -16,12 +16,38 @@ ModelElement::Impl::Changes::Changes(UUID const& id, Model const& model,
     : m_id(id)
     , m_model(model.getImpl())
     , m_metaClass(metaClass)
-    , m_count(count)
     , m_modified(count + 2)
 {
 }
 
-ModelElement::Impl::Changes::~Changes() = default;
+ModelElement::Impl::Changes::Changes(ModelElement::Impl const& element, unsigned long count)
+    : m_id(element.getUuid())
+    , m_model(element.getModelImpl())
+    , m_metaClass(element.getMetaClass())
+    , m_modified(count + 2)
+{
+}
+
+ModelElement::Impl::Changes::~Changes()
+{
+    releaseElement();
+}
+
+void ModelElement::Impl::Changes::keepElement(ModelElement::Impl* element) noexcept
+{
+    element->addRef();
+    releaseElement();
+    m_element = element;
+    m_keepsElement = 1;
+}
+
+void ModelElement::Impl::Changes::releaseElement() noexcept
+{
+    if (!m_keepsElement)
+        return;
+    m_keepsElement = 0;
+    m_element->removeRef();
+}
 
 Model ModelElement::Impl::Changes::getModel() const
 {
@@ -35,7 +61,7 @@ bool ModelElement::Impl::Changes::revertUnchanged(ModelElement::Impl*)
 
 bool ModelElement::Impl::Changes::setModified(unsigned long index)
 {
-    if (index == 0 || index >= m_count)
+    if (index == 0 || index >= slots())
         return true;
     bool const before = m_modified.test(index);
     m_modified.set(index);
@@ -51,7 +77,7 @@ bool ModelElement::Impl::Changes::isChanged(meta::Property const& property) cons
 std::vector<meta::Property> ModelElement::Impl::Changes::getChangedProperties() const
 {
     std::vector<meta::Property> result;
-    result.reserve(m_count);
+    result.reserve(slots());
     for (meta::Class type = m_metaClass; type; type = type->getSuperclass()) {
         for (auto const& [name, property] : type->getOwnedAttributes()) {
             if (property && isSlotChanged(static_cast<unsigned long>(property->getPropertyIndex())))
@@ -66,9 +92,7 @@ void ModelElement::Impl::Storage::setOldContainer(ModelElement const& container,
 {
     if (isContainerChanged())
         return;
-    m_oldContainer = container;
-    m_oldContainment = feature;
-    m_oldContainmentProperty = feature.property();
+    m_oldValues.keep(LINK, OldLink{container, feature.property(), feature});
     setContainerChanged(true);
 }
 
@@ -80,10 +104,28 @@ void ModelElement::Impl::Storage::setOldContainer(ModelElement const& container,
 
 bool ModelElement::Impl::Storage::revertUnchanged(ModelElement::Impl* element)
 {
-    if (isContainerChanged() && element->basicContainer() == m_oldContainer.getImpl()
-        && element->getContainment() == m_oldContainment)
+    if (isContainerChanged() && element->basicContainer() == getOldContainer().getImpl()
+        && element->getContainment() == getOldContainment())
         setContainerChanged(false);
     return anyChanged();
+}
+
+ModelElement ModelElement::Impl::Storage::getOldContainer() const
+{
+    OldLink const* const link = m_oldValues.find<OldLink>(LINK);
+    return link ? link->container : ModelElement();
+}
+
+meta::Property ModelElement::Impl::Storage::getOldContainmentProperty() const
+{
+    OldLink const* const link = m_oldValues.find<OldLink>(LINK);
+    return link ? link->property : meta::Property();
+}
+
+Feature ModelElement::Impl::Storage::getOldContainment() const
+{
+    OldLink const* const link = m_oldValues.find<OldLink>(LINK);
+    return link ? link->feature : Feature();
 }
 
 Value ModelElement::Impl::Storage::getOldValue(meta::Property const& property,

@@ -2,6 +2,7 @@
 /// What a transaction remembers about one element.
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/support/OldValues.h"
 #include "tarnkiln/support/SlotSet.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/Property.h"
@@ -31,6 +32,8 @@ class TARNKILN_EXPORT ModelElement::Impl::Changes
 public:
     /// \param count  the highest index of a stored property, plus one.
     Changes(UUID const& id, Model const& model, meta::Class const& metaClass, unsigned long count);
+    /// Of `element`, with its UUID, model and metaclass.
+    Changes(ModelElement::Impl const& element, unsigned long count);
     Changes(Changes const&) = delete;
     Changes& operator=(Changes const&) = delete;
     virtual ~Changes();
@@ -43,40 +46,56 @@ public:
     Model getModel() const;
     meta::Class const& getMetaClass() const { return m_metaClass; }
 
+    /// \name The element
+    /// The record knows it by its address only, unless it is told to keep it in memory.
+    /// @{
+    bool isOf(ModelElement::Impl const* element) const
+    {
+        return m_element == element && m_id == element->getUuid();
+    }
+    void setElement(ModelElement::Impl* element) { m_element = element; }
+    /// Shares `element`, which from now on is the one that the record is of.
+    void keepElement(ModelElement::Impl* element) noexcept;
+    void releaseElement() noexcept;
+    /// Null unless it is kept.
+    ModelElement::Impl* getKeptElement() const { return m_keepsElement ? m_element : nullptr; }
+    /// @}
+
     /// False if the property is not live, has no slot, or is none of the element's class.
     bool isChanged(meta::Property const& property) const;
     /// The changed properties, class by class upward, in the order of their owned attributes.
     std::vector<meta::Property> getChangedProperties() const;
 
     bool isCreated() const { return m_modified.test(0); }
-    bool isDestroyed() const { return m_modified.test(m_count + 1); }
-    bool isContainerChanged() const { return m_modified.test(m_count); }
+    bool isDestroyed() const { return m_modified.test(slots() + 1); }
+    bool isContainerChanged() const { return m_modified.test(slots()); }
     /// Whether the slot `index` changed; false for index 0 and for one that does not exist.
     bool isSlotChanged(unsigned long index) const
     {
-        return index != 0 && index < m_count && m_modified.test(index);
+        return index != 0 && index < slots() && m_modified.test(index);
     }
     void setCreated() { m_modified.set(0); }
-    void setDestroyed() { m_modified.set(m_count + 1); }
+    void setDestroyed() { m_modified.set(slots() + 1); }
     /// Marks the slot; true if it was marked before. An index that does not exist counts as marked.
     bool setModified(unsigned long index);
 
 protected:
     friend class ChangesHolder;
 
-    void setContainerChanged(bool changed) { m_modified.set(m_count, changed); }
+    void setContainerChanged(bool changed) { m_modified.set(slots(), changed); }
     void clearModified(unsigned long index) { m_modified.set(index, false); }
+    bool anyChanged() const { return m_modified.any(); }
 
 private:
+    unsigned long slots() const { return m_modified.size() - 2; }
+
     UUID m_id;
     Model::Impl* m_model;
     meta::Class m_metaClass;
-    unsigned long m_count;
-    support::SlotSet m_modified;
-    std::uint32_t m_holderCount = 0;
-
-protected:
-    bool anyChanged() const { return m_modified.any(); }
+    [[no_unique_address]] support::SlotSet m_modified; ///< What comes next fits in behind.
+    std::uint32_t m_keepsElement : 1 = 0;
+    std::uint32_t m_holderCount : 31 = 0;
+    ModelElement::Impl* m_element = nullptr; ///< Not to be followed unless it is kept.
 };
 
 /// The record of a deep transaction: also the old values. Each class derives its own.
@@ -95,17 +114,27 @@ public:
                               ReflectionPrivateTag const& tag) const;
 
     /// The container before the transaction; meaningful if `isContainerChanged`.
-    ModelElement const& getOldContainer() const { return m_oldContainer; }
-    meta::Property const& getOldContainmentProperty() const { return m_oldContainmentProperty; }
-    Feature const& getOldContainment() const { return m_oldContainment; }
+    ModelElement getOldContainer() const;
+    meta::Property getOldContainmentProperty() const;
+    Feature getOldContainment() const;
+
+    /// The values of the slots that changed; for classes made of rows.
+    support::OldValues& oldValues() { return m_oldValues; }
+    support::OldValues const& oldValues() const { return m_oldValues; }
 
 private:
     friend class ModelElement::Impl;
 
+    struct OldLink
+    {
+        ModelElement container;
+        meta::Property property; ///< Keeps what `feature` may point to.
+        Feature feature;
+    };
+    static constexpr unsigned long LINK = 0; ///< No property has this slot.
+
     void setOldContainer(ModelElement const& container, Feature const& feature);
 
-    ModelElement m_oldContainer;
-    meta::Property m_oldContainmentProperty;
-    Feature m_oldContainment;
+    support::OldValues m_oldValues; ///< And the `OldLink`, for few elements move.
 };
 } // namespace tarn::kiln

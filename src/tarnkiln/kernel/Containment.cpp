@@ -158,7 +158,7 @@ void ModelElement::Impl::basicSetContainer(Impl* newContainer, Feature const& fe
 
 void ModelElement::Impl::basicSetContainer(Storage const* storage)
 {
-    Feature const& feature = storage->getOldContainment();
+    Feature const feature = storage->getOldContainment();
     if (!feature) {
         m_model->m_topLevelElements.insertReturning(this);
         storeLink(nullptr, Feature());

@@ -4,6 +4,7 @@
 
 namespace tarn::kiln {
 class AbstractTransactionImpl;
+class ChangeRecords;
 class ChangesHolder;
 class ConstellationListener;
 class ElementHandle;

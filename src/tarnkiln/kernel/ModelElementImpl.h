@@ -233,6 +233,7 @@ protected:
     void collectionInvalidated(AbstractOwnedCollection* collection);
 
 private:
+    friend class ChangeRecords;
     friend class internal::InvariantChecker;
     friend class support::TopLevelElements;
     friend class Model::Impl;
@@ -245,6 +246,7 @@ private:
     void anchor();
     void unanchor();
     static constexpr std::uint32_t NOT_TOP_LEVEL = ~std::uint32_t{0};
+    static constexpr std::uint32_t NOT_RECORDED = ~std::uint32_t{0};
 
     /// What `m_proxyId` and `m_anchor` share their place for.
     enum class Aside : unsigned char
@@ -257,6 +259,7 @@ private:
     bool m_containerPinned = false; ///< A dead element keeps its container in memory.
     Aside m_aside = Aside::Nothing;
     std::uint32_t m_topLevelIndex = NOT_TOP_LEVEL;
+    std::uint32_t m_recordPlace = NOT_RECORDED; ///< In the last transaction that recorded it.
     Impl* m_container = nullptr;
     Feature m_containmentFeature; ///< The container's; null for a top-level element.
     Model::Impl* m_model; ///< Not to be followed in a dead element, which has an anchor.

@@ -371,9 +371,12 @@ void Model::Impl::destroyElements(bool multiModel)
 {
     bool const keepIncoming = m_validity == ElementValidity::ModelDestroying
                               || (m_dataSource && !multiModel);
-    std::vector<ModelElement> const topLevel = m_topLevelElements.all();
-    for (ModelElement const& element : topLevel)
+    std::vector<ModelElement> topLevel = m_topLevelElements.all();
+    while (!topLevel.empty()) { // from the back, where leaving the top level moves no other element
+        ModelElement const element = std::move(topLevel.back());
+        topLevel.pop_back();
         element->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
+    }
 }
 
 void Model::Impl::destroyAllContents()
@@ -387,6 +390,23 @@ void Model::Impl::destroyAllContents()
     transaction.commit();
 }
 
+/// Top-level elements in their order, in which they also lie in memory more or less, and then what
+/// they contain.
+void Model::Impl::convertAllReferencesToProxies(bool multiModel)
+{
+    std::vector<ModelElement> elements = m_topLevelElements.all();
+    if (elements.size() != m_elements.size()) {
+        m_elements.forEach([&](ModelElement::Impl* element) {
+            if (!m_topLevelElements.contains(element))
+                elements.emplace_back(element);
+        });
+    }
+    for (ModelElement const& element : elements) {
+        boost::optional<ProxyId> proxyId;
+        element->convertReferencesToProxies(multiModel, proxyId);
+    }
+}
+
 void Model::Impl::destroy()
 {
     if (m_validity == ElementValidity::Invalid || m_validity == ElementValidity::ModelDestroying)
@@ -397,10 +417,7 @@ void Model::Impl::destroy()
     Transaction const transaction = beginTransaction(/*revertible=*/false);
     removeAllListeners();
     bool const multiModel = isMultiModel();
-    for (ModelElement const& element : getAllElements()) {
-        boost::optional<ProxyId> proxyId;
-        element->convertReferencesToProxies(multiModel, proxyId);
-    }
+    convertAllReferencesToProxies(multiModel);
     destroyElements(multiModel);
     m_topLevelElements.clear();
     // what a link calls contained although no collection holds it

@@ -288,6 +288,7 @@ private:
     void removeAllListeners();
     void tellExtensionListeners(std::function<void(ExtensionListener&)> const& tell);
     void destroyExtensions();
+    void convertAllReferencesToProxies(bool multiModel);
     void destroyElements(bool multiModel);
     bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
 

@@ -59,14 +59,7 @@ void ReportData::processElement(ModelElement const& element, ModelElement::Impl:
 
 ModelElement::Impl::Changes* ReportData::findRecord(ModelElement const& element) const
 {
-    if (!element.getImpl())
-        return nullptr;
-    for (auto const& [newcomer, record] : m_changes->newcomers) {
-        if (newcomer == element)
-            return record.get();
-    }
-    auto const found = m_changes->byUuid.find(element->getUuid());
-    return found == m_changes->byUuid.end() ? nullptr : found->second.get();
+    return element.getImpl() ? m_changes->findAnyTime(element.getImpl()) : nullptr;
 }
 
 bool ReportData::isChanged(ModelElement const& element, meta::Property const& property) const

@@ -1,9 +1,8 @@
 /// \file
 /// What a transaction tells its listeners.
 #pragma once
-#include "tarnkiln/kernel/ChangesHolder.h"
+#include "tarnkiln/kernel/ChangeRecords.h"
 #include "tarnkiln/kernel/Model.h"
-#include "tarnkiln/kernel/UUIDHasher.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/meta/AbstractDeferredInvocation.h"
 #include "tarnkiln/meta/TransactionOrigin.h"
@@ -11,18 +10,9 @@
 #include <boost/optional.hpp>
 
 #include <memory>
-#include <unordered_map>
 #include <vector>
 
 namespace tarn::kiln {
-
-/// The records of a transaction: those by UUID, and those of elements that were created under the
-/// UUID of an element that the same transaction destroyed.
-struct TARNKILN_EXPORT ChangeRecords
-{
-    std::unordered_map<UUID, ChangesHolder, internal::UUIDHasher> byUuid;
-    std::vector<std::pair<ModelElement, ChangesHolder>> newcomers;
-};
 
 /// What was created, changed and destroyed, the commit message and the origin.
 ///

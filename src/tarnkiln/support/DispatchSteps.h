@@ -53,13 +53,10 @@ inline bool maySet(meta::Property const& property, internal::ReflectionPrivateTa
     return property->isPublicMutator() && !(property->isReadOnly() && !property->isSetOnce());
 }
 
-/// What the row `Row` keeps in `record`.
-template <class Row, class Record> auto& oldValueOf(Record& record)
+/// What `record` keeps for the row `Row`; null if that is nothing.
+template <class Row> auto* oldValueOf(auto& record)
 {
-    return static_cast<
-               std::conditional_t<std::is_const_v<Record>, OldValue<Row> const, OldValue<Row>>&>(
-               record)
-        .old;
+    return record.oldValues().template find<typename Row::Old>(Steps<Row>::slot().index);
 }
 
 template <class Owner, class Base> Record<Owner, Base>::~Record() = default;
@@ -211,26 +208,22 @@ void Dispatched<Derived, Base>::convertToProxy(meta::Property const& property, P
 template <class Derived, class Base>
 ModelElement::Impl::Changes* Dispatched<Derived, Base>::createChanges() const
 {
-    return new ModelElement::Impl::Changes(this->getUuid(), this->getModel(), this->getMetaClass(),
-                                           Derived::SLOTS);
+    return new ModelElement::Impl::Changes(self(), Derived::SLOTS);
 }
 
 template <class Derived, class Base>
 ModelElement::Impl::Storage* Dispatched<Derived, Base>::createStorage() const
 {
-    return new typename Derived::Storage(this->getUuid(), this->getModel(), this->getMetaClass(),
-                                         Derived::SLOTS);
+    return new typename Derived::Storage(self(), Derived::SLOTS);
 }
 
 template <class Derived, class Base>
 void Dispatched<Derived, Base>::copyValue(ModelElement::Impl::Storage* storage,
                                           unsigned long index) const
 {
-    auto& record = static_cast<typename Derived::Storage&>(*storage);
     bool const found = Derived::Rows::any([&](auto row) {
         using Row = Steps<decltype(row)>;
-        return Row::slot().index == index &&
-               (Row::copyOld(self(), oldValueOf<decltype(row)>(record)), true);
+        return Row::slot().index == index && (Row::copyOld(self(), storage->oldValues()), true);
     });
     if (!found)
         Base::copyValue(storage, index);
@@ -239,11 +232,10 @@ void Dispatched<Derived, Base>::copyValue(ModelElement::Impl::Storage* storage,
 template <class Derived, class Base>
 void Dispatched<Derived, Base>::copyStateFromStorage(ModelElement::Impl::Storage* storage)
 {
-    auto& record = static_cast<typename Derived::Storage&>(*storage);
     Derived::Rows::each([&](auto row) {
         using Row = Steps<decltype(row)>;
-        if (record.isSlotChanged(Row::slot().index))
-            Row::restore(self(), oldValueOf<decltype(row)>(record));
+        if (storage->isSlotChanged(Row::slot().index))
+            Row::restore(self(), oldValueOf<decltype(row)>(*storage));
     });
     Base::copyStateFromStorage(storage);
 }

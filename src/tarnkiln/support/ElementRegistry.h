@@ -14,8 +14,10 @@ namespace tarn::kiln::support {
 
 /// Maps UUIDs to elements, without a share in them.
 ///
-/// Open addressing with linear probing over pointers; the key is read through the pointer. Room is
-/// kept for elements that were erased and may come back, so that their return allocates nothing.
+/// Open addressing with linear probing over pointers; the key is read through the pointer. An entry
+/// also knows how far it is from its home, so that most of what a probe passes need not be touched.
+/// Room is kept for elements that were erased and may come back, so that their return allocates
+/// nothing.
 class ElementRegistry
 {
 public:
@@ -24,10 +26,13 @@ public:
     {
         if (m_size == 0)
             return nullptr;
-        for (std::size_t at = home(id);; at = next(at)) {
-            ModelElement::Impl* const element = m_table[at];
-            if (!element || element->getUuid() == id)
-                return element;
+        std::size_t distance = 0;
+        for (std::size_t at = home(id);; at = next(at), ++distance) {
+            Entry const entry = m_table[at];
+            if (entry.isFree())
+                return nullptr;
+            if (entry.mayBeAt(distance) && entry.element()->getUuid() == id)
+                return entry.element();
         }
     }
     /// False if the UUID is taken.
@@ -46,8 +51,8 @@ public:
         if (m_size == 0)
             return;
         std::size_t at = home(element->getUuid());
-        while (m_table[at] != element) {
-            if (!m_table[at])
+        while (m_table[at].element() != element) {
+            if (m_table[at].isFree())
                 return;
             at = next(at);
         }
@@ -61,7 +66,7 @@ public:
     std::size_t size() const { return m_size; }
     void clear()
     {
-        std::fill_n(m_table.get(), m_capacity, nullptr);
+        std::fill_n(m_table.get(), m_capacity, Entry());
         m_size = 0;
     }
 
@@ -89,8 +94,8 @@ public:
     void forEach(Visit const& visit) const
     {
         for (std::size_t at = 0; at < m_capacity; ++at) {
-            if (m_table[at])
-                visit(m_table[at]);
+            if (!m_table[at].isFree())
+                visit(m_table[at].element());
         }
     }
 
@@ -99,14 +104,42 @@ public:
     {
         std::size_t longest = 0;
         for (std::size_t at = 0; at < m_capacity; ++at) {
-            if (m_table[at])
-                longest = std::max(longest,
-                                   (at - home(m_table[at]->getUuid())) & (m_capacity - 1));
+            if (!m_table[at].isFree())
+                longest = std::max(longest, distanceAt(at));
         }
         return longest;
     }
 
 private:
+    /// A pointer to an element, whose low bits tell how many places behind its home it lies.
+    class Entry
+    {
+    public:
+        Entry() = default;
+        Entry(ModelElement::Impl* element, std::size_t distance)
+            : m_bits(reinterpret_cast<std::uintptr_t>(element) | std::min(distance, FAR))
+        {
+        }
+
+        bool isFree() const { return m_bits == 0; }
+        ModelElement::Impl* element() const
+        {
+            return reinterpret_cast<ModelElement::Impl*>(m_bits & ~std::uintptr_t{FAR});
+        }
+        /// The distance, if it is less than `FAR`; else `FAR`.
+        std::size_t distance() const { return m_bits & FAR; }
+        bool mayBeAt(std::size_t distance) const
+        {
+            return this->distance() == std::min(distance, FAR);
+        }
+
+        static constexpr std::size_t FAR = 7;
+
+    private:
+        std::uintptr_t m_bits = 0;
+    };
+    static_assert(alignof(ModelElement::Impl) > Entry::FAR);
+
     /// Depends on all bytes: those of a family of UUIDs often differ in a few only.
     std::size_t home(UUID const& id) const
     {
@@ -118,24 +151,33 @@ private:
         return static_cast<std::size_t>(word * SPREAD >> m_shift);
     }
     std::size_t next(std::size_t at) const { return (at + 1) & (m_capacity - 1); }
+    std::size_t distanceAt(std::size_t at) const
+    {
+        Entry const entry = m_table[at];
+        if (entry.distance() < Entry::FAR)
+            return entry.distance();
+        return (at - home(entry.element()->getUuid())) & (m_capacity - 1);
+    }
     void place(ModelElement::Impl* element)
     {
         std::size_t at = home(element->getUuid());
-        while (m_table[at])
-            at = next(at);
-        m_table[at] = element;
+        std::size_t distance = 0;
+        for (; !m_table[at].isFree(); at = next(at))
+            ++distance;
+        m_table[at] = Entry(element, distance);
     }
     /// Moves later entries of the probe sequence up, so that none is cut off from its home.
     void closeGap(std::size_t gap)
     {
-        for (std::size_t at = next(gap); m_table[at]; at = next(at)) {
-            std::size_t const from = home(m_table[at]->getUuid());
-            if (((at - from) & (m_capacity - 1)) >= ((at - gap) & (m_capacity - 1))) {
-                m_table[gap] = m_table[at];
+        for (std::size_t at = next(gap); !m_table[at].isFree(); at = next(at)) {
+            std::size_t const distance = distanceAt(at);
+            std::size_t const step = (at - gap) & (m_capacity - 1);
+            if (distance >= step) {
+                m_table[gap] = Entry(m_table[at].element(), distance - step);
                 gap = at;
             }
         }
-        m_table[gap] = nullptr;
+        m_table[gap] = Entry();
     }
     void reserveFor(std::size_t count)
     {
@@ -144,18 +186,18 @@ private:
         std::size_t capacity = m_capacity ? m_capacity * 2 : 16;
         while (count * 4 > capacity * 3)
             capacity *= 2;
-        auto old = std::make_unique<ModelElement::Impl*[]>(capacity);
+        auto old = std::make_unique<Entry[]>(capacity);
         std::size_t const oldCapacity = m_capacity;
         m_table.swap(old);
         m_capacity = capacity;
         m_shift = 64 - std::countr_zero(capacity);
         for (std::size_t at = 0; at < oldCapacity; ++at) {
-            if (old[at])
-                place(old[at]);
+            if (!old[at].isFree())
+                place(old[at].element());
         }
     }
 
-    std::unique_ptr<ModelElement::Impl*[]> m_table;
+    std::unique_ptr<Entry[]> m_table;
     std::size_t m_capacity = 0; ///< A power of two; at most three quarters are used.
     int m_shift = 0;            ///< Leaves as many of 64 bits as a place in the table has.
     std::size_t m_size = 0;

@@ -8,9 +8,10 @@ namespace tarn::kiln::support {
 
 /// The values that an element of the class `Owner` had when the transaction began.
 ///
-/// Reports may keep it alive longer. `Base` is the record of the superclass.
+/// It adds no fields: the base keeps the values of the slots that changed, and the rows know their
+/// types. Reports may keep it alive longer. `Base` is the record of the superclass.
 template <class Owner, class Base>
-class TARNKILN_EXPORT Record : public Base, public Owner::Rows::OldValues
+class TARNKILN_EXPORT Record : public Base
 {
 public:
     using Base::Base;

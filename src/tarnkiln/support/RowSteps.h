@@ -56,10 +56,12 @@ inline bool leavesProxy(ModelElement::Impl const& element, ModelElement::Impl co
 template <Slot const& SLOT> struct NoSteps
 {
     static Slot const& slot() { return SLOT; }
-    static void copyOld(auto const& /*element*/, auto& /*old*/) {}
-    static void restore(auto& /*element*/, auto& /*old*/) {}
+    /// Keeps the present value.
+    static void copyOld(auto const& /*element*/, OldValues& /*values*/) {}
+    /// Puts `old` in the place of the present value, which ends up there.
+    static void restore(auto& /*element*/, auto* /*old*/) {}
     /// Whether a single reference has the target that it had before.
-    static bool isReverted(auto const& /*element*/, auto const& /*record*/, auto const& /*old*/)
+    static bool isReverted(auto const& /*element*/, auto const& /*record*/, auto const* /*old*/)
     {
         return false;
     }
@@ -95,17 +97,19 @@ template <Slot const& SLOT> struct NoSteps
 ///
 ///     static bool has(auto const& element);                     // whether there is a value
 ///     static Value get(auto const& element, property, tag);     // the value
-///     static Value old(auto const& record, auto const& old, property);  // the value in a record
+///     static Value old(auto const& record, auto const* old, property);  // the value in a record
+///
+/// The `old` that a step takes is what the record keeps for the row, null if that is nothing.
 template <class Row> struct Steps;
 
-/// Puts the contents of the snapshot `old`, which is null for a collection that was made later, in
-/// the place of the present ones, which end up in the snapshot.
+/// Puts the contents of the snapshot `old`, of which there is none for a collection that was made
+/// later, in the place of the present ones, which end up in the snapshot.
 template <class Collection>
-void restoreContents(LazyCollection<Collection>& field, std::unique_ptr<Collection>& old) noexcept
+void restoreContents(LazyCollection<Collection>& field, std::unique_ptr<Collection>* old) noexcept
 {
     Collection* const present = field.get();
     if (present && old)
-        present->basicSwapContents(*old);
+        present->basicSwapContents(**old);
     else if (present)
         present->basicDropContents();
 }
@@ -115,8 +119,15 @@ template <auto FIELD, Slot const& SLOT> struct FieldSteps : NoSteps<SLOT>
 {
     using Owner = FieldOwner<FIELD>;
 
-    static void copyOld(Owner const& element, auto& old) { old = element.*FIELD; }
-    static void restore(Owner& element, auto& old) { std::swap(element.*FIELD, old); }
+    static void copyOld(Owner const& element, OldValues& values)
+    {
+        values.keep<FieldType<FIELD>>(SLOT.index, element.*FIELD);
+    }
+    static void restore(Owner& element, FieldType<FIELD>* old)
+    {
+        if (old)
+            std::swap(element.*FIELD, *old);
+    }
 };
 
 template <auto FIELD, Slot const& SLOT> struct PlainFieldSteps : FieldSteps<FIELD, SLOT>
@@ -129,9 +140,10 @@ template <auto FIELD, Slot const& SLOT> struct PlainFieldSteps : FieldSteps<FIEL
     {
         return PlainField<Plain>::toValue(property, element.*FIELD);
     }
-    static Value old(auto const& /*record*/, Plain const& old, meta::Property const& property)
+    static Value old(auto const& /*record*/, Plain const* old, meta::Property const& property)
     {
-        return PlainField<Plain>::toValue(property, old);
+        return old ? PlainField<Plain>::toValue(property, *old)
+                   : Value::createEmptyValue(property);
     }
 };
 
@@ -178,14 +190,14 @@ struct SingleReferenceSteps : FieldSteps<FIELD, SLOT>
     {
         return Value::createElementValue(property, Target(target(element, tag)));
     }
-    static Value old(auto const& /*record*/, Pointer const& old, meta::Property const& property)
+    static Value old(auto const& /*record*/, Pointer const* old, meta::Property const& property)
     {
-        return Value::createElementValue(property, Target(old.get()));
+        return Value::createElementValue(property, Target(old ? old->get() : nullptr));
     }
 
-    static bool isReverted(Owner const& element, auto const& /*record*/, Pointer const& old)
+    static bool isReverted(Owner const& element, auto const& /*record*/, Pointer const* old)
     {
-        return old.get() == (element.*FIELD).get();
+        return old && old->get() == (element.*FIELD).get();
     }
     static void inverseAdd(Owner& element, ModelElement const& other)
     {
@@ -335,7 +347,7 @@ struct Steps<Container<Target, SLOT, SETTER>> : NoSteps<SLOT>
     {
         return Value::createElementValue(property, ModelElement(container(element)));
     }
-    static Value old(auto const& record, NoOldValue const& /*old*/, meta::Property const& property)
+    static Value old(auto const& record, NoOldValue const* /*old*/, meta::Property const& property)
     {
         return Value::createElementValue(property, ModelElement(oldContainer(record)));
     }
@@ -344,7 +356,7 @@ struct Steps<Container<Target, SLOT, SETTER>> : NoSteps<SLOT>
         (element.*SETTER)(value.getValue<Target>());
         return true;
     }
-    static bool isReverted(Element const& element, auto const& record, NoOldValue const& /*old*/)
+    static bool isReverted(Element const& element, auto const& record, NoOldValue const* /*old*/)
     {
         return !record.isContainerChanged() || oldContainer(record) == container(element);
     }
@@ -387,6 +399,7 @@ private:
 template <auto FIELD, Slot const& SLOT, auto MAKE, auto GETTER>
 struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
 {
+    using Row = References<FIELD, SLOT, MAKE, GETTER>;
     using Owner = FieldOwner<FIELD>;
 
     static ReferenceCollection& made(Owner const& element)
@@ -410,11 +423,11 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
         ReferenceCollection& shown = resolves ? (element.*GETTER)() : made(element);
         return Value::createCollectionValue(property, &shown);
     }
-    static Value old(auto const& /*record*/, auto const& old, meta::Property const& property)
+    static Value old(auto const& /*record*/, auto const* old, meta::Property const& property)
     {
         if (!old)
             return Value::createEmptyValue(property);
-        Value value = Value::createCollectionValue(property, old.get());
+        Value value = Value::createCollectionValue(property, old->get());
         value.setReflective();
         return value;
     }
@@ -423,15 +436,16 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
         return !SLOT.composite && !(SLOT.opposite && SLOT.opposite->composite);
     }
 
-    static void copyOld(Owner const& element, auto& old)
+    static void copyOld(Owner const& element, OldValues& values)
     {
         auto* const present = (element.*FIELD).get();
         if (!present)
             return;
-        old = MAKE(nullptr);
+        typename Row::Old old = MAKE(nullptr);
         ModelElement::Impl::_basicCopyValues(old.get(), present);
+        values.keep<typename Row::Old>(SLOT.index, std::move(old));
     }
-    static void restore(Owner& element, auto& old) { restoreContents(element.*FIELD, old); }
+    static void restore(Owner& element, auto* old) { restoreContents(element.*FIELD, old); }
     static void inverseAdd(Owner& element, ModelElement const& other)
     {
         ModelElement::Impl::_basicAdd(&made(element), other);
@@ -519,6 +533,7 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
 template <auto FIELD, Slot const& SLOT, auto MAKE, auto GETTER>
 struct Steps<Values<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
 {
+    using Row = Values<FIELD, SLOT, MAKE, GETTER>;
     using Owner = FieldOwner<FIELD>;
 
     static bool has(Owner const& element)
@@ -531,20 +546,21 @@ struct Steps<Values<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
     {
         return Value::createCollectionValue(property, &(element.*GETTER)());
     }
-    static Value old(auto const& /*record*/, auto const& old, meta::Property const& property)
+    static Value old(auto const& /*record*/, auto const* old, meta::Property const& property)
     {
-        return old ? Value::createCollectionValue(property, old.get())
+        return old ? Value::createCollectionValue(property, old->get())
                    : Value::createEmptyValue(property);
     }
-    static void copyOld(Owner const& element, auto& old)
+    static void copyOld(Owner const& element, OldValues& values)
     {
         auto* const present = (element.*FIELD).get();
         if (!present)
             return;
-        old = MAKE(nullptr);
+        typename Row::Old old = MAKE(nullptr);
         old->copyContents(*present);
+        values.keep<typename Row::Old>(SLOT.index, std::move(old));
     }
-    static void restore(Owner& element, auto& old) { restoreContents(element.*FIELD, old); }
+    static void restore(Owner& element, auto* old) { restoreContents(element.*FIELD, old); }
     static AbstractOwnedCollection* collection(Owner const& element)
     {
         return (element.*FIELD).get();

@@ -5,7 +5,8 @@
 ///         support::Scalar<&Impl::m_value, VALUE, &Impl::setValue>,
 ///         support::Container<Enum, PARENT_ENUM, &Impl::setParentEnum>>;
 ///
-/// Rows stand in the order of declaration; destruction, cascades and callbacks follow it.
+/// Rows stand in the order of declaration; destruction, cascades and callbacks follow it. The `Old`
+/// of a row is what the record of a transaction keeps for it.
 #pragma once
 #include "tarnkiln/kernel/Feature.h"
 #include "tarnkiln/support/CountedPointer.h"
@@ -74,18 +75,8 @@ template <auto FIELD, Slot const& SLOT, auto MAKE, auto GETTER> struct Values
     using Old = std::unique_ptr<typename FieldType<FIELD>::Made>;
 };
 
-/// What one row keeps in the record of a transaction.
-template <class Row> struct OldValue
-{
-    typename Row::Old old{};
-};
-
 template <class... Rows> struct RowList
 {
-    /// What all rows keep in the record of a transaction.
-    struct OldValues : OldValue<Rows>...
-    {};
-
     /// Whether `step(row)` is true for a row; asks no further ones.
     template <class Step> static bool any([[maybe_unused]] Step step)
     {

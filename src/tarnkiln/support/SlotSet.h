@@ -2,7 +2,6 @@
 /// A small set of slot numbers.
 #pragma once
 #include <cstdint>
-#include <memory>
 
 namespace tarn::kiln::support {
 
@@ -11,41 +10,55 @@ class SlotSet
 {
 public:
     explicit SlotSet(unsigned long size)
-        : m_size(size)
-        , m_more(size > WORD ? std::make_unique<std::uint64_t[]>((size - 1) / WORD) : nullptr)
+        : m_size(static_cast<std::uint32_t>(size))
     {
+        if (isLarge())
+            m_words = new std::uint64_t[wordCount()]();
+        else
+            m_word = 0;
+    }
+    SlotSet(SlotSet const&) = delete;
+    SlotSet& operator=(SlotSet const&) = delete;
+    ~SlotSet()
+    {
+        if (isLarge())
+            delete[] m_words;
     }
 
-    bool test(unsigned long bit) const { return bit < m_size && (word(bit) >> bit % WORD & 1u); }
+    unsigned long size() const { return m_size; }
+    bool test(unsigned long bit) const
+    {
+        return bit < m_size && (words()[bit / WORD] >> bit % WORD & 1u);
+    }
     void set(unsigned long bit, bool value = true)
     {
         if (bit >= m_size)
             return;
         std::uint64_t const mask = std::uint64_t{1} << bit % WORD;
-        word(bit) = value ? word(bit) | mask : word(bit) & ~mask;
+        std::uint64_t& word = const_cast<std::uint64_t*>(words())[bit / WORD];
+        word = value ? word | mask : word & ~mask;
     }
     bool any() const
     {
-        bool found = m_first != 0;
-        for (unsigned long i = 0; !found && (i + 1) * WORD < m_size; ++i)
-            found = m_more[i] != 0;
-        return found;
+        for (unsigned long i = 0; i < wordCount(); ++i) {
+            if (words()[i] != 0)
+                return true;
+        }
+        return false;
     }
 
 private:
     static constexpr unsigned long WORD = 64;
 
-    std::uint64_t const& word(unsigned long bit) const
-    {
-        return bit < WORD ? m_first : m_more[bit / WORD - 1];
-    }
-    std::uint64_t& word(unsigned long bit)
-    {
-        return bit < WORD ? m_first : m_more[bit / WORD - 1];
-    }
+    bool isLarge() const { return m_size > WORD; }
+    unsigned long wordCount() const { return (m_size + WORD - 1) / WORD; }
+    std::uint64_t const* words() const { return isLarge() ? m_words : &m_word; }
 
-    unsigned long m_size;
-    std::uint64_t m_first = 0;
-    std::unique_ptr<std::uint64_t[]> m_more;
+    union
+    {
+        std::uint64_t m_word;
+        std::uint64_t* m_words; ///< Owned; of a large set.
+    };
+    std::uint32_t m_size;
 };
 } // namespace tarn::kiln::support

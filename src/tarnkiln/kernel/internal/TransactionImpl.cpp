@@ -73,7 +73,11 @@ TransactionImpl::TransactionImpl(Model const& model, TransactionGroup* group,
         m_group->addMember(this);
 }
 
-TransactionImpl::~TransactionImpl() = default;
+TransactionImpl::~TransactionImpl()
+{
+    if (has(DESTROYED_SOME)) // reports may hold the records longer
+        m_changes->forEach([](ModelElement::Impl::Changes& record) { record.releaseElement(); });
+}
 
 // ---------------------------------------------------------------------------- recording
 
@@ -109,56 +113,19 @@ void TransactionImpl::announceFirstChange()
         reportException(tarnkiln::messages::NoOpenTransaction());
 }
 
-ChangesHolder TransactionImpl::makeRecord(ModelElement::Impl const& element) const
-{
-    return ChangesHolder(has(DEEP) ? element.createStorage() : element.createChanges());
-}
-
-/// Whether the record under the element's UUID is that of another element, which this transaction
-/// destroyed.
-bool TransactionImpl::isDestroyedPredecessor(ModelElement::Impl const* element) const
-{
-    if (!m_destroyedElements)
-        return false;
-    auto const found = m_destroyedElements->find(element->getUuid());
-    return found != m_destroyedElements->end() && found->second.getImpl() != element;
-}
-
-ModelElement::Impl::Changes* TransactionImpl::findRecord(ModelElement::Impl const* element) const
-{
-    if (isDestroyedPredecessor(element)) {
-        for (auto const& newcomer : m_changes->newcomers) {
-            if (newcomer.first.getImpl() == element)
-                return newcomer.second.get();
-        }
-        return nullptr;
-    }
-    auto const found = m_changes->byUuid.find(element->getUuid());
-    return found == m_changes->byUuid.end() ? nullptr : found->second.get();
-}
-
-void TransactionImpl::insertRecord(ModelElement::Impl* element, ChangesHolder record)
-{
-    if (has(DEEP) && m_pins.capacity() <= m_changes->byUuid.size())
-        m_pins.reserve(2 * m_changes->byUuid.size() + 8);
-    if (isDestroyedPredecessor(element))
-        m_changes->newcomers.emplace_back(ModelElement(element), std::move(record));
-    else
-        m_changes->byUuid.insert_or_assign(element->getUuid(), std::move(record));
-}
-
 /// Lets `fill` write the element's record. A new one is entered last, so that a failure leaves the
 /// transaction as it was.
 template <class Fill>
 void TransactionImpl::record(ModelElement::Impl* element, Fill const& fill)
 {
-    if (ModelElement::Impl::Changes* const known = findRecord(element)) {
+    if (ModelElement::Impl::Changes* const known = m_changes->find(element)) {
         fill(*known);
     }
     else {
-        ChangesHolder const made = makeRecord(*element);
+        ChangesHolder made(has(DEEP) ? element->createStorage() : element->createChanges());
+        made->setElement(element);
         fill(*made);
-        insertRecord(element, made);
+        m_changes->append(element, std::move(made));
     }
     m_flags |= HAS_CHANGES | REPORT_STALE;
 }
@@ -170,20 +137,12 @@ void TransactionImpl::elementCreated(ModelElement::Impl* element)
     if (has(DESTROY_ALL))
         reportException(tarnkiln::messages::CreateWithDestroyAll());
     announceFirstChange();
-    ChangesHolder const made = makeRecord(*element);
-    made->setCreated();
-    insertRecord(element, made);
-    m_flags |= HAS_CHANGES | REPORT_STALE;
+    record(element, [](ModelElement::Impl::Changes& changes) { changes.setCreated(); });
 }
 
 void TransactionImpl::forgetCreation(ModelElement::Impl const* element)
 {
-    if (isDestroyedPredecessor(element))
-        std::erase_if(m_changes->newcomers, [&](auto const& newcomer) {
-            return newcomer.first.getImpl() == element;
-        });
-    else
-        m_changes->byUuid.erase(element->getUuid());
+    m_changes->forget(element);
 }
 
 void TransactionImpl::elementDestroying(ModelElement::Impl* element)
@@ -191,19 +150,11 @@ void TransactionImpl::elementDestroying(ModelElement::Impl* element)
     if (!startRecording())
         return;
     announceFirstChange();
-    if (!m_destroyedElements)
-        m_destroyedElements =
-            std::make_unique<std::unordered_map<UUID, ModelElement, UUIDHasher>>();
-    bool const kept =
-        m_destroyedElements->emplace(element->getUuid(), ModelElement(element)).second;
-    try {
-        record(element, [](ModelElement::Impl::Changes& changes) { changes.setDestroyed(); });
-    }
-    catch (...) {
-        if (kept)
-            m_destroyedElements->erase(element->getUuid());
-        throw;
-    }
+    record(element, [&](ModelElement::Impl::Changes& changes) {
+        changes.setDestroyed();
+        changes.keepElement(element);
+    });
+    set(DESTROYED_SOME);
 }
 
 void TransactionImpl::allElementsDestroying()
@@ -377,16 +328,25 @@ std::shared_ptr<ReportData> TransactionImpl::createReport(boost::optional<Value>
     auto report = std::make_shared<ReportData>(m_model, m_changes, message, has(REVERT_UNCHANGED),
                                                has(DEEP), m_deferredInvocations, has(DESTROY_ALL),
                                                m_origin);
-    for (auto const& [id, record] : m_changes->byUuid) {
-        ModelElement const element = record->isDestroyed()
-                                         ? m_destroyedElements->at(id)
-                                         : m_model->findElement(id, FindElementBehavior::Fetch);
-        if (element.getImpl()) // a listener of another model may have destroyed it since
-            report->processElement(element, record.get());
-    }
-    for (auto const& [element, record] : m_changes->newcomers)
-        report->processElement(element, record.get());
+    m_changes->forEach([&](ModelElement::Impl::Changes& record) {
+        ModelElement const element =
+            record.isDestroyed()
+                ? ModelElement(record.getKeptElement())
+                : m_model->findElement(record.getUuid(), FindElementBehavior::Fetch);
+        // a listener of another model may have destroyed it since
+        if (belongsTo(record, element.getImpl()))
+            report->processElement(element, &record);
+    });
     return report;
+}
+
+/// Whether `element`, which was found under the UUID of `record`, has no record of its own; false
+/// for null.
+bool TransactionImpl::belongsTo(ModelElement::Impl::Changes const& record,
+                                ModelElement::Impl const* element) const
+{
+    ModelElement::Impl::Changes const* const own = element ? m_changes->find(element) : nullptr;
+    return element && (!own || own == &record);
 }
 
 void TransactionImpl::prepare(boost::optional<Value> const& message)
@@ -495,14 +455,24 @@ void TransactionImpl::checkInvariants()
 
 // ---------------------------------------------------------------------------- undo
 
+/// No element may die from what is put back into another one.
 void TransactionImpl::pinElements()
 {
-    for (auto const& [id, record] : m_changes->byUuid) {
-        ModelElement::Impl* const element = record->isDestroyed()
-                                                ? m_destroyedElements->at(id).getImpl()
-                                                : m_model->findElementImpl(id);
-        m_pins.emplace_back(element);
-    }
+    m_changes->forEach([this](ModelElement::Impl::Changes& record) {
+        if (record.isDestroyed())
+            return;
+        ModelElement::Impl* const element = m_model->findElementImpl(record.getUuid());
+        if (belongsTo(record, element))
+            record.keepElement(element);
+    });
+}
+
+void TransactionImpl::unpinElements()
+{
+    m_changes->forEach([](ModelElement::Impl::Changes& record) {
+        if (!record.isDestroyed())
+            record.releaseElement();
+    });
 }
 
 TransactionResult TransactionImpl::undo()
@@ -513,32 +483,25 @@ TransactionResult TransactionImpl::undo()
         return TransactionResult::NotRevertible;
     pinElements();
     set(ROLLED_BACK);
-    auto const undoCreation = [this](ModelElement const& element) {
+    // First what was created: it may have the UUID of what comes back.
+    m_changes->forEachBackward([this](ModelElement::Impl::Changes& record) {
+        ModelElement::Impl* const element = record.getKeptElement();
+        if (!element || !record.isCreated() || record.isDestroyed())
+            return;
         element->basicDisassociateAll();
-        m_model->remove(element.getImpl());
+        m_model->remove(element);
         element->invalidate();
-    };
-    for (auto const& [element, record] : m_changes->newcomers) {
-        if (!record->isDestroyed())
-            undoCreation(element);
-    }
-    std::size_t next = 0;
-    for (auto const& [id, record] : m_changes->byUuid) {
-        ModelElement const& element = m_pins[next++];
-        if (record->isDestroyed() && !record->isCreated())
-            m_model->resurrectElement(element.getImpl());
-    }
-    next = 0;
-    for (auto const& [id, record] : m_changes->byUuid) {
-        ModelElement const& element = m_pins[next++];
-        if (!element.getImpl())
-            continue;
-        if (!record->isCreated())
-            element->copyStateFromStorage(static_cast<ModelElement::Impl::Storage*>(record.get()));
-        else if (!record->isDestroyed())
-            undoCreation(element);
-    }
-    m_pins.clear();
+    });
+    m_changes->forEachBackward([this](ModelElement::Impl::Changes& record) {
+        if (record.isDestroyed() && !record.isCreated())
+            m_model->resurrectElement(record.getKeptElement());
+    });
+    m_changes->forEachBackward([](ModelElement::Impl::Changes& record) {
+        if (record.getKeptElement() && !record.isCreated())
+            record.getKeptElement()->copyStateFromStorage(
+                static_cast<ModelElement::Impl::Storage*>(&record));
+    });
+    unpinElements();
     return TransactionResult::RolledBack;
 }
 } // namespace tarn::kiln::internal

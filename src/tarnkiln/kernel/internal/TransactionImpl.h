@@ -2,11 +2,10 @@
 /// The transaction of one model.
 #pragma once
 #include "tarnkiln/kernel/AbstractTransactionImpl.h"
-#include "tarnkiln/kernel/ChangesHolder.h"
+#include "tarnkiln/kernel/ChangeRecords.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/ReportData.h"
 
-#include <unordered_map>
 #include <vector>
 
 namespace tarn::kiln::internal {
@@ -115,7 +114,8 @@ private:
         ENDED = 64,
         FREEZE_ON_NOTIFY = 128,
         DEEP = 256,
-        REVERT_UNCHANGED = 512
+        REVERT_UNCHANGED = 512,
+        DESTROYED_SOME = 1024 ///< Records keep destroyed elements.
     };
     bool has(Flag flag) const { return (m_flags & flag) != 0; }
     void set(Flag flag) { m_flags |= flag; }
@@ -125,25 +125,22 @@ private:
     void announceFirstChange();
     template <class Fill>
     void record(ModelElement::Impl* element, Fill const& fill);
-    ChangesHolder makeRecord(ModelElement::Impl const& element) const;
-    ModelElement::Impl::Changes* findRecord(ModelElement::Impl const* element) const;
-    void insertRecord(ModelElement::Impl* element, ChangesHolder record);
-    bool isDestroyedPredecessor(ModelElement::Impl const* element) const;
     bool hasNews() const;
     bool anyListener(ReportKind kind) const;
+    bool belongsTo(ModelElement::Impl::Changes const& record,
+                   ModelElement::Impl const* element) const;
     void pinElements();
+    void unpinElements();
 
     Model m_model;
     TransactionGroup* m_group; ///< Null after the end, and for one that stands alone until then.
     std::function<void()> m_firstChangeCallback;
     bool m_inFirstChangeCallback = false;
-    std::shared_ptr<ChangeRecords> m_changes;
+    std::shared_ptr<ChangeRecords> m_changes; ///< Those of destroyed elements keep them, until the
+                                              ///< transaction is gone.
     std::vector<ListenerHolderBase*> m_listeners; ///< As at the beginning; null once removed.
-    /// Keeps destroyed elements, so that they can come back; made when first needed.
-    std::unique_ptr<std::unordered_map<UUID, ModelElement, UUIDHasher>> m_destroyedElements;
     std::shared_ptr<ReportData::DeferredInvocations> m_deferredInvocations;
     std::shared_ptr<ReportData> m_rollBackReport;
-    std::vector<ModelElement> m_pins; ///< Room is kept for an element of each record.
     unsigned m_flags;
     std::uint32_t m_commitCount = 0;
     bool m_isTelling = false;
