@@ -9,13 +9,15 @@ ModelElement::Impl::Changes* ChangeRecords::findAnyTime(ModelElement::Impl const
 {
     if (ModelElement::Impl::Changes* const own = find(element))
         return own;
-    for (; m_filed < m_records.size(); ++m_filed) {
+    for (; m_filed < m_records.size(); ++m_filed)
+    {
         if (ModelElement::Impl::Changes* const record = m_records[m_filed].get())
             m_byUuid.emplace(record->getUuid(), record);
     }
     ModelElement::Impl::Changes* first = nullptr;
     auto const [begin, end] = m_byUuid.equal_range(element->getUuid());
-    for (auto found = begin; found != end; ++found) {
+    for (auto found = begin; found != end; ++found)
+    {
         if (found->second->isOf(element))
             return found->second;
         if (!first || !found->second->isCreated())
@@ -38,4 +40,4 @@ void ChangeRecords::forget(ModelElement::Impl const* element)
     m_filed = 0;
     m_records[element->m_recordPlace] = ChangesHolder();
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -11,9 +11,9 @@ namespace tarn::kiln {
 
 /// The records of one transaction, in the order in which it came to the elements.
 ///
-/// An element knows the place of the last record that was made for it, so that its transaction finds
-/// the record without a search. Reports may ask later, when other transactions have changed the
-/// element; for them the records are also found by UUID.
+/// An element knows the place of the last record that was made for it, so that its transaction
+/// finds the record without a search. Reports may ask later, when other transactions have changed
+/// the element; for them the records are also found by UUID.
 ///
 /// Threads: as the model.
 class TARNKILN_EXPORT ChangeRecords
@@ -45,29 +45,29 @@ public:
 
     /// Calls `visit(ModelElement::Impl::Changes&)` for each, the first one first. Records that are
     /// made meanwhile are visited too.
-    template <class Visit>
-    void forEach(Visit const& visit) const
+    template <class Visit> void forEach(Visit const& visit) const
     {
-        for (std::size_t i = 0; i < m_records.size(); ++i) {
+        for (std::size_t i = 0; i < m_records.size(); ++i)
+        {
             if (m_records[i])
                 visit(*m_records[i]);
         }
     }
     /// The same, the last one first, as what was done is undone. No record may be made meanwhile.
-    template <class Visit>
-    void forEachBackward(Visit const& visit) const
+    template <class Visit> void forEachBackward(Visit const& visit) const
     {
-        for (std::size_t i = m_records.size(); i-- != 0;) {
+        for (std::size_t i = m_records.size(); i-- != 0;)
+        {
             if (m_records[i])
                 visit(*m_records[i]);
         }
     }
 
 private:
-    std::vector<ChangesHolder> m_records; ///< Null where one was let go.
+    std::vector<ChangesHolder> m_records;  ///< Null where one was let go.
     /// Of the first so many records, by UUID; made when a report first needs it.
     mutable std::unordered_multimap<UUID, ModelElement::Impl::Changes*, internal::UUIDHasher>
         m_byUuid;
     mutable std::size_t m_filed = 0;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -20,7 +20,8 @@ public:
     OldValues& operator=(OldValues const&) = delete;
     ~OldValues()
     {
-        while (m_first) {
+        while (m_first)
+        {
             Entry* const released = std::exchange(m_first, m_first->next);
             released->release(released, isInPlace(released));
         }
@@ -28,8 +29,7 @@ public:
 
     /// Keeps `value` for `slot`, in the place of one that was kept before. Always the same `T` for
     /// a slot.
-    template <class T>
-    void keep(unsigned long slot, T value)
+    template <class T> void keep(unsigned long slot, T value)
     {
         if (T* const before = find<T>(slot))
             *before = std::move(value);
@@ -37,17 +37,16 @@ public:
             m_first = make(slot, std::move(value));
     }
     /// The value for `slot`, which is of the type `T`; null if there is none.
-    template <class T>
-    T* find(unsigned long slot)
+    template <class T> T* find(unsigned long slot)
     {
-        for (Entry* entry = m_first; entry; entry = entry->next) {
+        for (Entry* entry = m_first; entry; entry = entry->next)
+        {
             if (entry->slot == slot)
                 return &static_cast<EntryOf<T>*>(entry)->value;
         }
         return nullptr;
     }
-    template <class T>
-    T const* find(unsigned long slot) const
+    template <class T> T const* find(unsigned long slot) const
     {
         return const_cast<OldValues*>(this)->find<T>(slot);
     }
@@ -56,24 +55,21 @@ private:
     struct Entry
     {
         Entry(Entry* following, std::uint32_t ofSlot, void (*releaseThis)(Entry*, bool) noexcept)
-            : next(following)
-            , release(releaseThis)
-            , slot(ofSlot)
-        {
-        }
+            : next(following),
+              release(releaseThis),
+              slot(ofSlot)
+        {}
 
         Entry* next;
         void (*release)(Entry*, bool inPlace) noexcept;
         std::uint32_t slot;
     };
-    template <class T>
-    struct EntryOf : Entry
+    template <class T> struct EntryOf : Entry
     {
         EntryOf(Entry* following, std::uint32_t ofSlot, T&& kept)
-            : Entry(following, ofSlot, &EntryOf::releaseEntry)
-            , value(std::move(kept))
-        {
-        }
+            : Entry(following, ofSlot, &EntryOf::releaseEntry),
+              value(std::move(kept))
+        {}
 
         static void releaseEntry(Entry* entry, bool inPlace) noexcept
         {
@@ -93,12 +89,12 @@ private:
     {
         return static_cast<void const*>(entry) == static_cast<void const*>(m_room);
     }
-    template <class T>
-    Entry* make(unsigned long slot, T&& value)
+    template <class T> Entry* make(unsigned long slot, T&& value)
     {
         using Made = EntryOf<T>;
         auto const number = static_cast<std::uint32_t>(slot);
-        if constexpr (sizeof(Made) <= ROOM && alignof(Made) <= alignof(Entry)) {
+        if constexpr (sizeof(Made) <= ROOM && alignof(Made) <= alignof(Entry))
+        {
             if (!m_first)
                 return new (m_room) Made(nullptr, number, std::move(value));
         }
@@ -106,6 +102,6 @@ private:
     }
 
     Entry* m_first = nullptr;
-    alignas(Entry) std::byte m_room[ROOM]; ///< For the value that was kept first, if it is small.
+    alignas(Entry) std::byte m_room[ROOM];  ///< For the value that was kept first, if it is small.
 };
-} // namespace tarn::kiln::support
+}  // namespace tarn::kiln::support

@@ -9,8 +9,7 @@ namespace tarn::kiln::support {
 class SlotSet
 {
 public:
-    explicit SlotSet(unsigned long size)
-        : m_size(static_cast<std::uint32_t>(size))
+    explicit SlotSet(unsigned long size) : m_size(static_cast<std::uint32_t>(size))
     {
         if (isLarge())
             m_words = new std::uint64_t[wordCount()]();
@@ -40,7 +39,8 @@ public:
     }
     bool any() const
     {
-        for (unsigned long i = 0; i < wordCount(); ++i) {
+        for (unsigned long i = 0; i < wordCount(); ++i)
+        {
             if (words()[i] != 0)
                 return true;
         }
@@ -57,8 +57,8 @@ private:
     union
     {
         std::uint64_t m_word;
-        std::uint64_t* m_words; ///< Owned; of a large set.
+        std::uint64_t* m_words;  ///< Owned; of a large set.
     };
     std::uint32_t m_size;
 };
-} // namespace tarn::kiln::support
+}  // namespace tarn::kiln::support
