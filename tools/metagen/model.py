@@ -228,8 +228,9 @@ class Property:
 
     @property
     def slot_definition(self):
-        parts = [f".index = {self.index}"]
-        if self.composite:
+        parts = [f".index = {self.index if self.stored else 'ModelElement::Impl::NO_INDEX'}"]
+        # What is computed contains nothing, whatever its property says.
+        if self.composite and self.stored:
             parts.append(".composite = true")
         if self.many:
             parts.append(".single = false")
@@ -245,6 +246,11 @@ class Property:
     def element(self):
         """The function that gives the metamodel's element; the meta package declares it."""
         return f"propertyOf<rows::properties::{self.owner.name}{capital(self.name)}>"
+
+    def computed_row(self, end):
+        """Its row in the table of what can only be read; `end` closes the line."""
+        return fill("        support::Computed<", [f"&Impl::{self.getter}", self.constant],
+                    ">" + end, 12)
 
     def row(self, end):
         """Its row in the table of the class; `end` closes the line."""
@@ -429,6 +435,15 @@ class Class:
     @property
     def stored(self):
         return [p for p in self.properties if p.stored]
+
+    @property
+    def computed(self):
+        """The derived properties that reflection can read."""
+        return [p for p in self.properties if not p.stored and "code" in p.cpp]
+
+    @property
+    def slotted(self):
+        return self.stored + self.computed
 
     @property
     def base(self):

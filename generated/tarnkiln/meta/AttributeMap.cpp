@@ -14,6 +14,9 @@ constinit Slot const AttributeMap::Impl::ATTRIBUTES{
     .index = 1, .composite = true, .single = false, .keyed = true,
     .opposite = &Attribute::Impl::OWNER,
     .property = propertyOf<rows::properties::AttributeMapAttributes>};
+constinit Slot const AttributeMap::Impl::OWNER{
+    .index = ModelElement::Impl::NO_INDEX,
+    .property = propertyOf<rows::properties::AttributeMapOwner>};
 
 AttributeMap AttributeMap::cast(ModelElement const& element)
 {

@@ -32,6 +32,7 @@ public:
 
     static constexpr unsigned long SLOTS = 2;
     static Slot const ATTRIBUTES;
+    static Slot const OWNER;
 
     Impl(Model const& model, UUID const& id);
     /// With what a builder was given.
@@ -95,6 +96,8 @@ public:
     using Rows = support::RowList<
         support::References<
             &Impl::m_attributes, ATTRIBUTES, &Impl::makeAttributes, &Impl::getAttributes>>;
+    using ComputedRows = support::RowList<
+        support::Computed<&Impl::getOwner, OWNER>>;
 };
 
 inline AttributeMap::AttributeMap(Impl* impl) : ModelElement(impl) {}

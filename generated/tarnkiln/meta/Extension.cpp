@@ -15,6 +15,9 @@ namespace tarn::kiln::meta {
 constinit Slot const Extension::Impl::OWNER{
     .index = 26, .opposite = &DynamicExtensions::Impl::EXTENSIONS,
     .property = propertyOf<rows::properties::ExtensionOwner>};
+constinit Slot const Extension::Impl::EXTENDED_METACLASS{
+    .index = ModelElement::Impl::NO_INDEX,
+    .property = propertyOf<rows::properties::ExtensionExtendedMetaclass>};
 
 Extension Extension::cast(ModelElement const& element)
 {

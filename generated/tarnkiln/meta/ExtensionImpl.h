@@ -30,6 +30,7 @@ public:
 
     static constexpr unsigned long SLOTS = 27;
     static Slot const OWNER;
+    static Slot const EXTENDED_METACLASS;
 
     Impl(Model const& model, UUID const& id);
     /// With what a builder was given.
@@ -61,6 +62,8 @@ private:
 public:
     using Rows = support::RowList<
         support::Container<DynamicExtensions, OWNER, &Impl::setOwner>>;
+    using ComputedRows = support::RowList<
+        support::Computed<&Impl::getExtendedMetaclass, EXTENDED_METACLASS>>;
 };
 
 inline Extension::Extension(Impl* impl) : Property(impl) {}

@@ -30,6 +30,21 @@ constinit Slot const Package::Impl::IMPORTED_PACKAGE_URIS{
     .property = propertyOf<rows::properties::PackageImportedPackageURIs>};
 constinit Slot const Package::Impl::DEFAULT_VOBJ_CATEGORY{
     .index = 7, .property = propertyOf<rows::properties::PackageDefaultVobjCategory>};
+constinit Slot const Package::Impl::QUALIFIED_NAME{
+    .index = ModelElement::Impl::NO_INDEX,
+    .property = propertyOf<rows::properties::PackageQualifiedName>};
+constinit Slot const Package::Impl::ENUMERATIONS{
+    .index = ModelElement::Impl::NO_INDEX, .single = false,
+    .property = propertyOf<rows::properties::PackageEnumerations>};
+constinit Slot const Package::Impl::CLASSES{
+    .index = ModelElement::Impl::NO_INDEX, .single = false,
+    .property = propertyOf<rows::properties::PackageClasses>};
+constinit Slot const Package::Impl::DATA_TYPES{
+    .index = ModelElement::Impl::NO_INDEX, .single = false,
+    .property = propertyOf<rows::properties::PackageDataTypes>};
+constinit Slot const Package::Impl::PRIMITIVE_TYPES{
+    .index = ModelElement::Impl::NO_INDEX, .single = false,
+    .property = propertyOf<rows::properties::PackagePrimitiveTypes>};
 
 Package Package::cast(ModelElement const& element)
 {

@@ -4,8 +4,13 @@
 #pragma once
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/collections/PrimitiveSequence.h"
+#include "tarnkiln/collections/SubsettedElementSet.h"
+#include "tarnkiln/meta/Class.h"
+#include "tarnkiln/meta/DataType.h"
+#include "tarnkiln/meta/Enum.h"
 #include "tarnkiln/meta/NamedElementImpl.h"
 #include "tarnkiln/meta/Package.h"
+#include "tarnkiln/meta/PrimitiveType.h"
 #include "tarnkiln/meta/Type.h"
 #include "tarnkiln/support/Dispatch.h"
 
@@ -39,6 +44,11 @@ public:
     static Slot const PARENT_PACKAGE;
     static Slot const IMPORTED_PACKAGE_URIS;
     static Slot const DEFAULT_VOBJ_CATEGORY;
+    static Slot const QUALIFIED_NAME;
+    static Slot const ENUMERATIONS;
+    static Slot const CLASSES;
+    static Slot const DATA_TYPES;
+    static Slot const PRIMITIVE_TYPES;
 
     Impl(Model const& model, UUID const& id);
     /// With what a builder was given.
@@ -81,6 +91,18 @@ public:
     boost::optional<string> const& getDefaultVobjCategory() const { return m_defaultVobjCategory; }
     void setDefaultVobjCategory(boost::optional<string> const& defaultVobjCategory);
 
+    /// The enumerations among the types, by name; a view, which can only be read.
+    SubsettedElementSet<Enum>& getEnumerations() const;
+
+    /// The classes among the types, by name; a view, which can only be read.
+    SubsettedElementSet<Class>& getClasses() const;
+
+    /// The data types among the types, by name; a view, which can only be read.
+    SubsettedElementSet<DataType>& getDataTypes() const;
+
+    /// The primitive types among the types, by name; a view, which can only be read.
+    SubsettedElementSet<PrimitiveType>& getPrimitiveTypes() const;
+
     /// Gives it another name, under which the owner then keeps it.
     ///
     /// \throws tarnkiln::messages::UniquenessConstraint  if the owner has another such name.
@@ -99,6 +121,10 @@ private:
     ustring m_uri;
     mutable support::LazyCollection<PrimitiveSequence<ustring>> m_importedPackageURIs;
     boost::optional<string> m_defaultVobjCategory;
+    mutable support::LazyCollection<SubsettedElementSet<Enum>> m_enumerations;
+    mutable support::LazyCollection<SubsettedElementSet<Class>> m_classes;
+    mutable support::LazyCollection<SubsettedElementSet<DataType>> m_dataTypes;
+    mutable support::LazyCollection<SubsettedElementSet<PrimitiveType>> m_primitiveTypes;
 
 public:
     using Rows = support::RowList<
@@ -114,6 +140,12 @@ public:
             &Impl::getImportedPackageURIs>,
         support::Optional<
             &Impl::m_defaultVobjCategory, DEFAULT_VOBJ_CATEGORY, &Impl::setDefaultVobjCategory>>;
+    using ComputedRows = support::RowList<
+        support::Computed<&Impl::getQualifiedName, QUALIFIED_NAME>,
+        support::Computed<&Impl::getEnumerations, ENUMERATIONS>,
+        support::Computed<&Impl::getClasses, CLASSES>,
+        support::Computed<&Impl::getDataTypes, DATA_TYPES>,
+        support::Computed<&Impl::getPrimitiveTypes, PRIMITIVE_TYPES>>;
 };
 
 inline Package::Package(Impl* impl) : NamedElement(impl) {}

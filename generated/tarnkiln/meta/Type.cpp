@@ -17,6 +17,9 @@ constinit Slot const Type::Impl::IS_VOBJ_HIDDEN{
 constinit Slot const Type::Impl::OWNING_PACKAGE{
     .index = 3, .opposite = &Package::Impl::OWNED_TYPES,
     .property = propertyOf<rows::properties::TypeOwningPackage>};
+constinit Slot const Type::Impl::QUALIFIED_NAME{
+    .index = ModelElement::Impl::NO_INDEX,
+    .property = propertyOf<rows::properties::TypeQualifiedName>};
 
 Type Type::cast(ModelElement const& element)
 {

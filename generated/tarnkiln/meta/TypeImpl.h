@@ -29,6 +29,7 @@ public:
     static constexpr unsigned long SLOTS = 4;
     static Slot const IS_VOBJ_HIDDEN;
     static Slot const OWNING_PACKAGE;
+    static Slot const QUALIFIED_NAME;
 
     Impl(Model const& model, UUID const& id);
     /// With what a builder was given.
@@ -71,6 +72,8 @@ public:
     using Rows = support::RowList<
         support::Scalar<&Impl::m_isVobjHidden, IS_VOBJ_HIDDEN, &Impl::setIsVobjHidden>,
         support::Container<Package, OWNING_PACKAGE, &Impl::setOwningPackage>>;
+    using ComputedRows = support::RowList<
+        support::Computed<&Impl::getQualifiedName, QUALIFIED_NAME>>;
 };
 
 inline Type::Type(Impl* impl) : NamedElement(impl) {}

@@ -39,7 +39,7 @@ public:
     AbstractOwnedCollection& operator=(AbstractOwnedCollection const&) = delete;
     virtual ~AbstractOwnedCollection();
 
-    /// The type of the entries; empty while its metamodel is not built.
+    /// The type of the entries; empty while its metamodel is being built.
     virtual meta::Type getCollectionType() const = 0;
     /// Replaces the contents by those of `other`, which must be of the same class.
     virtual void copyContents(AbstractOwnedCollection const& other) = 0;
@@ -51,7 +51,7 @@ public:
     virtual void basicDropContents() noexcept = 0;
     /// @}
 
-    /// Empty for a snapshot without one and while the metamodel is not built.
+    /// Empty for a snapshot without one and while the metamodel is being built.
     meta::Property const& getCollectionProperty() const;
     Feature const& getCollectionFeature() const { return m_feature; }
     /// Null for a snapshot.

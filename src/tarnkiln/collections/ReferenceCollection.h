@@ -39,7 +39,7 @@ public:
 
     /// \name Element class
     /// @{
-    /// The class that entries must have; empty while its metamodel is not built.
+    /// The class that entries must have; empty while its metamodel is being built.
     virtual meta::Class const& getElementClass() const = 0;
     /// Whether the class of `element`, which must not be null, suits.
     virtual bool acceptsElement(ModelElement const& element) const = 0;

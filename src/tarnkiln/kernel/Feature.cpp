@@ -35,6 +35,9 @@ bool Feature::operator==(Feature const& other) const
 {
     if (m_bits == other.m_bits)
         return true;
+    // Each property has one slot, so two slots are two properties.
+    if (slot() && other.slot())
+        return false;
     meta::Property::Impl const* const mine = propertyImpl();
     return mine && mine == other.propertyImpl();
 }

@@ -13,12 +13,12 @@ namespace tarn::kiln {
 /// that may itself be under construction. One constant for each property.
 struct Slot
 {
-    unsigned long index;                                ///< `propertyIndex`; from 1.
+    unsigned long index;                                ///< `propertyIndex`; from 1. Or `NO_INDEX`.
     bool composite = false;
     bool single = true;                                 ///< Upper bound 1.
     bool keyed = false;                                 ///< A collection by a qualifying property.
     Slot const* opposite = nullptr;                     ///< The other end; null if there is none.
-    meta::Property const& (*property)() = nullptr;      ///< Empty while its metamodel is not built.
+    meta::Property const& (*property)() = nullptr;      ///< Empty while its metamodel is being built.
 };
 
 /// One property, given by its metamodel element or by a generated `Slot`; or none.
@@ -45,7 +45,7 @@ public:
     bool isSingle() const;                              ///< Upper bound 1.
     bool isKeyed() const;                               ///< Has a live qualifying property.
     Feature opposite() const;                           ///< None, if it has no live opposite.
-    /// The metamodel element; empty for a slot whose metamodel is not built.
+    /// The metamodel element; empty for a slot whose metamodel is being built.
     meta::Property property() const;
     meta::Property::Impl* propertyImpl() const;
     /// Null unless given by a slot.

@@ -11,7 +11,8 @@ namespace tarn::kiln::support {
 ///
 /// `Derived`, the class, supplies
 ///
-/// - `Rows`, the `RowList` of its own properties,
+/// - `Rows`, the `RowList` of its own properties that are stored,
+/// - `ComputedRows`, that of the others, if it has any,
 /// - `Handle`, its handle, and `SLOTS`, the highest index of its properties plus one,
 /// - `Storage`, its `Record`.
 ///

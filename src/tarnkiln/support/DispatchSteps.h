@@ -38,6 +38,23 @@ template <class Rows, class Step> bool atProperty(meta::Property const& property
     return atRow<Rows>(property, [&](auto steps, auto /*row*/) { step(steps); });
 }
 
+template <class Class> struct ComputedRowsOf
+{
+    using Type = RowList<>;
+};
+template <class Class> requires requires { typename Class::ComputedRows; }
+struct ComputedRowsOf<Class>
+{
+    using Type = typename Class::ComputedRows;
+};
+
+/// Calls `step(steps)` for the row of `property`, be it stored or computed; false if there is none.
+template <class Class, class Step> bool atReadable(meta::Property const& property, Step step)
+{
+    return atProperty<typename Class::Rows>(property, step) ||
+           atProperty<typename ComputedRowsOf<Class>::Type>(property, step);
+}
+
 /// Whether `tag` allows to read `property`.
 inline bool mayRead(meta::Property const& property, internal::ReflectionPrivateTag const& tag)
 {
@@ -109,7 +126,7 @@ bool Dispatched<Derived, Base>::hasPropertyValue(meta::Property const& property,
 {
     bool has = false;
     if (mayRead(property, tag) &&
-        atProperty<typename Derived::Rows>(property, [&](auto row) { has = row.has(self()); }))
+        atReadable<Derived>(property, [&](auto row) { has = row.has(self()); }))
         return has;
     return Base::hasPropertyValue(property, tag);
 }
@@ -120,8 +137,8 @@ Value Dispatched<Derived, Base>::getPropertyValue(meta::Property const& property
 {
     boost::optional<Value> value;
     if (mayRead(property, tag))
-        atProperty<typename Derived::Rows>(
-            property, [&](auto row) { value = row.get(self(), property, tag); });
+        atReadable<Derived>(property,
+                            [&](auto row) { value = row.get(self(), property, tag); });
     return value ? *value : Base::getPropertyValue(property, tag);
 }
 

@@ -530,6 +530,32 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
     }
 };
 
+template <auto GETTER, Slot const& SLOT> struct Steps<Computed<GETTER, SLOT>> : NoSteps<SLOT>
+{
+    template <class Owner> static bool has(Owner const& element)
+    {
+        using Result = decltype((element.*GETTER)());
+        if constexpr (std::is_base_of_v<ReferenceCollection, std::remove_cvref_t<Result>>)
+            return (element.*GETTER)().size() > 0;
+        else if constexpr (std::is_base_of_v<ModelElement, Result>)
+            return static_cast<bool>((element.*GETTER)());
+        else
+            return true;
+    }
+    template <class Owner>
+    static Value get(Owner const& element, meta::Property const& property,
+                     internal::ReflectionPrivateTag const& /*tag*/)
+    {
+        using Result = decltype((element.*GETTER)());
+        if constexpr (std::is_base_of_v<ReferenceCollection, std::remove_cvref_t<Result>>)
+            return Value::createCollectionValue(property, &(element.*GETTER)());
+        else if constexpr (std::is_base_of_v<ModelElement, Result>)
+            return Value::createElementValue(property, (element.*GETTER)());
+        else
+            return Value::createPrimitiveValue(property, (element.*GETTER)());
+    }
+};
+
 template <auto FIELD, Slot const& SLOT, auto MAKE, auto GETTER>
 struct Steps<Values<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
 {

@@ -75,6 +75,14 @@ template <auto FIELD, Slot const& SLOT, auto MAKE, auto GETTER> struct Values
     using Old = std::unique_ptr<typename FieldType<FIELD>::Made>;
 };
 
+/// A derived property, which `GETTER` computes: a plain value, an element, or a view of elements.
+/// It has no field and no number, and can only be read. Such rows stand in a list of their own,
+/// `ComputedRows`.
+template <auto GETTER, Slot const& SLOT> struct Computed
+{
+    using Old = NoOldValue;
+};
+
 template <class... Rows> struct RowList
 {
     /// Whether `step(row)` is true for a row; asks no further ones.
