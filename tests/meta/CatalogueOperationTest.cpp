@@ -86,6 +86,29 @@ protected:
     AttributeMap const m_map = AttributeMap::create(m_model);
 };
 
+TEST_F(CatalogueOperations, AllHaveAnInvokerButTheOneThatInstantiates)
+{
+    std::multiset<ustring> without;
+    std::size_t all = 0;
+    for (auto const& [name, type] : Class::metaClass()->getOwningPackage()->getOwnedTypes())
+    {
+        Class const owner = Class::cast(type);
+        if (!owner)
+            continue;
+        for (auto const& [operationName, found] : owner->getOwnedOperations())
+        {
+            ++all;
+            if (!found->getInvoker())
+                without.insert(name + u"." + operationName);
+            else
+                EXPECT_EQ(found->getInvoker()->getOperation(), found);
+        }
+    }
+
+    EXPECT_EQ(all, 20u);
+    EXPECT_THAT(without, ElementsAre(u"Class.instantiate"));
+}
+
 TEST_F(CatalogueOperations, TakeAsManyArgumentsAsTheyDeclare)
 {
     Class const element = cls(u"Book");
@@ -326,6 +349,28 @@ TEST_F(CatalogueOperations, CompareTypes)
     EXPECT_FALSE(call(book, u"isA", {reference(Type(novel))})->getValue<bool>());
     EXPECT_TRUE(call(novel, u"isATypeOf", {reference(title)})->getValue<bool>());
     EXPECT_FALSE(call(novel, u"isATypeOf", {reference(Property())})->getValue<bool>());
+}
+
+TEST_F(CatalogueOperations, TellDynamicDefaults)
+{
+    tarnkiln::tests::RegistryElement<Property> const id(u"id");
+    auto const isDynamic = [&] { return call(id.get(), u"isDynamicDefault")->getValue<bool>(); };
+    auto const change = [&](Type const& type, ustring const& text) {
+        tarnkiln::tests::RegistrySession session;
+        id->setType(type);
+        id->setDefaultValue(text);
+        session.commit();
+    };
+
+    EXPECT_FALSE(isDynamic());
+    change(StandardTypes::uuidMeta, u"random");
+    EXPECT_TRUE(isDynamic());
+    change(StandardTypes::uuidMeta, u"now");
+    EXPECT_FALSE(isDynamic());
+    change(StandardTypes::dateTimeMeta, u"now");
+    EXPECT_TRUE(isDynamic());
+    change(StandardTypes::stringMeta, u"now");
+    EXPECT_FALSE(isDynamic());
 }
 
 TEST_F(CatalogueOperations, AreNotForElementsOfOtherClasses)
