@@ -11,7 +11,7 @@ using tarn::kiln::support::OldValues;
 
 TEST(OldValuesOfSlots, AreAbsentAtFirst)
 {
-    OldValues const values;
+    OldValues const values{};
 
     EXPECT_EQ(nullptr, values.find<int>(0));
     EXPECT_EQ(nullptr, values.find<int>(7));

@@ -462,15 +462,20 @@ TEST_F(ValueOfACollection, MayBeAMapOfTexts)
         u"StringToStringMap");
 }
 
-TEST_F(ValueOfACollection, OfTextsMustBeSingleAndOfThatType)
+TEST_F(ValueOfACollection, IsSingleForAnOptionalMapOfTexts)
 {
     meta::Property const optional = makeProperty(StandardTypes::stringToStringMapMeta, 0, 1);
     StringToStringMap map(nullptr, Feature(optional));
+    Value const value = Value::createCollectionValue(optional, &map);
+
+    EXPECT_EQ(ValueFlags::Single, value.getFlags());
+    EXPECT_EQ(&map, &value.getValue<StringToStringMap&>());
+}
+
+TEST_F(ValueOfACollection, OfTextsMustBeOfThatType)
+{
     Value const text(StandardTypes::stringMeta, ustring(u"x"));
 
-    EXPECT_RAISES_WITH(messages::CannotCastIncompatibleTypes,
-                       Value::createCollectionValue(optional, &map).getValue<StringToStringMap&>(),
-                       u"StringToStringMap");
     EXPECT_RAISES_WITH(messages::CannotCastIncompatibleTypes, text.getValue<StringToStringMap&>(),
                        u"String");
     EXPECT_RAISES_WITH(messages::CannotCastIncompatibleTypes,

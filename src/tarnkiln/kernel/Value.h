@@ -76,7 +76,8 @@ public:
     /// \throws tarnkiln::messages::NoSuchType  (qualified name) if one is required of a type that is
     ///     empty or dead.
     static Value createReflectiveDataTypeValue(meta::DataType const& type, bool required);
-    /// A value that shares `collection`, an element's value of `property`. Null is none.
+    /// A value that shares `collection`, an element's value of `property`. Null is none. For a
+    /// property with one value, a map of texts, the shape is `Single`, be it optional or not.
     static Value createCollectionValue(meta::Property const& property,
                                        AbstractOwnedCollection* collection);
     /// The value of a property that has none.
