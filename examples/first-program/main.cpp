@@ -1,11 +1,15 @@
-#include "model/PackageImpl.h"
-#include "model/PackageIndexImpl.h"
 #include "tarnkiln/kernel/ListenerHolder.h"
-#include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/kernel/ModelConstellation.h"
+#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/Text.h"
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/meta/PackageDefinition.h"
+#include "tarnkiln/meta/StandardTypes.h"
 
 #include <iostream>
 
-using namespace debian::model;
+using namespace tarn::kiln;
+using meta::StandardTypes;
 
 struct Watcher : Listener
 {
@@ -17,21 +21,27 @@ struct Watcher : Listener
 
 int main()
 {
+    meta::PackageDefinition library(u"library", u"http://example.org/library");
+    meta::ClassDefinition book = library.defineClass(u"Book");
+    meta::Property const title = book.attribute(u"title", StandardTypes::stringMeta);
+    library.finish();
+
     Model const model = Model::create(ModelConstellation());
     Watcher watcher;
     model->addListener(&watcher);
 
+    auto const& access = ModelElement::Impl::PUBLIC_ACCESS;
     Transaction const transaction = model->beginTransaction(/*revertible=*/true);
-    PackageIndex const index = PackageIndex::create(model);
-    Package const bash = Package::create(model);
-    bash->setName(u"bash");
-    bash->setIndex(index);  // index->getPackages() holds it now, under its name
-    transaction.commit();   // the watcher is told
+    ModelElement const emma = ModelElement::createReflective(model, book);
+    emma->setPropertyValue(title, Value(StandardTypes::stringMeta, ustring(u"Emma")), access);
+    transaction.commit();  // the watcher is told
 
     {
         Transaction const dropped = model->beginTransaction(/*revertible=*/true);
-        bash->destroy();
+        emma->destroy();
     }  // not committed, so taken back
-    std::cout << (index->getPackages().find(u"bash") ? "bash is there\n" : "bash is gone\n");
+    std::cout << (emma ? toUtf8(emma->getPropertyValue(title, access).getValue<ustring>())
+                       : "nothing")
+              << " is there\n";
     model->removeListener(&watcher);
 }
