@@ -134,5 +134,44 @@ TEST(PackageDefinition, RefusesANameThatIsTaken)
     EXPECT_RAISES(tarnkiln::messages::UniquenessConstraint,
                   book.attribute(u"title", StandardTypes::integerMeta));
 }
+
+TEST(PackageDefinition, SaysWhatElseAPropertyIs)
+{
+    PackageDefinition definition(u"seventh", freshUri());
+    ClassDefinition book = definition.defineClass(u"Book").makeAbstract();
+    Property const isbn = book.attribute(u"isbn", StandardTypes::stringMeta).setOnce();
+    Property const age = book.attribute(u"age", StandardTypes::integerMeta).readOnly().transient();
+    Property const next = book.reference(u"next", book).sequence().unique();
+    definition.finish();
+
+    EXPECT_TRUE(Class(book)->isAbstract());
+    EXPECT_TRUE(isbn->isReadOnly());
+    EXPECT_TRUE(isbn->isSetOnce());
+    EXPECT_TRUE(age->isReadOnly());
+    EXPECT_FALSE(age->isSetOnce());
+    EXPECT_TRUE(age->isTransient());
+    EXPECT_TRUE(next->isOrdered());
+    EXPECT_TRUE(next->isUnique());
+}
+
+TEST(PackageDefinition, LeavesNothingIfATypeOfItsNameIsRegistered)
+{
+    PackageDefinition first(u"eighth", freshUri());
+    Class const book = first.defineClass(u"Book");
+    first.finish();
+    ustring const uri = freshUri();
+    std::size_t const before = MetaRegistry::getInstance().getModel()->getElementCount();
+
+    {
+        PackageDefinition second(u"eighth", uri);
+        second.defineClass(u"Book");
+        EXPECT_RAISES_WITH(tarnkiln::messages::DuplicateTypeInRegistry, second.finish(),
+                           u"eighth.Book");
+    }
+
+    EXPECT_EQ(book, MetaRegistry::getInstance().getClass(u"eighth.Book"));
+    EXPECT_FALSE(MetaRegistry::getInstance().getRootPackage(uri));
+    EXPECT_EQ(before, MetaRegistry::getInstance().getModel()->getElementCount());
+}
 }  // namespace
 }  // namespace tarn::kiln::meta

@@ -35,7 +35,7 @@ int highestSlot(Class const& type)
 }  // namespace
 
 PackageDefinition::PackageDefinition(ustring const& name, ustring const& uri)
-    : m_registry((Package::metaClass(), MetaRegistry::getInstance())),
+    : m_registry(MetaRegistry::getInstance()),
       m_locked(std::in_place, m_registry),
       m_transaction(m_locked->getModel()->beginTransaction(/*revertible=*/true)),
       m_package(
