@@ -44,6 +44,19 @@ protected:
     meta::Property const core = metamodel.property(node, u"core", node).composite();
 };
 
+TEST_F(ReflectiveRecord, TellsMovingFromCreationForAClassWithoutProperties)
+{
+    meta::Class const bare = metamodel.makeClass(u"Bare");
+    meta::Property const things = metamodel.property(node, u"things", bare).many().composite();
+    ModelElement const thing = make(bare), x = make(node);
+
+    rolledBack([&] { genericOf(x, things).genericAdd(thing); });
+
+    EXPECT_TRUE(static_cast<bool>(thing));
+    EXPECT_TRUE(thing->isTopLevel());
+    EXPECT_THAT(entriesOf(x, things), IsEmpty());
+}
+
 TEST_F(ReflectiveRecord, HasTheValuesFromBeforeTheFirstChange)
 {
     ModelElement const x = make(node), y = make(node), z = make(node);

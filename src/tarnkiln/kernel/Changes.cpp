@@ -9,24 +9,34 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StructuredType.h"
 
+#include <algorithm>
+
 namespace tarn::kiln {
+
+namespace {
+
+/// A bit for each slot and two more. The bit of slot 0, which no property has, tells of creation
+/// and must be there also when the class has no property at all.
+unsigned long sizeFor(unsigned long count)
+{
+    return std::max(count, 1UL) + 2;
+}
+}  // namespace
 
 ModelElement::Impl::Changes::Changes(UUID const& id, Model const& model,
                                      meta::Class const& metaClass, unsigned long count)
-    : m_id(id)
-    , m_model(model.getImpl())
-    , m_metaClass(metaClass)
-    , m_modified(count + 2)
-{
-}
+    : m_id(id),
+      m_model(model.getImpl()),
+      m_metaClass(metaClass),
+      m_modified(sizeFor(count))
+{}
 
 ModelElement::Impl::Changes::Changes(ModelElement::Impl const& element, unsigned long count)
-    : m_id(element.getUuid())
-    , m_model(element.getModelImpl())
-    , m_metaClass(element.getMetaClass())
-    , m_modified(count + 2)
-{
-}
+    : m_id(element.getUuid()),
+      m_model(element.getModelImpl()),
+      m_metaClass(element.getMetaClass()),
+      m_modified(sizeFor(count))
+{}
 
 ModelElement::Impl::Changes::~Changes()
 {
@@ -70,16 +80,18 @@ bool ModelElement::Impl::Changes::setModified(unsigned long index)
 
 bool ModelElement::Impl::Changes::isChanged(meta::Property const& property) const
 {
-    return property && m_metaClass && m_metaClass->isATypeOf(property)
-           && isSlotChanged(static_cast<unsigned long>(property->getPropertyIndex()));
+    return property && m_metaClass && m_metaClass->isATypeOf(property) &&
+           isSlotChanged(static_cast<unsigned long>(property->getPropertyIndex()));
 }
 
 std::vector<meta::Property> ModelElement::Impl::Changes::getChangedProperties() const
 {
     std::vector<meta::Property> result;
     result.reserve(slots());
-    for (meta::Class type = m_metaClass; type; type = type->getSuperclass()) {
-        for (auto const& [name, property] : type->getOwnedAttributes()) {
+    for (meta::Class type = m_metaClass; type; type = type->getSuperclass())
+    {
+        for (auto const& [name, property] : type->getOwnedAttributes())
+        {
             if (property && isSlotChanged(static_cast<unsigned long>(property->getPropertyIndex())))
                 result.push_back(property);
         }
@@ -104,8 +116,8 @@ void ModelElement::Impl::Storage::setOldContainer(ModelElement const& container,
 
 bool ModelElement::Impl::Storage::revertUnchanged(ModelElement::Impl* element)
 {
-    if (isContainerChanged() && element->basicContainer() == getOldContainer().getImpl()
-        && element->getContainment() == getOldContainment())
+    if (isContainerChanged() && element->basicContainer() == getOldContainer().getImpl() &&
+        element->getContainment() == getOldContainment())
         setContainerChanged(false);
     return anyChanged();
 }
@@ -131,7 +143,7 @@ Feature ModelElement::Impl::Storage::getOldContainment() const
 Value ModelElement::Impl::Storage::getOldValue(meta::Property const& property,
                                                ReflectionPrivateTag const&) const
 {
-    reportException(tarnkiln::messages::NoSuchProperty(
-        property ? property->getName() : ustring(), internal::qualifiedName(getMetaClass())));
+    reportException(tarnkiln::messages::NoSuchProperty(property ? property->getName() : ustring(),
+                                                       internal::qualifiedName(getMetaClass())));
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln
