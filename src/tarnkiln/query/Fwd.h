@@ -1,0 +1,13 @@
+/// \file
+/// The names of this folder.
+#pragma once
+
+namespace tarn::kiln::query {
+class AbstractQuery;
+class NativeTarnkilnQuery;
+class ReflectiveQuery;
+class RetargetableQuery;
+class ValueComparatorRegistry;
+enum class SearchClassMatchMode : int;
+enum class ValueMatchRelation : int;
+}  // namespace tarn::kiln::query

@@ -1,0 +1,23 @@
+/// \file
+/// The cursor over the rows of a native query.
+#pragma once
+#include "tarnkiln/query/NativeTarnkilnQuery.h"
+#include "tarnkiln/query/internal/NativeResultSet.h"
+
+#include <cstddef>
+
+namespace tarn::kiln::query {
+
+class NativeTarnkilnQuery::NativeResultIterator final : public ReflectiveQuery::ResultIterator
+{
+public:
+    explicit NativeResultIterator(internal::NativeResultSet rows);
+    ~NativeResultIterator() override;
+
+    bool next(std::vector<ModelElement>& row) override;
+
+private:
+    internal::NativeResultSet const m_rows;
+    std::size_t m_next = 0;
+};
+}  // namespace tarn::kiln::query

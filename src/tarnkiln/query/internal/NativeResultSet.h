@@ -1,0 +1,33 @@
+/// \file
+/// The rows of a finished run.
+#pragma once
+#include "tarnkiln/kernel/ModelElement.h"
+
+#include <cstddef>
+#include <vector>
+
+namespace tarn::kiln::internal {
+
+/// A table of elements, row after row in one block.
+class NativeResultSet
+{
+public:
+    /// \param instances  the search instances of the query.
+    /// \param width      the columns of a row; not 0.
+    NativeResultSet(std::size_t instances, std::size_t width);
+
+    void reserve(std::size_t rows) { m_cells.reserve(rows * m_width); }
+    /// Rows are given cell by cell.
+    void addCell(ModelElement const& element) { m_cells.push_back(element); }
+
+    std::size_t getInstanceCount() const { return m_instances; }
+    std::size_t getRowCount() const { return m_cells.size() / m_width; }
+    /// Assigns the row to `row`.
+    void getRow(std::size_t number, std::vector<ModelElement>& row) const;
+
+private:
+    std::size_t m_instances;
+    std::size_t m_width;
+    std::vector<ModelElement> m_cells;
+};
+}  // namespace tarn::kiln::internal
