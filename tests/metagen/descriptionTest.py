@@ -254,6 +254,10 @@ class Names(Folder):
         self.novel["name"] = "Value"
         self.refuse("/classes/2/name", "Value means something else in generated code")
 
+    def test_of_types_are_not_those_of_primitive_types(self):
+        self.novel["name"] = "String"
+        self.refuse("/classes/2/name", "String is a primitive type")
+
     def test_of_properties_hide_nothing(self):
         self.title["name"] = "uuid"
         self.books["qualifiedBy"] = "uuid"

@@ -83,6 +83,8 @@ class Rules:
             for place, entry in self.each(f"/{kind}", self.facts[kind]):
                 self.check_word(f"{place}/name", entry["name"], words.LIBRARY)
                 self.check_once(f"{place}/name", entry["name"], seen, "a type")
+                if entry["name"] in self.carried:
+                    self.refuse(f"{place}/name", f"{entry['name']} is a primitive type")
 
     def check_once(self, place, name, seen, kind):
         if name in seen:

@@ -3,10 +3,14 @@
 #include <boost/random/mersenne_twister.hpp>
 #include <boost/random/uniform_int_distribution.hpp>
 
+#include <algorithm>
 #include <array>
+#include <cerrno>
 #include <cstdint>
-#include <random>
+#include <system_error>
 #include <vector>
+
+#include <unistd.h>
 
 namespace tarn::kiln {
 
@@ -24,25 +28,30 @@ struct Deletions
 
 thread_local Deletions deletions;
 
+/// All of the state from the system's source of randomness. `std::random_device` would ask the
+/// processor for each word, which takes milliseconds on a virtual machine, and that in each thread.
 boost::random::mt19937 seededGenerator()
 {
-    std::random_device device; // Boost's would be the one thing for which we need its library
     std::array<std::uint32_t, boost::random::mt19937::state_size> words;
-    for (std::uint32_t& word : words)
-        word = device();
+    constexpr std::size_t AT_ONCE = 64;  // no call may ask for more than 256 bytes
+    for (std::size_t at = 0; at < words.size(); at += AT_ONCE)
+    {
+        std::size_t const count = std::min(AT_ONCE, words.size() - at);
+        if (getentropy(&words[at], count * sizeof(std::uint32_t)) != 0)
+            throw std::system_error(errno, std::generic_category(), "no seed for new UUIDs");
+    }
     auto first = words.begin();
     return boost::random::mt19937(first, words.end());
 }
 
-} // namespace
+}  // namespace
 
 ElementImpl::InvalidateCallback ElementImpl::m_callback = nullptr;
 
 ElementImpl::ElementImpl(UUID const& id, ElementValidity validity)
-    : m_uuid(id.is_nil() ? generateNewUuid() : id)
-    , m_validity(validity)
-{
-}
+    : m_uuid(id.is_nil() ? generateNewUuid() : id),
+      m_validity(validity)
+{}
 
 ElementImpl::~ElementImpl() = default;
 
@@ -54,14 +63,17 @@ void ElementImpl::removeRef()
 
 void ElementImpl::deleteThis()
 {
-    if (deletions.depth == MAX_DELETION_DEPTH) {
+    if (deletions.depth == MAX_DELETION_DEPTH)
+    {
         deletions.waiting.push_back(this);
         return;
     }
     ++deletions.depth;
     delete this;
-    if (deletions.depth == 1) {
-        while (!deletions.waiting.empty()) {
+    if (deletions.depth == 1)
+    {
+        while (!deletions.waiting.empty())
+        {
             ElementImpl* const next = deletions.waiting.back();
             deletions.waiting.pop_back();
             delete next;
@@ -89,7 +101,8 @@ UUID ElementImpl::generateNewUuid()
     boost::random::uniform_int_distribution<std::uint64_t> anyWord;
 
     UUID result;
-    for (int half = 0; half < 2; ++half) {
+    for (int half = 0; half < 2; ++half)
+    {
         std::uint64_t word = anyWord(generator);
         for (int byte = 0; byte < 8; ++byte, word >>= 8)
             result.data[half * 8 + byte] = static_cast<std::uint8_t>(word);
@@ -98,4 +111,4 @@ UUID ElementImpl::generateNewUuid()
     result.data[6] = static_cast<std::uint8_t>((result.data[6] & 0x0F) | 0x40);
     return result;
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln
