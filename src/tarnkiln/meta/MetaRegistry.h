@@ -82,6 +82,11 @@ public:
     void registerType(Type const& type, CollectionInstantiator collection,
                       BuilderInstantiator builder);
     void registerType(Type const& type, BuilderInstantiator builder);
+    /// Enters a class that has no generated code, under its qualified name. Its builders make
+    /// reflective elements.
+    ///
+    /// \throws tarnkiln::messages::DuplicateTypeInRegistry  (name) as above.
+    void registerReflectiveClass(Class const& metaClass);
     /// Takes the entry out if it is that of `type`. The caller holds a `LockedModel`.
     void unregisterType(Type const& type, ustring const& name);
     /// Replaces what makes collections for `type`, which must be registered under its qualified
@@ -99,7 +104,7 @@ public:
     PrimitiveType getPrimitiveType(ustring const& name) const;
 
     /// A builder of elements of `metaClass` in `model`; null if that class, and no other of its
-    /// name, is not registered with a function for it.
+    /// name, is not registered with a function for it or as a reflective one.
     std::unique_ptr<ModelElement::Builder> instantiateBuilder(Class const& metaClass,
                                                               Model const& model) const;
     /// A new collection for the many-valued property of `owner`, or a snapshot if that is empty;
@@ -181,6 +186,7 @@ private:
         BuilderInstantiator builderInstantiator;
         CollectionInstantiator collectionInstantiator;
         Type type;
+        bool isReflective = false;  ///< A class whose elements have no generated code.
     };
 
     MetaRegistry();

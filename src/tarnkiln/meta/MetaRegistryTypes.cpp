@@ -10,6 +10,7 @@
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/MetaRegistry.h"
 #include "tarnkiln/meta/PrimitiveType.h"
+#include "tarnkiln/meta/ReflectiveBuilder.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/meta/TypeImpl.h"
 
@@ -59,6 +60,13 @@ void MetaRegistry::registerType(Type const& type, CollectionInstantiator collect
 void MetaRegistry::registerType(Type const& type, BuilderInstantiator builder)
 {
     registerType(type, /*collection=*/nullptr, builder);
+}
+
+void MetaRegistry::registerReflectiveClass(Class const& metaClass)
+{
+    LockedModel const locked(*this);
+    registerType(metaClass, /*builder=*/nullptr);
+    m_types.find(metaClass->getQualifiedName())->second.isReflective = true;
 }
 
 void MetaRegistry::unregisterType(Type const& type, ustring const& name)
@@ -112,6 +120,8 @@ std::unique_ptr<ModelElement::Builder> MetaRegistry::instantiateBuilder(Class co
     if (!metaClass)
         return nullptr;
     TypeEntry const* const entry = findEntry(metaClass);
+    if (entry && entry->isReflective)
+        return std::make_unique<ReflectiveBuilder>(model, metaClass);
     return entry && entry->builderInstantiator ? entry->builderInstantiator(model) : nullptr;
 }
 

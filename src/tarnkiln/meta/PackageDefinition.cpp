@@ -87,7 +87,7 @@ Package PackageDefinition::finish()
     for (Enum const& defined : m_enums)
         m_registry.registerType(defined, &makeReflectiveEnumCollection, /*builder=*/nullptr);
     for (Class const& defined : m_classes)
-        m_registry.registerType(defined, /*collection=*/nullptr, /*builder=*/nullptr);
+        m_registry.registerReflectiveClass(defined);
     if (m_transaction.commit() == TransactionResult::RolledBack)
         throw std::runtime_error("a listener refused the definition of a package");
     m_registry.registerRootPackage(m_package);

@@ -45,7 +45,8 @@ public:
     Enum defineEnum(ustring const& name, std::initializer_list<ustring> literals);
 
     /// Numbers the slots of all classes, each after those of its superclass, commits, and makes
-    /// the package known to the registry, which is then frozen again. Must be called once at most.
+    /// the package known to the registry, with builders of reflective elements; the registry is
+    /// then frozen again. Must be called once at most.
     ///
     /// \throws tarnkiln::messages::DuplicateTypeInRegistry  (qualified name) if another package
     ///     has a type of that qualified name.
