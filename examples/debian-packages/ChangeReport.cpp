@@ -28,17 +28,19 @@ std::string classNameOf(ModelElement const& element)
     return to_string(element->getMetaClass()->getName());
 }
 
+template <ElementForm Form>
 std::string listOf(std::vector<ModelElement> const& members, Before before)
 {
     std::string text;
     for (std::size_t i = 0; i < members.size() && i < MAX_MEMBERS; ++i)
-        text += (i == 0 ? "" : ", ") + textOf(members[i], before);
+        text += (i == 0 ? "" : ", ") + textOf<Form>(members[i], before);
     if (members.size() > MAX_MEMBERS)
         text += ", and " + std::to_string(members.size() - MAX_MEMBERS) + " more";
     return '{' + text + '}';
 }
 
 /// Such as "providers = {mawk 1.3.4 amd64}", empty if the property held nothing.
+template <ElementForm Form>
 std::string oldValueText(ReportData const& report, ModelElement const& element,
                          meta::Property const& property)
 {
@@ -46,21 +48,23 @@ std::string oldValueText(ReportData const& report, ModelElement const& element,
     if (isMany(property))
     {
         auto const members = oldMembers(report, element, property);
-        return members.empty() ? std::string() : name + listOf(members, &report);
+        return members.empty() ? std::string() : name + listOf<Form>(members, &report);
     }
     ModelElement const target = oldTarget(report, element, property);
-    return target.getImpl() ? name + textOf(target, &report) : std::string();
+    return target.getImpl() ? name + textOf<Form>(target, &report) : std::string();
 }
 
+template <ElementForm Form>
 std::string lineOf(ReportData const& report, std::string const& verb, ModelElement const& element)
 {
-    std::string line = verb + ' ' + classNameOf(element) + ' ' + textOf(element, &report);
+    std::string line = verb + ' ' + classNameOf(element) + ' ' + textOf<Form>(element, &report);
     char const* separator = "; had ";
     for (meta::Property const& property : propertiesOf(element->getMetaClass()))
     {
         bool const concerns = isReference(property) && !isContainer(property) &&
                               (!element || report.isChanged(element, property));
-        std::string const old = concerns ? oldValueText(report, element, property) : std::string();
+        std::string const old =
+            concerns ? oldValueText<Form>(report, element, property) : std::string();
         if (old.empty())
             continue;
         line += separator + old;
@@ -70,6 +74,7 @@ std::string lineOf(ReportData const& report, std::string const& verb, ModelEleme
 }
 
 /// The elements class by class, in the order of their texts.
+template <ElementForm Form>
 std::vector<ModelElement> sorted(std::vector<ModelElement> const& elements, Before before)
 {
     static std::string const ORDER[] = {"PackageIndex", "Package", "Release", "DependencyGroup"};
@@ -77,7 +82,7 @@ std::vector<ModelElement> sorted(std::vector<ModelElement> const& elements, Befo
     for (ModelElement const& element : elements)
     {
         auto const rank = std::find(std::begin(ORDER), std::end(ORDER), classNameOf(element));
-        byText.emplace(std::pair(rank - std::begin(ORDER), textOf(element, before)), element);
+        byText.emplace(std::pair(rank - std::begin(ORDER), textOf<Form>(element, before)), element);
     }
     std::vector<ModelElement> result;
     for (auto const& [key, element] : byText)
@@ -103,14 +108,15 @@ void printCounts(std::ostream& output, std::string const& verb,
 
 }  // namespace
 
+template <ElementForm Form>
 void printReport(std::ostream& output, ReportData const& report, std::size_t maxLines)
 {
     std::size_t lines = 0;
     auto const print = [&](std::string const& verb, std::vector<ModelElement> const& elements) {
-        for (ModelElement const& element : sorted(elements, &report))
+        for (ModelElement const& element : sorted<Form>(elements, &report))
         {
             if (++lines <= maxLines)
-                output << "    " << lineOf(report, verb, element) << '\n';
+                output << "    " << lineOf<Form>(report, verb, element) << '\n';
         }
     };
     print("changed", report.getChanged());
@@ -120,5 +126,9 @@ void printReport(std::ostream& output, ReportData const& report, std::size_t max
     printCounts(output, "changed", report.getChanged());
     printCounts(output, "destroyed", report.getDestroyed());
 }
+
+#define DEBIAN_INSTANTIATE(Form)                                                                   \
+    template void printReport<Form>(std::ostream&, ReportData const&, std::size_t);
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

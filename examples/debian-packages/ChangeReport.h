@@ -1,6 +1,7 @@
 /// \file
 /// Shows the report of a transaction, and keeps it.
 #pragma once
+#include "Forms.h"
 #include "tarnkiln/kernel/ListenerHolder.h"
 
 #include <cstddef>
@@ -11,6 +12,7 @@ namespace debian {
 
 /// Writes a line for each element that was changed or destroyed, with what it held before, until
 /// `maxLines` are written; then how many there are of each class.
+template <ElementForm Form>
 void printReport(std::ostream& output, tarn::kiln::ReportData const& report, std::size_t maxLines);
 
 /// A deep listener that keeps the report of the last transaction that was committed.

@@ -21,12 +21,15 @@ struct CommandLine
 
     std::string file = "/var/lib/dpkg/status";
     std::optional<std::string> available;
+    bool reflective = false;             ///< Elements of classes that are defined at run time.
+    std::optional<std::string> figures;  ///< Where the figures go; else they are printed.
     bool wantsHelp = false;
 };
 
 /// Reads the arguments, the name of the program not among them.
 ///
-/// \throws UsageError  for an unknown option, a third file, and standard input given twice.
+/// \throws UsageError  for an unknown option, one without its value, a third file, and standard
+/// input given twice.
 CommandLine parseCommandLine(std::vector<std::string> const& arguments);
 
 /// What `--help` prints.

@@ -11,7 +11,6 @@
 #include "Removal.h"
 #include "Resolution.h"
 #include "Undo.h"
-#include "model/PackageIndexImpl.h"
 #include "reader/ControlFile.h"
 #include "tarnkiln/kernel/ModelConstellationImpl.h"
 #include "tarnkiln/kernel/ModelImpl.h"
@@ -48,20 +47,23 @@ std::uintmax_t sizeOf(std::string const& file)
 
 }  // namespace
 
-Demonstration::Demonstration(std::ostream& output, std::ostream& progress, bool progressIsTerminal)
+template <ElementForm Form>
+Demonstration<Form>::Demonstration(std::ostream& output, std::ostream& progress,
+                                   bool progressIsTerminal)
     : m_output(output),
       m_progress(progress),
       m_progressIsTerminal(progressIsTerminal)
 {}
 
-bool Demonstration::run(CommandLine const& commandLine)
+template <ElementForm Form> bool Demonstration<Form>::run(CommandLine const& commandLine)
 {
+    PackageIndex<Form>::metaClass();  // the metamodel is no part of what is measured
     m_model = Model::create(ModelConstellation());
     m_index = load(m_model, commandLine.file, "").index;
     if (commandLine.available)
         resolve(*commandLine.available);
 
-    EssentialGuard guard(m_index);
+    EssentialGuard<Form> guard(m_index);
     ChangeRecorder recorder;
     m_model->addListener(&guard);
     m_model->addListener(&recorder);
@@ -69,23 +71,22 @@ bool Demonstration::run(CommandLine const& commandLine)
     equal = removeLeaf(recorder) && equal;
     m_model->removeListener(&recorder);
     m_model->removeListener(&guard);
-
-    m_output << "\nFigures\n";
-    m_figures.print(m_output);
     return equal;
 }
 
-LoadResult Demonstration::load(Model const& model, std::string const& file,
-                               std::string const& prefix)
+template <ElementForm Form>
+LoadResult<Form> Demonstration<Form>::load(Model const& model, std::string const& file,
+                                           std::string const& prefix)
 {
     auto const input = open(file);
     std::size_t const bytesBefore = allocatedBytes();
     Stopwatch const stopwatch;
-    LoadResult const loaded = [&] {
+    LoadResult<Form> const loaded = [&] {
         ProgressBar bar(m_progress, m_progressIsTerminal, "Reading " + file, sizeOf(file));
-        return Loader(model).load(*input, [&](std::size_t bytes) { bar.update(bytes); });
+        return Loader<Form>(model).load(*input, [&](std::size_t bytes) { bar.update(bytes); });
     }();
     auto const time = stopwatch.elapsed();
+    std::size_t const bytes = allocatedBytes() - bytesBefore;
     std::size_t const elements = model->getElementCount();
 
     m_output << input->name() << ": " << loaded.index->getPackages().size() << " packages with "
@@ -94,39 +95,41 @@ LoadResult Demonstration::load(Model const& model, std::string const& file,
              << "  passed over: " << loaded.notInstalled << " that are not installed, "
              << loaded.repeated << " repeated\n"
              << "  named, but not in the file: " << loaded.missing.size() << '\n';
+    m_output << "  fingerprint: " << ModelSnapshot(model).fingerprint() << '\n';
     m_figures.addCount(prefix + "elements", elements);
-    m_figures.addCount(prefix + "bytes per element", (allocatedBytes() - bytesBefore) / elements);
+    m_figures.addCount(prefix + "bytes per element", bytes / elements);
     m_figures.addTime(prefix + "load", time);
     return loaded;
 }
 
-void Demonstration::resolve(std::string const& file)
+template <ElementForm Form> void Demonstration<Form>::resolve(std::string const& file)
 {
     Model const available = Model::create(m_model->getModelConstellation());
     available->setModelURI(AVAILABLE_URI);
     load(available, file, "available: ");
 
     Stopwatch const stopwatch;
-    Resolution const resolution = resolveTargets(m_index);
+    Resolution const resolution = resolveTargets<Form>(m_index);
     m_figures.addTime("resolution", stopwatch.elapsed());
     m_output << "  of the missing packages of the first file " << resolution.found << " are here, "
              << resolution.notFound << " are not\n";
 }
 
-bool Demonstration::removeNeeded(EssentialGuard const& guard)
+template <ElementForm Form>
+bool Demonstration<Form>::removeNeeded(EssentialGuard<Form> const& guard)
 {
-    model::Package const needed = neededByEssential(m_index);
+    Package<Form> const needed = neededByEssential<Form>(m_index);
     if (!needed)
     {
         m_output << "\nNo essential package needs another: nothing to refuse\n";
         return true;
     }
     ModelSnapshot const before(m_model);
-    m_output << "\nRemoving " << textOf(needed) << ", which an essential package needs\n";
+    m_output << "\nRemoving " << textOf<Form>(needed) << ", which an essential package needs\n";
 
     Stopwatch const stopwatch;
     Transaction const transaction = m_model->beginTransaction(/*revertible=*/true);
-    removePackages({needed});
+    removePackages<Form>({needed});
     bool const refused = transaction.commit() == TransactionResult::RolledBack;
     m_figures.addTime("refused removal and rollback", stopwatch.elapsed());
 
@@ -135,10 +138,10 @@ bool Demonstration::removeNeeded(EssentialGuard const& guard)
     return checkEqual(before, "rollback") && refused;
 }
 
-bool Demonstration::removeLeaf(ChangeRecorder const& recorder)
+template <ElementForm Form> bool Demonstration<Form>::removeLeaf(ChangeRecorder const& recorder)
 {
-    PackageGraph const graph(m_index);
-    model::Package const leaf = graph.chooseLeaf();
+    PackageGraph<Form> const graph(m_index);
+    Package<Form> const leaf = graph.chooseLeaf();
     if (!leaf)
     {
         m_output << "\nAll packages are used by others: nothing to remove\n";
@@ -146,12 +149,12 @@ bool Demonstration::removeLeaf(ChangeRecorder const& recorder)
     }
     ModelSnapshot const before(m_model);
     auto const packages = graph.removableWith(leaf);
-    m_output << "\nRemoving " << textOf(leaf) << " with what only it needs: " << packages.size()
-             << " packages\n";
+    m_output << "\nRemoving " << textOf<Form>(leaf)
+             << " with what only it needs: " << packages.size() << " packages\n";
 
     Stopwatch const removal;
     Transaction const transaction = m_model->beginTransaction(/*revertible=*/true);
-    removePackages(packages);
+    removePackages<Form>(packages);
     bool const committed = transaction.commit() == TransactionResult::Committed;
     m_figures.addTime("removal and commit", removal.elapsed());
     if (!committed)
@@ -160,7 +163,7 @@ bool Demonstration::removeLeaf(ChangeRecorder const& recorder)
         return false;
     }
     ReportData const report = *recorder.last();
-    printReport(m_output, report, MAX_REPORT_LINES);
+    printReport<Form>(m_output, report, MAX_REPORT_LINES);
 
     Stopwatch const back;
     undo(report);
@@ -168,7 +171,8 @@ bool Demonstration::removeLeaf(ChangeRecorder const& recorder)
     return checkEqual(before, "undo");
 }
 
-bool Demonstration::checkEqual(ModelSnapshot const& before, std::string const& occasion)
+template <ElementForm Form>
+bool Demonstration<Form>::checkEqual(ModelSnapshot const& before, std::string const& occasion)
 {
     ModelSnapshot const now(m_model);
     if (now == before)
@@ -182,5 +186,8 @@ bool Demonstration::checkEqual(ModelSnapshot const& before, std::string const& o
         m_output << "    " << line << '\n';
     return false;
 }
+
+#define DEBIAN_INSTANTIATE(Form) template class Demonstration<Form>;
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

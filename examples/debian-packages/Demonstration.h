@@ -3,6 +3,7 @@
 #pragma once
 #include "CommandLine.h"
 #include "Figures.h"
+#include "Forms.h"
 #include "Loader.h"
 #include "tarnkiln/kernel/Model.h"
 
@@ -11,10 +12,11 @@
 
 namespace debian {
 class ChangeRecorder;
-class EssentialGuard;
+template <ElementForm Form> class EssentialGuard;
+class ModelSnapshot;
 
 /// Loads, has a removal refused, removes and takes the removal back, and says so.
-class Demonstration
+template <ElementForm Form> class Demonstration
 {
 public:
     /// \param output  for the report.
@@ -24,20 +26,22 @@ public:
     /// \throws ReadError  as `Loader::load`.
     /// \returns whether each state that had to equal an earlier one did.
     bool run(CommandLine const& commandLine);
+    /// What `run` measured.
+    Figures const& figures() const { return m_figures; }
 
 private:
-    LoadResult load(tarn::kiln::Model const& model, std::string const& file,
-                    std::string const& prefix);
+    LoadResult<Form> load(tarn::kiln::Model const& model, std::string const& file,
+                          std::string const& prefix);
     void resolve(std::string const& file);
-    bool removeNeeded(EssentialGuard const& guard);
+    bool removeNeeded(EssentialGuard<Form> const& guard);
     bool removeLeaf(ChangeRecorder const& recorder);
-    bool checkEqual(class ModelSnapshot const& before, std::string const& occasion);
+    bool checkEqual(ModelSnapshot const& before, std::string const& occasion);
 
     std::ostream& m_output;
     std::ostream& m_progress;
     bool m_progressIsTerminal;
     tarn::kiln::Model m_model;
-    model::PackageIndex m_index;
+    PackageIndex<Form> m_index;
     Figures m_figures;
 };
 

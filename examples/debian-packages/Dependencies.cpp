@@ -1,10 +1,5 @@
 #include "Dependencies.h"
 
-#include "model/AlternativeImpl.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/PackageImpl.h"
-#include "model/PackageIndexImpl.h"
-#include "model/ReleaseImpl.h"
 #include "reader/Version.h"
 
 #include "sill/i18n/StringConversion.h"
@@ -33,7 +28,8 @@ VersionRelation relationOf(ustring const& text)
     throw std::invalid_argument("no relation of versions: " + to_string(text));
 }
 
-bool fits(model::Release const& release, model::Alternative const& alternative)
+template <ElementForm Form>
+bool fits(Release<Form> const& release, Alternative<Form> const& alternative)
 {
     if (alternative->getRelation().empty())
         return true;
@@ -44,82 +40,38 @@ bool fits(model::Release const& release, model::Alternative const& alternative)
 
 }  // namespace
 
-bool isStrict(model::DependencyGroup const& group)
+template <ElementForm Form>
+std::vector<DependencyGroup<Form>> strictGroupsOf(Release<Form> const& release)
 {
-    return group->getKind() == u"Depends" || group->getKind() == u"Pre-Depends";
-}
-
-bool isSuggestion(model::DependencyGroup const& group)
-{
-    return group->getKind() == u"Suggests";
-}
-
-model::Package installedTarget(model::Alternative const& alternative)
-{
-    model::Package const target(alternative->getTargetImpl());
-    bool const isHere =
-        target && !target->isProxy() && target->getModelImpl() == alternative->getModelImpl();
-    return isHere ? target : model::Package();
-}
-
-std::vector<model::Release> satisfiersOf(model::DependencyGroup const& group)
-{
-    std::vector<model::Release> result;
-    forEachAlternative(group, [&](model::Alternative const& alternative) {
-        model::Package const target = installedTarget(alternative);
-        if (!target)
-            return;
-        forEachRelease(target, [&](model::Release const& release) {
-            if (fits(release, alternative))
-                result.push_back(release);
-        });
-        if (target->hasProviders())
-            result.insert(result.end(), target->getProviders().begin(),
-                          target->getProviders().end());
+    std::vector<DependencyGroup<Form>> result;
+    forEachGroup<Form>(release, [&](DependencyGroup<Form> const& group) {
+        if (isStrict<Form>(group))
+            result.push_back(group);
     });
     return result;
 }
 
-void forEachRelease(model::Package const& package,
-                    std::function<void(model::Release const&)> const& visit)
+template <ElementForm Form>
+std::vector<Release<Form>> satisfiersOf(DependencyGroup<Form> const& group)
 {
-    if (!package->hasReleases())
-        return;
-    for (auto const& [label, release] : package->getReleases())
-        visit(release);
+    std::vector<Release<Form>> result;
+    forEachAlternative<Form>(group, [&](Alternative<Form> const& alternative) {
+        Package<Form> const target = installedTarget<Form>(alternative);
+        if (!target)
+            return;
+        forEachRelease<Form>(target, [&](Release<Form> const& release) {
+            if (fits<Form>(release, alternative))
+                result.push_back(release);
+        });
+        forEachProvider<Form>(target,
+                              [&](Release<Form> const& provider) { result.push_back(provider); });
+    });
+    return result;
 }
 
-void forEachRelease(model::PackageIndex const& index,
-                    std::function<void(model::Release const&)> const& visit)
-{
-    for (auto const& [name, package] : index->getPackages())
-        forEachRelease(package, visit);
-}
-
-void forEachGroup(model::Release const& release,
-                  std::function<void(model::DependencyGroup const&)> const& visit)
-{
-    if (!release->hasGroups())
-        return;
-    for (model::DependencyGroup const& group : release->getGroups())
-        visit(group);
-}
-
-void forEachAlternative(model::DependencyGroup const& group,
-                        std::function<void(model::Alternative const&)> const& visit)
-{
-    if (!group->hasAlternatives())
-        return;
-    for (model::Alternative const& alternative : group->getAlternatives())
-        visit(alternative);
-}
-
-bool isEssential(model::Package const& package)
-{
-    bool essential = false;
-    forEachRelease(package,
-                   [&](model::Release const& release) { essential |= release->isEssential(); });
-    return essential;
-}
+#define DEBIAN_INSTANTIATE(Form)                                                                   \
+    template std::vector<DependencyGroup<Form>> strictGroupsOf<Form>(Release<Form> const&);        \
+    template std::vector<Release<Form>> satisfiersOf<Form>(DependencyGroup<Form> const&);
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

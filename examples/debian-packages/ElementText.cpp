@@ -1,10 +1,7 @@
 #include "ElementText.h"
 
+#include "Dependencies.h"
 #include "OldValues.h"
-#include "model/AlternativeImpl.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/PackageImpl.h"
-#include "model/ReleaseImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 
 #include "sill/i18n/StringConversion.h"
@@ -17,73 +14,90 @@ using sill::i18n::to_string;
 namespace {
 
 /// Tries one class after the other; a destroyed element still has its class.
-template <class... Classes> std::string textAsOneOf(ModelElement const& element, Before before)
+template <ElementForm Form, class... Classes>
+std::string textAsOneOf(ModelElement const& element, Before before)
 {
     std::string text;
     auto const matches = [&](auto const& typed) {
-        return typed.getImpl() && (text = textOf(typed, before), true);
+        return typed.getImpl() && (text = textOf<Form>(typed, before), true);
     };
     static_cast<void>((matches(Classes::cast(element)) || ...));
     return text.empty() ? to_string(element->getMetaClass()->getName()) : text;
 }
 
-ModelElement targetOf(model::Alternative const& alternative, Before before)
+template <ElementForm Form>
+ModelElement targetOf(Alternative<Form> const& alternative, Before before)
 {
     if (before && !alternative)
-        return oldTarget(*before, alternative, model::Alternative::Impl::TARGET.property());
+        return oldTarget(*before, alternative, propertyOf(alternative, u"target"));
     return ModelElement(alternative->getTargetImpl());
 }
 
-std::vector<ModelElement> alternativesOf(model::DependencyGroup const& group, Before before)
+template <ElementForm Form>
+std::vector<Alternative<Form>> alternativesOf(DependencyGroup<Form> const& group, Before before)
 {
-    if (before && !group)
-        return oldMembers(*before, group, model::DependencyGroup::Impl::ALTERNATIVES.property());
-    return group->hasAlternatives() ? group->getAlternatives().getAllValues()
-                                    : std::vector<ModelElement>();
+    std::vector<Alternative<Form>> result;
+    if (!before || group)
+    {
+        forEachAlternative<Form>(
+            group, [&](Alternative<Form> const& alternative) { result.push_back(alternative); });
+        return result;
+    }
+    for (ModelElement const& old : oldMembers(*before, group, propertyOf(group, u"alternatives")))
+        result.push_back(Alternative<Form>::cast(old));
+    return result;
 }
 
 }  // namespace
 
-std::string textOf(model::Package const& package, Before /*before*/)
+template <ElementForm Form> std::string textOf(Package<Form> const& package, Before /*before*/)
 {
     if (package->isProxy())
         return "a package that is not in the file";
     return to_string(package->getName());
 }
 
-std::string textOf(model::Release const& release, Before /*before*/)
+template <ElementForm Form> std::string textOf(Release<Form> const& release, Before /*before*/)
 {
-    auto const package = model::Package::cast(ModelElement(release->containerImpl()));
-    std::string const name = package.getImpl() ? textOf(package) + ' ' : std::string();
+    auto const package = Package<Form>::cast(ModelElement(release->containerImpl()));
+    std::string const name = package.getImpl() ? textOf<Form>(package) + ' ' : std::string();
     return name + to_string(release->getLabel());
 }
 
-std::string textOf(model::Alternative const& alternative, Before before)
+template <ElementForm Form> std::string textOf(Alternative<Form> const& alternative, Before before)
 {
-    auto const target = model::Package::cast(targetOf(alternative, before));
-    std::string const name = target.getImpl() ? textOf(target) : "nothing";
+    auto const target = Package<Form>::cast(targetOf<Form>(alternative, before));
+    std::string const name = target.getImpl() ? textOf<Form>(target) : "nothing";
     if (alternative->getRelation().empty())
         return name;
     return name + " (" + to_string(alternative->getRelation()) + ' ' +
            to_string(alternative->getBound()) + ')';
 }
 
-std::string textOf(model::DependencyGroup const& group, Before before)
+template <ElementForm Form> std::string textOf(DependencyGroup<Form> const& group, Before before)
 {
     std::string text = to_string(group->getKind()) + ':';
     char const* separator = " ";
-    for (ModelElement const& alternative : alternativesOf(group, before))
+    for (Alternative<Form> const& alternative : alternativesOf<Form>(group, before))
     {
-        text += separator + textOf(alternative, before);
+        text += separator + textOf<Form>(alternative, before);
         separator = " | ";
     }
     return text;
 }
 
-std::string textOf(ModelElement const& element, Before before)
+template <ElementForm Form> std::string textOf(ModelElement const& element, Before before)
 {
-    return textAsOneOf<model::Package, model::Release, model::DependencyGroup, model::Alternative>(
-        element, before);
+    return textAsOneOf<Form, Package<Form>, Release<Form>, DependencyGroup<Form>,
+                       Alternative<Form>>(element, before);
 }
+
+#define DEBIAN_INSTANTIATE(Form)                                                                   \
+    template std::string textOf<Form>(Package<Form> const&, Before);                               \
+    template std::string textOf<Form>(Release<Form> const&, Before);                               \
+    template std::string textOf<Form>(Alternative<Form> const&, Before);                           \
+    template std::string textOf<Form>(DependencyGroup<Form> const&, Before);                       \
+    template std::string textOf<Form>(ModelElement const&, Before);
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

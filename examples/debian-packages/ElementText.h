@@ -1,10 +1,7 @@
 /// \file
 /// How elements of an index are shown to people.
 #pragma once
-#include "model/Alternative.h"
-#include "model/DependencyGroup.h"
-#include "model/Package.h"
-#include "model/Release.h"
+#include "Forms.h"
 #include "tarnkiln/kernel/Fwd.h"
 
 #include <string>
@@ -17,13 +14,20 @@ namespace debian {
 /// @{
 using Before = tarn::kiln::ReportData const*;
 
-std::string textOf(model::Package const& package, Before before = nullptr);  ///< "gdb"
-std::string textOf(model::Release const& release, Before before = nullptr);  ///< "gdb 13.1-3 amd64"
+/// "gdb"
+template <ElementForm Form>
+std::string textOf(Package<Form> const& package, Before before = nullptr);
+/// "gdb 13.1-3 amd64"
+template <ElementForm Form>
+std::string textOf(Release<Form> const& release, Before before = nullptr);
 /// "libc6 (>= 2.36)"
-std::string textOf(model::Alternative const& alternative, Before before = nullptr);
+template <ElementForm Form>
+std::string textOf(Alternative<Form> const& alternative, Before before = nullptr);
 /// "Depends: default-mta | mail-agent"
-std::string textOf(model::DependencyGroup const& group, Before before = nullptr);
+template <ElementForm Form>
+std::string textOf(DependencyGroup<Form> const& group, Before before = nullptr);
 /// One of the above, or the name of the class.
+template <ElementForm Form>
 std::string textOf(tarn::kiln::ModelElement const& element, Before before = nullptr);
 /// @}
 

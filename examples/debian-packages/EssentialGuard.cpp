@@ -2,41 +2,44 @@
 
 #include "ElementText.h"
 #include "EssentialNeeds.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/ReleaseImpl.h"
 
 namespace debian {
 
 using namespace tarn::kiln;
 
-EssentialGuard::EssentialGuard(model::PackageIndex const& index) : m_index(index)
+template <ElementForm Form>
+EssentialGuard<Form>::EssentialGuard(PackageIndex<Form> const& index) : m_index(index)
 {
-    for (model::DependencyGroup const& group : lackingDependencies(index))
+    for (DependencyGroup<Form> const& group : lackingDependencies<Form>(index))
         m_lackingBefore.insert(group->getUuid());
 }
 
-bool EssentialGuard::transactionValidating(ReportData& report)
+template <ElementForm Form> bool EssentialGuard<Form>::transactionValidating(ReportData& report)
 {
     m_reason.clear();
     for (ModelElement const& element : report.getDestroyed())
     {
-        auto const release = model::Release::cast(element);
+        auto const release = Release<Form>::cast(element);
         if (release.getImpl() && release->isEssential())
         {
-            m_reason = textOf(release) + " is essential";
+            m_reason = textOf<Form>(release) + " is essential";
             return false;
         }
     }
     if (!m_index)
         return true;
-    for (model::DependencyGroup const& group : lackingDependencies(m_index))
+    for (DependencyGroup<Form> const& group : lackingDependencies<Form>(m_index))
     {
         if (m_lackingBefore.contains(group->getUuid()))
             continue;
-        m_reason = textOf(group->getRelease()) + " has nothing left for " + textOf(group);
+        m_reason =
+            textOf<Form>(group->getRelease()) + " has nothing left for " + textOf<Form>(group);
         return false;
     }
     return true;
 }
+
+#define DEBIAN_INSTANTIATE(Form) template class EssentialGuard<Form>;
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

@@ -1,8 +1,6 @@
 #include "EssentialNeeds.h"
 
 #include "Dependencies.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/ReleaseImpl.h"
 
 #include <algorithm>
 #include <unordered_map>
@@ -11,12 +9,12 @@ namespace debian {
 namespace {
 
 /// The essential releases and all that can satisfy what they need, directly or not.
-class NeedGraph
+template <ElementForm Form> class NeedGraph
 {
 public:
-    explicit NeedGraph(model::PackageIndex const& index)
+    explicit NeedGraph(PackageIndex<Form> const& index)
     {
-        forEachRelease(index, [&](model::Release const& release) {
+        forEachRelease<Form>(index, [&](Release<Form> const& release) {
             if (release->isEssential())
                 nodeOf(release);
         });
@@ -27,10 +25,10 @@ public:
         {}
     }
 
-    std::vector<model::DependencyGroup> lacking() const
+    std::vector<DependencyGroup<Form>> lacking() const
     {
-        std::vector<model::DependencyGroup> unsatisfied;
-        std::vector<model::DependencyGroup> unusable;
+        std::vector<DependencyGroup<Form>> unsatisfied;
+        std::vector<DependencyGroup<Form>> unusable;
         std::vector<bool> seen(m_nodes.size());
         std::vector<std::size_t> blamed;
         auto const blame = [&](std::size_t node) {
@@ -59,17 +57,17 @@ public:
 private:
     struct Need
     {
-        model::DependencyGroup group;
+        DependencyGroup<Form> group;
         std::vector<std::size_t> satisfiers;
     };
     struct Node
     {
-        model::Release release;
+        Release<Form> release;
         std::vector<Need> needs;
         bool works = true;  // until a need turns out not to be met
     };
 
-    std::size_t nodeOf(model::Release const& release)
+    std::size_t nodeOf(Release<Form> const& release)
     {
         auto const [place, isNew] = m_places.emplace(release.getImpl(), m_nodes.size());
         if (isNew)
@@ -79,15 +77,13 @@ private:
 
     void expand(std::size_t node)
     {
-        model::Release const release = m_nodes[node].release;
-        forEachGroup(release, [&](model::DependencyGroup const& group) {
-            if (!isStrict(group))
-                return;
+        for (DependencyGroup<Form> const& group : strictGroupsOf<Form>(m_nodes[node].release))
+        {
             Need need{group, {}};
-            for (model::Release const& satisfier : satisfiersOf(group))
+            for (Release<Form> const& satisfier : satisfiersOf<Form>(group))
                 need.satisfiers.push_back(nodeOf(satisfier));
             m_nodes[node].needs.push_back(std::move(need));
-        });
+        }
     }
 
     bool isMet(Need const& need) const
@@ -112,14 +108,20 @@ private:
 
     std::vector<Node> m_nodes;  // the essential ones first
     std::size_t m_essentialCount = 0;
-    std::unordered_map<model::Release::Impl*, std::size_t> m_places;
+    std::unordered_map<tarn::kiln::ModelElement::Impl*, std::size_t> m_places;
 };
 
 }  // namespace
 
-std::vector<model::DependencyGroup> lackingDependencies(model::PackageIndex const& index)
+template <ElementForm Form>
+std::vector<DependencyGroup<Form>> lackingDependencies(PackageIndex<Form> const& index)
 {
-    return NeedGraph(index).lacking();
+    return NeedGraph<Form>(index).lacking();
 }
+
+#define DEBIAN_INSTANTIATE(Form)                                                                   \
+    template std::vector<DependencyGroup<Form>> lackingDependencies<Form>(                         \
+        PackageIndex<Form> const&);
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

@@ -1,8 +1,7 @@
 /// \file
 /// What the essential releases of an index lack.
 #pragma once
-#include "model/DependencyGroup.h"
-#include "model/PackageIndex.h"
+#include "Forms.h"
 
 #include <vector>
 
@@ -15,6 +14,7 @@ namespace debian {
 /// A release works if each of its strict dependencies is satisfied by a release that works, and
 /// releases that need one another in a circle work together. What could satisfy a dependency
 /// beside something that works is blamed for nothing.
-std::vector<model::DependencyGroup> lackingDependencies(model::PackageIndex const& index);
+template <ElementForm Form>
+std::vector<DependencyGroup<Form>> lackingDependencies(PackageIndex<Form> const& index);
 
 }  // namespace debian

@@ -3,8 +3,9 @@
 #include <algorithm>
 #include <array>
 #include <cstdio>
+#include <fstream>
 #include <iomanip>
-#include <ostream>
+#include <stdexcept>
 
 namespace debian {
 
@@ -32,6 +33,16 @@ void Figures::print(std::ostream& output) const
     for (auto const& [name, value] : m_rows)
         output << "  " << std::left << std::setw(static_cast<int>(nameWidth)) << name << "  "
                << std::right << std::setw(static_cast<int>(valueWidth)) << value << '\n';
+}
+
+void Figures::write(std::string const& file) const
+{
+    std::ofstream output(file, std::ios::binary);
+    for (auto const& [name, value] : m_rows)
+        output << name << '\t' << value << '\n';
+    output.close();
+    if (!output)
+        throw std::runtime_error(file + ": cannot be written");
 }
 
 }  // namespace debian

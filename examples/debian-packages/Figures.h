@@ -29,6 +29,10 @@ public:
     void addTime(std::string name, std::chrono::duration<double> time);
 
     void print(std::ostream& output) const;
+    /// Writes the rows for other programs, a line each, name and value parted by a tabulator.
+    ///
+    /// \throws std::runtime_error  if the file can not be written.
+    void write(std::string const& file) const;
 
 private:
     std::vector<std::pair<std::string, std::string>> m_rows;

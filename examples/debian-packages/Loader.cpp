@@ -1,11 +1,6 @@
 #include "Loader.h"
 
 #include "NameTable.h"
-#include "model/AlternativeImpl.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/PackageImpl.h"
-#include "model/PackageIndexImpl.h"
-#include "model/ReleaseImpl.h"
 #include "reader/ControlFile.h"
 #include "reader/NameBasedUuid.h"
 #include "reader/PackageReader.h"
@@ -34,10 +29,11 @@ UUID uuidInRelease(std::string const& kind, PackageParagraph const& paragraph)
     return nameBasedUuid(kind, paragraph.package, paragraph.version.text(), paragraph.architecture);
 }
 
-model::Release makeRelease(Model const& model, PackageParagraph const& paragraph,
-                           ustring const& label)
+template <ElementForm Form>
+Release<Form> makeRelease(Model const& model, PackageParagraph const& paragraph,
+                          ustring const& label)
 {
-    auto const release = model::Release::create(model, uuidInRelease("release", paragraph));
+    auto const release = Release<Form>::create(model, uuidInRelease("release", paragraph));
     release->setLabel(label);
     release->setVersion(to_ustring(paragraph.version.text()));
     release->setArchitecture(to_ustring(paragraph.architecture));
@@ -50,10 +46,11 @@ model::Release makeRelease(Model const& model, PackageParagraph const& paragraph
     return release;
 }
 
-model::Alternative makeAlternative(Model const& model, UUID const& id,
-                                   PackageRelation const& relation)
+template <ElementForm Form>
+Alternative<Form> makeAlternative(Model const& model, UUID const& id,
+                                  PackageRelation const& relation)
 {
-    auto const alternative = model::Alternative::create(model, id);
+    auto const alternative = Alternative<Form>::create(model, id);
     if (relation.bound)
     {
         alternative->setRelation(to_ustring(toString(relation.bound->relation)));
@@ -64,12 +61,13 @@ model::Alternative makeAlternative(Model const& model, UUID const& id,
 
 }  // namespace
 
-LoadResult Loader::load(ControlFile& file, Progress const& progress)
+template <ElementForm Form>
+LoadResult<Form> Loader<Form>::load(ControlFile& file, Progress const& progress)
 {
     Transaction const transaction = m_model->beginTransaction(/*revertible=*/true);
-    LoadResult result;
-    result.index = model::PackageIndex::create(m_model, nameBasedUuid("index", "", "", ""));
-    NameTable names(result.index);
+    LoadResult<Form> result;
+    result.index = PackageIndex<Form>::create(m_model, nameBasedUuid("index", "", "", ""));
+    NameTable<Form> names(result.index);
     PackageReader reader(file);
     while (auto const paragraph = reader.next())
     {
@@ -84,16 +82,18 @@ LoadResult Loader::load(ControlFile& file, Progress const& progress)
     return result;
 }
 
-void Loader::addPackage(PackageParagraph const& paragraph, NameTable& names, LoadResult& result)
+template <ElementForm Form>
+void Loader<Form>::addPackage(PackageParagraph const& paragraph, NameTable<Form>& names,
+                              LoadResult<Form>& result)
 {
-    model::Package const package = names.define(paragraph.package);
+    Package<Form> const package = names.define(paragraph.package);
     ustring const label = to_ustring(paragraph.version.text() + ' ' + paragraph.architecture);
     if (package->getReleases().count(label) != 0)
     {
         ++result.repeated;
         return;
     }
-    model::Release const release = makeRelease(m_model, paragraph, label);
+    Release<Form> const release = makeRelease<Form>(m_model, paragraph, label);
     release->setPackage(package);
     ++result.releases;
     addGroups(paragraph, release, names, result);
@@ -101,8 +101,9 @@ void Loader::addPackage(PackageParagraph const& paragraph, NameTable& names, Loa
         release->getProvides().push_back(names.define(provided.package));
 }
 
-void Loader::addGroups(PackageParagraph const& paragraph, model::Release const& release,
-                       NameTable& names, LoadResult& result)
+template <ElementForm Form>
+void Loader<Form>::addGroups(PackageParagraph const& paragraph, Release<Form> const& release,
+                             NameTable<Form>& names, LoadResult<Form>& result)
 {
     for (DependencyKind const kind : LOADED_KINDS)
     {
@@ -112,7 +113,7 @@ void Loader::addGroups(PackageParagraph const& paragraph, model::Release const& 
             std::string const place =
                 std::string(fieldName(kind)) + '/' + std::to_string(++groupNumber);
             auto const group =
-                model::DependencyGroup::create(m_model, uuidInRelease(place, paragraph));
+                DependencyGroup<Form>::create(m_model, uuidInRelease(place, paragraph));
             group->setKind(to_ustring(fieldName(kind)));
             group->setRelease(release);
             ++result.groups;
@@ -121,7 +122,7 @@ void Loader::addGroups(PackageParagraph const& paragraph, model::Release const& 
             for (PackageRelation const& relation : relations)
             {
                 UUID const id = uuidInRelease(place + '/' + std::to_string(++number), paragraph);
-                auto const alternative = makeAlternative(m_model, id, relation);
+                auto const alternative = makeAlternative<Form>(m_model, id, relation);
                 alternative->setGroup(group);
                 names.refer(alternative, relation.package);
                 ++result.alternatives;
@@ -129,5 +130,8 @@ void Loader::addGroups(PackageParagraph const& paragraph, model::Release const& 
         }
     }
 }
+
+#define DEBIAN_INSTANTIATE(Form) template class Loader<Form>;
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

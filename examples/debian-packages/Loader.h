@@ -3,11 +3,10 @@
 ///
 ///     Model const model = Model::create(ModelConstellation());
 ///     ControlFile file("/var/lib/dpkg/status");
-///     LoadResult const loaded = Loader(model).load(file);
+///     auto const loaded = Loader<Generated>(model).load(file);
 ///     std::cout << loaded.index->getPackages().size() << '\n';
 #pragma once
-#include "model/PackageIndex.h"
-#include "model/Release.h"
+#include "Forms.h"
 #include "tarnkiln/kernel/Model.h"
 
 #include <cstddef>
@@ -17,13 +16,13 @@
 
 namespace debian {
 class ControlFile;
-class NameTable;
+template <ElementForm Form> class NameTable;
 struct PackageParagraph;
 
 /// What became of an index.
-struct LoadResult
+template <ElementForm Form> struct LoadResult
 {
-    model::PackageIndex index;
+    PackageIndex<Form> index;
     std::size_t releases = 0;
     std::size_t groups = 0;
     std::size_t alternatives = 0;
@@ -48,7 +47,7 @@ struct LoadResult
 /// not kept. Of paragraphs with the same name, version and architecture the first one counts.
 ///
 /// Threads: as the model.
-class Loader
+template <ElementForm Form> class Loader
 {
 public:
     /// Called after each paragraph with the number of bytes that were read of the file.
@@ -61,12 +60,13 @@ public:
     ///
     /// \throws ReadError  if the file can not be read or is malformed.
     /// \throws std::runtime_error  if a listener of the model refuses the index.
-    LoadResult load(ControlFile& file, Progress const& progress = {});
+    LoadResult<Form> load(ControlFile& file, Progress const& progress = {});
 
 private:
-    void addPackage(PackageParagraph const& paragraph, NameTable& names, LoadResult& result);
-    void addGroups(PackageParagraph const& paragraph, model::Release const& release,
-                   NameTable& names, LoadResult& result);
+    void addPackage(PackageParagraph const& paragraph, NameTable<Form>& names,
+                    LoadResult<Form>& result);
+    void addGroups(PackageParagraph const& paragraph, Release<Form> const& release,
+                   NameTable<Form>& names, LoadResult<Form>& result);
 
     tarn::kiln::Model m_model;
 };

@@ -58,7 +58,7 @@ public:
     {
         m_text.clear();
         meta::Class const metaClass = element->getMetaClass();
-        add(to_string(metaClass->getQualifiedName()));
+        add(to_string(metaClass->getName()));
         if (ModelElement const container = element->container())
         {
             add(boost::uuids::to_string(container->getUuid()));
@@ -71,14 +71,26 @@ public:
             add(to_string(property->getName()));
             add(plainText(value, property->getType()));
         }
-        element->visitReferences([&](ModelElement const& target, Feature const& feature) {
-            add(to_string(feature.property()->getName()));
-            add(targetText(target));
-        });
+        for (auto const& [name, targets] : targetsByName(element))
+        {
+            add(to_string(name));
+            for (std::string const& target : targets)
+                add(target);
+        }
         return m_text;
     }
 
 private:
+    /// Metamodels may have their properties in different orders.
+    static std::map<ustring, std::vector<std::string>> targetsByName(ModelElement const& element)
+    {
+        std::map<ustring, std::vector<std::string>> result;
+        element->visitReferences([&](ModelElement const& target, Feature const& feature) {
+            result[feature.property()->getName()].push_back(targetText(target));
+        });
+        return result;
+    }
+
     void add(std::string const& text)
     {
         m_text.append(std::to_string(text.size())).append(1, ':').append(text);
@@ -109,6 +121,14 @@ ModelSnapshot::ModelSnapshot(Model const& model)
     for (ModelElement const& element : model->getAllElements())
         m_digests.emplace_back(element->getUuid(), digestOf(encoder.encode(element)));
     std::sort(m_digests.begin(), m_digests.end());
+}
+
+std::string ModelSnapshot::fingerprint() const
+{
+    std::string text;
+    for (auto const& [id, digest] : m_digests)
+        text += boost::uuids::to_string(id) + boost::uuids::to_string(digest);
+    return boost::uuids::to_string(boost::uuids::name_generator_sha1(UUID{})(text));
 }
 
 std::vector<std::string> ModelSnapshot::differences(ModelSnapshot const& later,

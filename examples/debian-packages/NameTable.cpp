@@ -1,9 +1,6 @@
 #include "NameTable.h"
 
 #include "AvailableModel.h"
-#include "model/AlternativeImpl.h"
-#include "model/PackageImpl.h"
-#include "model/PackageIndexImpl.h"
 #include "reader/NameBasedUuid.h"
 #include "tarnkiln/kernel/ProxyId.h"
 
@@ -27,22 +24,23 @@ UUID uuidOf(std::string const& packageName)
 
 }  // namespace
 
-model::Package NameTable::define(std::string const& name)
+template <ElementForm Form> Package<Form> NameTable<Form>::define(std::string const& name)
 {
     Entry& entry = m_entries[name];
     if (entry.package)
         return entry.package;
 
-    entry.package = model::Package::create(m_index->getModel(), uuidOf(name));
+    entry.package = Package<Form>::create(m_index->getModel(), uuidOf(name));
     entry.package->setName(to_ustring(name));
     entry.package->setIndex(m_index);
-    for (model::Alternative const& alternative : entry.waiting)
+    for (Alternative<Form> const& alternative : entry.waiting)
         alternative->setTarget(entry.package);
     entry.waiting = {};
     return entry.package;
 }
 
-void NameTable::refer(model::Alternative const& alternative, std::string const& name)
+template <ElementForm Form>
+void NameTable<Form>::refer(Alternative<Form> const& alternative, std::string const& name)
 {
     Entry& entry = m_entries[name];
     if (entry.package)
@@ -51,7 +49,7 @@ void NameTable::refer(model::Alternative const& alternative, std::string const& 
         entry.waiting.push_back(alternative);
 }
 
-std::vector<std::string> NameTable::createProxies()
+template <ElementForm Form> std::vector<std::string> NameTable<Form>::createProxies()
 {
     std::vector<std::string> names;
     for (auto& [name, entry] : m_entries)
@@ -60,9 +58,9 @@ std::vector<std::string> NameTable::createProxies()
             continue;
         ProxyId const id(ElementId::UUID_TYPE, to_ustring(boost::uuids::to_string(uuidOf(name))),
                          ustring(AVAILABLE_URI));
-        auto const proxy = model::Package::cast(
-            ModelElement::createProxy(m_index->getModel(), model::Package::metaClass(), id));
-        for (model::Alternative const& alternative : entry.waiting)
+        auto const proxy = Package<Form>::cast(
+            ModelElement::createProxy(m_index->getModel(), Package<Form>::metaClass(), id));
+        for (Alternative<Form> const& alternative : entry.waiting)
             alternative->setTarget(proxy);
         entry.waiting = {};
         names.push_back(name);
@@ -70,5 +68,8 @@ std::vector<std::string> NameTable::createProxies()
     std::sort(names.begin(), names.end());
     return names;
 }
+
+#define DEBIAN_INSTANTIATE(Form) template class NameTable<Form>;
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

@@ -21,6 +21,11 @@ std::vector<meta::Property> propertiesOf(meta::Class const& metaClass)
     return result;
 }
 
+meta::Property propertyOf(ModelElement const& element, ustring const& name)
+{
+    return element->getMetaClass()->getOwnedAttributes().find(name);
+}
+
 bool isReference(meta::Property const& property)
 {
     return meta::Class::cast(property->getType()).getImpl() != nullptr;

@@ -12,6 +12,10 @@ namespace debian {
 /// The properties of the class and of all that it extends.
 std::vector<tarn::kiln::meta::Property> propertiesOf(tarn::kiln::meta::Class const& metaClass);
 
+/// The property of that name that the class of `element` has itself.
+tarn::kiln::meta::Property propertyOf(tarn::kiln::ModelElement const& element,
+                                      tarn::kiln::ustring const& name);
+
 bool isReference(tarn::kiln::meta::Property const& property);  ///< Whether its values are elements.
 bool isMany(tarn::kiln::meta::Property const& property);       ///< Whether it has many values.
 /// Whether it refers to the element that contains this one.

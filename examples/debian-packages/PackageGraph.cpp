@@ -1,10 +1,6 @@
 #include "PackageGraph.h"
 
 #include "Dependencies.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/PackageImpl.h"
-#include "model/PackageIndexImpl.h"
-#include "model/ReleaseImpl.h"
 
 #include <algorithm>
 #include <unordered_set>
@@ -22,40 +18,41 @@ void addOnce(std::vector<std::size_t>& nodes, std::size_t node)
 
 }  // namespace
 
-PackageGraph::PackageGraph(model::PackageIndex const& index)
+template <ElementForm Form> PackageGraph<Form>::PackageGraph(PackageIndex<Form> const& index)
 {
-    for (auto const& [name, package] : index->getPackages())
+    for (Package<Form> const& package : members(index->getPackages()))
     {
         if (!package->hasReleases() || package->getReleases().empty())
             continue;
         m_places.emplace(package.getImpl(), m_nodes.size());
-        m_nodes.push_back({package, isEssential(package), {}, {}});
+        m_nodes.push_back({package, isEssential<Form>(package), {}, {}});
     }
     for (std::size_t node = 0; node < m_nodes.size(); ++node)
         addEdges(node);
 }
 
-void PackageGraph::addEdges(std::size_t user)
+template <ElementForm Form> void PackageGraph<Form>::addEdges(std::size_t user)
 {
-    forEachRelease(m_nodes[user].package, [&](model::Release const& release) {
-        forEachGroup(release, [&](model::DependencyGroup const& group) {
-            if (isSuggestion(group))
+    forEachRelease<Form>(m_nodes[user].package, [&](Release<Form> const& release) {
+        forEachGroup<Form>(release, [&](DependencyGroup<Form> const& group) {
+            if (isSuggestion<Form>(group))
                 return;
-            forEachAlternative(group, [&](model::Alternative const& alternative) {
-                model::Package const target = installedTarget(alternative);
+            bool const strict = isStrict<Form>(group);
+            forEachAlternative<Form>(group, [&](Alternative<Form> const& alternative) {
+                Package<Form> const target = installedTarget<Form>(alternative);
                 if (!target)
                     return;
-                addEdge(user, target, isStrict(group));
-                if (!target->hasProviders())
-                    return;
-                for (model::Release const& provider : target->getProviders())
-                    addEdge(user, provider->getPackage(), isStrict(group));
+                addEdge(user, target, strict);
+                forEachProvider<Form>(target, [&](Release<Form> const& provider) {
+                    addEdge(user, provider->getPackage(), strict);
+                });
             });
         });
     });
 }
 
-void PackageGraph::addEdge(std::size_t user, model::Package const& used, bool strict)
+template <ElementForm Form>
+void PackageGraph<Form>::addEdge(std::size_t user, Package<Form> const& used, bool strict)
 {
     auto const place = m_places.find(used.getImpl());
     if (place == m_places.end() || place->second == user)
@@ -68,15 +65,17 @@ void PackageGraph::addEdge(std::size_t user, model::Package const& used, bool st
         addOnce(m_nodes[user].needs, place->second);
 }
 
-std::vector<model::Package> PackageGraph::removableWith(model::Package const& leaf) const
+template <ElementForm Form>
+std::vector<Package<Form>> PackageGraph<Form>::removableWith(Package<Form> const& leaf) const
 {
-    std::vector<model::Package> result;
+    std::vector<Package<Form>> result;
     for (std::size_t const node : removableWith(m_places.at(leaf.getImpl())))
         result.push_back(m_nodes[node].package);
     return result;
 }
 
-std::vector<std::size_t> PackageGraph::removableWith(std::size_t leaf) const
+template <ElementForm Form>
+std::vector<std::size_t> PackageGraph<Form>::removableWith(std::size_t leaf) const
 {
     std::vector<std::size_t> reached{leaf};
     std::unordered_set<std::size_t> removable{leaf};
@@ -111,9 +110,9 @@ std::vector<std::size_t> PackageGraph::removableWith(std::size_t leaf) const
     return reached;
 }
 
-model::Package PackageGraph::chooseLeaf() const
+template <ElementForm Form> Package<Form> PackageGraph<Form>::chooseLeaf() const
 {
-    model::Package best;
+    Package<Form> best;
     std::size_t bestSize = 0;
     std::size_t tried = 0;
     for (std::size_t node = 0; node < m_nodes.size() && tried < LEAVES_TO_TRY; ++node)
@@ -130,5 +129,8 @@ model::Package PackageGraph::chooseLeaf() const
     }
     return best;
 }
+
+#define DEBIAN_INSTANTIATE(Form) template class PackageGraph<Form>;
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

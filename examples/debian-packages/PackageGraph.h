@@ -1,8 +1,7 @@
 /// \file
 /// Which packages use which, seen from the package that is used.
 #pragma once
-#include "model/Package.h"
-#include "model/PackageIndex.h"
+#include "Forms.h"
 
 #include <cstddef>
 #include <unordered_map>
@@ -17,34 +16,34 @@ namespace debian {
 /// picture of the index when it was made.
 ///
 /// Threads: as the model.
-class PackageGraph
+template <ElementForm Form> class PackageGraph
 {
 public:
-    explicit PackageGraph(model::PackageIndex const& index);
+    explicit PackageGraph(PackageIndex<Form> const& index);
 
     /// A package that no other uses and that is not essential, with those that it needs, directly
     /// or not, and that nobody else uses; itself first. Essential packages are never among them.
-    std::vector<model::Package> removableWith(model::Package const& leaf) const;
+    std::vector<Package<Form>> removableWith(Package<Form> const& leaf) const;
 
     /// Of the first leaves by name, the one with which most can be removed; empty if there is none.
-    model::Package chooseLeaf() const;
+    Package<Form> chooseLeaf() const;
 
 private:
     struct Node
     {
-        model::Package package;
+        Package<Form> package;
         bool essential;
         std::vector<std::size_t> needs;
         std::vector<std::size_t> users;  // without the package itself
     };
 
     void addEdges(std::size_t user);
-    void addEdge(std::size_t user, model::Package const& used, bool strict);
+    void addEdge(std::size_t user, Package<Form> const& used, bool strict);
     bool isLeaf(Node const& node) const { return !node.essential && node.users.empty(); }
     std::vector<std::size_t> removableWith(std::size_t leaf) const;
 
     std::vector<Node> m_nodes;  // by name
-    std::unordered_map<model::Package::Impl*, std::size_t> m_places;
+    std::unordered_map<tarn::kiln::ModelElement::Impl*, std::size_t> m_places;
 };
 
 }  // namespace debian

@@ -1,9 +1,6 @@
 #include "Removal.h"
 
 #include "Dependencies.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/PackageImpl.h"
-#include "model/ReleaseImpl.h"
 
 #include <algorithm>
 
@@ -11,14 +8,14 @@ namespace debian {
 namespace {
 
 /// The package that alone satisfies `group`; empty if there is none, or more than one.
-model::Package onlySatisfier(model::DependencyGroup const& group)
+template <ElementForm Form> Package<Form> onlySatisfier(DependencyGroup<Form> const& group)
 {
-    model::Package only;
-    for (model::Release const& release : satisfiersOf(group))
+    Package<Form> only;
+    for (Release<Form> const& release : satisfiersOf<Form>(group))
     {
-        model::Package const package = release->getPackage();
+        Package<Form> const package = release->getPackage();
         if (only && !(only == package))
-            return model::Package();
+            return {};
         only = package;
     }
     return only;
@@ -26,38 +23,42 @@ model::Package onlySatisfier(model::DependencyGroup const& group)
 
 }  // namespace
 
-void removePackages(std::vector<model::Package> const& packages)
+template <ElementForm Form> void removePackages(std::vector<Package<Form>> const& packages)
 {
-    for (model::Package const& package : packages)
+    for (Package<Form> const& package : packages)
     {
-        std::vector<model::Release> releases;
-        forEachRelease(package,
-                       [&](model::Release const& release) { releases.push_back(release); });
-        for (model::Release const& release : releases)
+        std::vector<Release<Form>> releases;
+        forEachRelease<Form>(package,
+                             [&](Release<Form> const& release) { releases.push_back(release); });
+        for (Release<Form> const& release : releases)
             release->destroy();
     }
-    for (model::Package const& package : packages)
+    for (Package<Form> const& package : packages)
     {
         if (!package->hasProviders() || package->getProviders().empty())
             package->destroy();
     }
 }
 
-model::Package neededByEssential(model::PackageIndex const& index)
+template <ElementForm Form> Package<Form> neededByEssential(PackageIndex<Form> const& index)
 {
-    model::Package found;
-    forEachRelease(index, [&](model::Release const& release) {
+    Package<Form> found;
+    forEachRelease<Form>(index, [&](Release<Form> const& release) {
         if (found || !release->isEssential())
             return;
-        forEachGroup(release, [&](model::DependencyGroup const& group) {
-            if (found || !isStrict(group))
-                return;
-            model::Package const package = onlySatisfier(group);
-            if (package && !isEssential(package))
+        for (DependencyGroup<Form> const& group : strictGroupsOf<Form>(release))
+        {
+            Package<Form> const package = onlySatisfier<Form>(group);
+            if (!found && package && !isEssential<Form>(package))
                 found = package;
-        });
+        }
     });
     return found;
 }
+
+#define DEBIAN_INSTANTIATE(Form)                                                                   \
+    template void removePackages<Form>(std::vector<Package<Form>> const&);                         \
+    template Package<Form> neededByEssential<Form>(PackageIndex<Form> const&);
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

@@ -1,8 +1,7 @@
 /// \file
 /// Takes packages out of an index.
 #pragma once
-#include "model/Package.h"
-#include "model/PackageIndex.h"
+#include "Forms.h"
 
 #include <vector>
 
@@ -10,10 +9,10 @@ namespace debian {
 
 /// Destroys the releases of the packages, and the packages that no release provides then; the
 /// others stay as virtual packages. Must be called in an open transaction.
-void removePackages(std::vector<model::Package> const& packages);
+template <ElementForm Form> void removePackages(std::vector<Package<Form>> const& packages);
 
 /// The first package, by the name of who needs it, that is not essential and without which an
 /// essential release lacks a strict dependency; empty if there is none.
-model::Package neededByEssential(model::PackageIndex const& index);
+template <ElementForm Form> Package<Form> neededByEssential(PackageIndex<Form> const& index);
 
 }  // namespace debian

@@ -1,26 +1,22 @@
 #include "Resolution.h"
 
 #include "Dependencies.h"
-#include "model/AlternativeImpl.h"
-#include "model/DependencyGroupImpl.h"
-#include "model/PackageImpl.h"
-#include "model/ReleaseImpl.h"
 
 #include <set>
 
 namespace debian {
 
-using tarn::kiln::ProxyId;
+using namespace tarn::kiln;
 
-Resolution resolveTargets(model::PackageIndex const& index)
+template <ElementForm Form> Resolution resolveTargets(PackageIndex<Form> const& index)
 {
     std::set<ProxyId> found;
     std::set<ProxyId> notFound;
-    forEachRelease(index, [&](model::Release const& release) {
-        forEachGroup(release, [&](model::DependencyGroup const& group) {
-            forEachAlternative(group, [&](model::Alternative const& alternative) {
-                model::Package const before(alternative->getTargetImpl());
-                if (before.getImpl() && before->isProxy())
+    forEachRelease<Form>(index, [&](Release<Form> const& release) {
+        forEachGroup<Form>(release, [&](DependencyGroup<Form> const& group) {
+            forEachAlternative<Form>(group, [&](Alternative<Form> const& alternative) {
+                ModelElement const before(alternative->getTargetImpl());
+                if (before && before->isProxy())
                     (alternative->getTarget()->isProxy() ? notFound : found)
                         .insert(*before->getProxyId());
             });
@@ -28,5 +24,9 @@ Resolution resolveTargets(model::PackageIndex const& index)
     });
     return {found.size(), notFound.size()};
 }
+
+#define DEBIAN_INSTANTIATE(Form)                                                                   \
+    template Resolution resolveTargets<Form>(PackageIndex<Form> const&);
+DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 
 }  // namespace debian

@@ -1,7 +1,7 @@
 /// \file
 /// Leads dependencies to packages of the other model.
 #pragma once
-#include "model/PackageIndex.h"
+#include "Forms.h"
 
 #include <cstddef>
 
@@ -16,6 +16,6 @@ struct Resolution
 
 /// Resolves the target of each alternative: where it was a proxy for a package that the
 /// constellation has, it is that package afterwards. Counts packages, not alternatives.
-Resolution resolveTargets(model::PackageIndex const& index);
+template <ElementForm Form> Resolution resolveTargets(PackageIndex<Form> const& index);
 
 }  // namespace debian

@@ -11,6 +11,24 @@
 #include <unistd.h>
 #include <vector>
 
+namespace {
+
+template <debian::ElementForm Form> bool run(debian::CommandLine const& commandLine)
+{
+    debian::Demonstration<Form> demonstration(std::cout, std::cerr, isatty(STDERR_FILENO) != 0);
+    bool const equal = demonstration.run(commandLine);
+    if (commandLine.figures)
+        demonstration.figures().write(*commandLine.figures);
+    else
+    {
+        std::cout << "\nFigures\n";
+        demonstration.figures().print(std::cout);
+    }
+    return equal;
+}
+
+}  // namespace
+
 int main(int argumentCount, char** arguments)
 {
     constexpr int USAGE_ERROR = 2;
@@ -23,8 +41,9 @@ int main(int argumentCount, char** arguments)
             std::cout << debian::helpText();
             return EXIT_SUCCESS;
         }
-        debian::Demonstration demonstration(std::cout, std::cerr, isatty(STDERR_FILENO) != 0);
-        return demonstration.run(commandLine) ? EXIT_SUCCESS : EXIT_FAILURE;
+        bool const equal = commandLine.reflective ? run<debian::Reflective>(commandLine)
+                                                  : run<debian::Generated>(commandLine);
+        return equal ? EXIT_SUCCESS : EXIT_FAILURE;
     }
     catch (debian::UsageError const& error)
     {

@@ -34,8 +34,21 @@ TEST(CommandLine, KnowsTheOptionForHelp)
     EXPECT_TRUE(parseCommandLine({"-h"}).wantsHelp);
 }
 
+TEST(CommandLine, KnowsTheOptionsForFormAndFigures)
+{
+    EXPECT_FALSE(parseCommandLine({}).reflective);
+    EXPECT_FALSE(parseCommandLine({}).figures);
+
+    CommandLine const commandLine = parseCommandLine({"--reflective", "one", "--figures", "table"});
+
+    EXPECT_TRUE(commandLine.reflective);
+    EXPECT_EQ(commandLine.figures, "table");
+    EXPECT_EQ(commandLine.file, "one");
+}
+
 TEST(CommandLine, RefusesWhatMakesNoSense)
 {
+    EXPECT_THROW(parseCommandLine({"--figures"}), debian::UsageError);
     EXPECT_THROW(parseCommandLine({"--fast"}), debian::UsageError);
     EXPECT_THROW(parseCommandLine({"a", "b", "c"}), debian::UsageError);
     EXPECT_THROW(parseCommandLine({"-", "-"}), debian::UsageError);

@@ -14,6 +14,7 @@ namespace {
 
 using test::paragraph;
 using testing::AllOf;
+using testing::EndsWith;
 using testing::HasSubstr;
 using testing::Not;
 
@@ -26,16 +27,16 @@ struct Outcome
 };
 
 /// A directory with the files of one case, removed in the end.
-class DebianPackages : public testing::Test
+class FilesOfACase : public testing::Test
 {
 protected:
-    DebianPackages()
+    FilesOfACase()
         : directory(std::filesystem::temp_directory_path() /
                     ("debian-packages-test-" + std::to_string(getpid())))
     {
         std::filesystem::create_directory(directory);
     }
-    ~DebianPackages() override { std::filesystem::remove_all(directory); }
+    ~FilesOfACase() override { std::filesystem::remove_all(directory); }
 
     std::string path(std::string const& name) const { return directory / name; }
     std::string write(std::string const& name, std::string const& text) const
@@ -48,25 +49,39 @@ protected:
         std::ifstream file(path(name), std::ios::binary);
         return std::string(std::istreambuf_iterator<char>(file), {});
     }
-    /// \param arguments  as a shell takes them.
-    Outcome run(std::string const& arguments, std::string const& input = "") const
+    /// \param command  as a shell takes it.
+    Outcome runCommand(std::string const& command, std::string const& input) const
     {
         write("input", input);
-        int const status =
-            test::runProgram({"sh", "-c",
-                              DEBIAN_PACKAGES_PROGRAM " " + arguments + " <" + path("input") +
-                                  " >" + path("output") + " 2>" + path("errors")});
+        int const status = test::runProgram(
+            {"sh", "-c",
+             command + " <" + path("input") + " >" + path("output") + " 2>" + path("errors")});
         return {status, read("output"), read("errors")};
     }
 
     std::filesystem::path directory;
 };
 
+/// Runs the program, its parameter being the option for the form.
+class DebianPackages : public FilesOfACase, public testing::WithParamInterface<std::string>
+{
+protected:
+    Outcome run(std::string const& arguments, std::string const& input = "") const
+    {
+        return runCommand(DEBIAN_PACKAGES_PROGRAM " " + GetParam() + ' ' + arguments, input);
+    }
+};
+
+INSTANTIATE_TEST_SUITE_P(OfBothForms, DebianPackages, testing::Values("", "--reflective"),
+                         [](auto const& form) {
+                             return std::string(form.param.empty() ? "Generated" : "Reflective");
+                         });
+
 std::string const INDEX = paragraph("base", "Essential: yes\nPre-Depends: lib\n") +
                           paragraph("lib") + paragraph("editor", "Depends: spell, lib, gone\n") +
                           paragraph("spell", "Suggests: lost\n");
 
-TEST_F(DebianPackages, RefusesReportsAndTakesBack)
+TEST_P(DebianPackages, RefusesReportsAndTakesBack)
 {
     Outcome const result = run(write("index", INDEX));
 
@@ -85,7 +100,7 @@ TEST_F(DebianPackages, RefusesReportsAndTakesBack)
     EXPECT_THAT(result.output, HasSubstr("  after the undo all 19 elements are as they were\n"));
 }
 
-TEST_F(DebianPackages, EndsWithATableOfFigures)
+TEST_P(DebianPackages, EndsWithATableOfFigures)
 {
     Outcome const result = run(write("index", INDEX));
 
@@ -95,7 +110,7 @@ TEST_F(DebianPackages, EndsWithATableOfFigures)
         EXPECT_THAT(table, HasSubstr(std::string("\n  ") + name + ' ')) << name;
 }
 
-TEST_F(DebianPackages, ReadsStandardInput)
+TEST_P(DebianPackages, ReadsStandardInput)
 {
     Outcome const result = run("-", INDEX);
 
@@ -103,7 +118,7 @@ TEST_F(DebianPackages, ReadsStandardInput)
     EXPECT_THAT(result.output, HasSubstr("standard input: 4 packages with 4 releases"));
 }
 
-TEST_F(DebianPackages, ResolvesMissingPackagesInTheSecondFile)
+TEST_P(DebianPackages, ResolvesMissingPackagesInTheSecondFile)
 {
     Outcome const result =
         run(write("index", INDEX) + ' ' + write("available", paragraph("gone") + paragraph("x")));
@@ -115,7 +130,7 @@ TEST_F(DebianPackages, ResolvesMissingPackagesInTheSecondFile)
     EXPECT_THAT(result.output, HasSubstr("  after the undo all 19 elements are as they were\n"));
 }
 
-TEST_F(DebianPackages, SaysIfThereIsNothingToRefuse)
+TEST_P(DebianPackages, SaysIfThereIsNothingToRefuse)
 {
     Outcome const result = run(write("index", paragraph("a")));
 
@@ -124,7 +139,7 @@ TEST_F(DebianPackages, SaysIfThereIsNothingToRefuse)
     EXPECT_THAT(result.output, HasSubstr("Removing a with what only it needs: 1 packages\n"));
 }
 
-TEST_F(DebianPackages, ReportsAMissingFile)
+TEST_P(DebianPackages, ReportsAMissingFile)
 {
     Outcome const result = run(path("nothing"));
 
@@ -134,7 +149,7 @@ TEST_F(DebianPackages, ReportsAMissingFile)
                                  ": cannot be opened: No such file or directory\n");
 }
 
-TEST_F(DebianPackages, ReportsAnEmptyFile)
+TEST_P(DebianPackages, ReportsAnEmptyFile)
 {
     Outcome const result = run(write("index", ""));
 
@@ -142,7 +157,7 @@ TEST_F(DebianPackages, ReportsAnEmptyFile)
     EXPECT_THAT(result.errors, HasSubstr("debian-packages: " + path("index") + ": "));
 }
 
-TEST_F(DebianPackages, ReportsWhereAFileIsCutOff)
+TEST_P(DebianPackages, ReportsWhereAFileIsCutOff)
 {
     Outcome const result = run(write("index", INDEX + "Package: half\nVersi"));
 
@@ -151,7 +166,7 @@ TEST_F(DebianPackages, ReportsWhereAFileIsCutOff)
     EXPECT_THAT(result.errors, HasSubstr(path("index") + ":22: file ends inside this line"));
 }
 
-TEST_F(DebianPackages, ReportsWhereAFileIsMalformed)
+TEST_P(DebianPackages, ReportsWhereAFileIsMalformed)
 {
     Outcome const result = run("-", INDEX + "Package: a\nnonsense\n");
 
@@ -160,7 +175,7 @@ TEST_F(DebianPackages, ReportsWhereAFileIsMalformed)
               "debian-packages: standard input:22: line has no colon after a field name\n");
 }
 
-TEST_F(DebianPackages, ReportsAMalformedSecondFile)
+TEST_P(DebianPackages, ReportsAMalformedSecondFile)
 {
     Outcome const result = run(write("index", INDEX) + ' ' + write("available", "Package: a\n"));
 
@@ -168,7 +183,7 @@ TEST_F(DebianPackages, ReportsAMalformedSecondFile)
     EXPECT_THAT(result.errors, HasSubstr(path("available") + ":1: "));
 }
 
-TEST_F(DebianPackages, ReportsADirectory)
+TEST_P(DebianPackages, ReportsADirectory)
 {
     Outcome const result = run(directory.string());
 
@@ -176,15 +191,16 @@ TEST_F(DebianPackages, ReportsADirectory)
     EXPECT_THAT(result.errors, HasSubstr(directory.string()));
 }
 
-TEST_F(DebianPackages, ExplainsItself)
+TEST_P(DebianPackages, ExplainsItself)
 {
     Outcome const result = run("--help");
 
     EXPECT_EQ(result.status, 0);
-    EXPECT_THAT(result.output, HasSubstr("Usage: debian-packages [FILE [AVAILABLE]]\n"));
+    EXPECT_THAT(result.output,
+                HasSubstr("Usage: debian-packages [OPTION]... [FILE [AVAILABLE]]\n"));
 }
 
-TEST_F(DebianPackages, RefusesUnknownOptions)
+TEST_P(DebianPackages, RefusesUnknownOptions)
 {
     Outcome const result = run("--fast");
 
@@ -194,11 +210,97 @@ TEST_F(DebianPackages, RefusesUnknownOptions)
                              "Try debian-packages --help\n");
 }
 
-TEST_F(DebianPackages, DrawsNoProgressIntoAFile)
+TEST_P(DebianPackages, DrawsNoProgressIntoAFile)
 {
     Outcome const result = run(write("index", INDEX));
 
     EXPECT_THAT(result.errors, Not(HasSubstr("\r")));
+}
+
+TEST_P(DebianPackages, WritesTheFiguresIntoAFile)
+{
+    Outcome const result = run("--figures " + path("figures") + ' ' + write("index", INDEX));
+
+    EXPECT_EQ(result.status, 0);
+    EXPECT_THAT(result.output, Not(HasSubstr("Figures")));
+    EXPECT_THAT(read("figures"), AllOf(HasSubstr("elements\t19\n"), HasSubstr("\nload\t"),
+                                       HasSubstr("\nundo\t"), EndsWith(" ms\n")));
+}
+
+TEST_P(DebianPackages, ReportsThatTheFiguresCanNotBeWritten)
+{
+    std::string const place = path("no folder/figures");
+
+    Outcome const result = run("--figures '" + place + "' " + write("index", INDEX));
+
+    EXPECT_EQ(result.status, 1);
+    EXPECT_EQ(result.errors, "debian-packages: " + place + ": cannot be written\n");
+}
+
+/// Runs a program in both forms.
+class SideBySide : public FilesOfACase
+{
+protected:
+    Outcome run(std::string const& arguments, std::string const& input = "") const
+    {
+        return runProgram(DEBIAN_PACKAGES_PROGRAM, arguments, input);
+    }
+    Outcome runProgram(std::string const& program, std::string const& arguments,
+                       std::string const& input = "") const
+    {
+        return runCommand(DEBIAN_PACKAGES_SIDE_BY_SIDE " " + program + ' ' + arguments, input);
+    }
+};
+
+TEST_F(SideBySide, PrintsTheResultsOnceAndTheFiguresOfBothForms)
+{
+    Outcome const result = run(write("index", INDEX) + ' ' + write("more", paragraph("gone")));
+
+    EXPECT_EQ(result.status, 0);
+    EXPECT_EQ(result.errors, "");
+    std::size_t const end = result.output.find(" generated  ");
+    ASSERT_NE(end, std::string::npos);
+    std::string const results = result.output.substr(0, end);
+    EXPECT_NE(results.find("Removing editor"), std::string::npos);
+    EXPECT_EQ(results.find("Removing editor"), results.rfind("Removing editor"));
+    EXPECT_THAT(result.output.substr(end),
+                AllOf(testing::ContainsRegex("generated +run-time\n"),
+                      testing::ContainsRegex("\n  elements +19 +19\n"),
+                      testing::ContainsRegex("\n  load +[0-9.]+ ms +[0-9.]+ ms\n")));
+}
+
+TEST_F(SideBySide, GivesStandardInputToBoth)
+{
+    Outcome const result = run("-", INDEX);
+
+    EXPECT_EQ(result.status, 0);
+    EXPECT_THAT(result.output, testing::ContainsRegex("\n  elements +19 +19\n"));
+}
+
+TEST_F(SideBySide, FailsAsTheProgramDoes)
+{
+    Outcome const malformed = run("-", INDEX + "nonsense\n");
+    Outcome const misused = run("--fast");
+
+    EXPECT_EQ(malformed.status, 1);
+    EXPECT_EQ(malformed.output, "");
+    EXPECT_EQ(malformed.errors,
+              "debian-packages: standard input:21: line has no colon after a field name\n");
+    EXPECT_EQ(misused.status, 2);
+}
+
+TEST_F(SideBySide, FailsIfTheResultsDiffer)
+{
+    std::string const program =
+        write("program", "#!/bin/sh\nprintf 'load\\t1 ms\\n' > \"$2\"\necho \"$3\"\n");
+
+    std::filesystem::permissions(program, std::filesystem::perms::owner_all);
+
+    Outcome const result = runProgram(program, "index");
+
+    EXPECT_EQ(result.status, 1);
+    EXPECT_THAT(result.errors, AllOf(HasSubstr("the forms have different results"),
+                                     HasSubstr("\n-index\n"), HasSubstr("\n+--reflective\n")));
 }
 
 }  // namespace

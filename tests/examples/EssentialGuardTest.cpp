@@ -11,28 +11,29 @@
 namespace {
 
 using namespace tarn::kiln;
-using debian::EssentialGuard;
 using debian::ModelSnapshot;
 using test::paragraph;
 
 /// An index under guard.
-class GuardedModel : public test::LoadedModel
+template <test::ElementForm Form> class GuardedModel : public test::LoadedModel<Form>
 {
 public:
-    explicit GuardedModel(std::string const& text) : LoadedModel(text), guard(loaded.index)
+    explicit GuardedModel(std::string const& text)
+        : test::LoadedModel<Form>(text),
+          guard(this->loaded.index)
     {
-        model->addListener(&guard);
+        this->model->addListener(&guard);
     }
-    ~GuardedModel() { model->removeListener(&guard); }
+    ~GuardedModel() { this->model->removeListener(&guard); }
 
     TransactionResult remove(ustring const& name)
     {
-        Transaction const transaction = model->beginTransaction(/*revertible=*/true);
-        debian::removePackages({package(name)});
+        Transaction const transaction = this->model->beginTransaction(/*revertible=*/true);
+        debian::removePackages<Form>({this->package(name)});
         return transaction.commit();
     }
 
-    EssentialGuard guard;
+    debian::EssentialGuard<Form> guard;
 };
 
 std::string essential(std::string const& name, std::string const& fields)
@@ -40,11 +41,15 @@ std::string essential(std::string const& name, std::string const& fields)
     return paragraph(name, "Essential: yes\n" + fields);
 }
 
-TEST(EssentialGuard, RefusesToRemoveWhatAnEssentialPackageNeeds)
+template <class Form> class EssentialGuardTest : public testing::Test
+{};
+TYPED_TEST_SUITE(EssentialGuardTest, test::BothForms, test::FormName);
+
+TYPED_TEST(EssentialGuardTest, RefusesToRemoveWhatAnEssentialPackageNeeds)
 {
     for (std::string const kind : {"Depends", "Pre-Depends"})
     {
-        GuardedModel index(essential("base", kind + ": lib\n") + paragraph("lib"));
+        GuardedModel<TypeParam> index(essential("base", kind + ": lib\n") + paragraph("lib"));
         ModelSnapshot const before(index.model);
 
         EXPECT_EQ(index.remove(u"lib"), TransactionResult::RolledBack);
@@ -56,75 +61,76 @@ TEST(EssentialGuard, RefusesToRemoveWhatAnEssentialPackageNeeds)
     }
 }
 
-TEST(EssentialGuard, RefusesToRemoveWhatIsNeededIndirectly)
+TYPED_TEST(EssentialGuardTest, RefusesToRemoveWhatIsNeededIndirectly)
 {
-    GuardedModel index(essential("base", "Depends: lib\n") + paragraph("lib", "Depends: core\n") +
-                       paragraph("core"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: lib\n") +
+                                  paragraph("lib", "Depends: core\n") + paragraph("core"));
 
     EXPECT_EQ(index.remove(u"core"), TransactionResult::RolledBack);
     EXPECT_EQ(index.guard.reason(), "lib 1 all has nothing left for Depends: core");
 }
 
-TEST(EssentialGuard, RefusesToRemoveAnEssentialPackage)
+TYPED_TEST(EssentialGuardTest, RefusesToRemoveAnEssentialPackage)
 {
-    GuardedModel index(essential("base", ""));
+    GuardedModel<TypeParam> index(essential("base", ""));
 
     EXPECT_EQ(index.remove(u"base"), TransactionResult::RolledBack);
     EXPECT_EQ(index.guard.reason(), "base 1 all is essential");
 }
 
-TEST(EssentialGuard, AllowsToRemoveWhatIsOnlyRecommended)
+TYPED_TEST(EssentialGuardTest, AllowsToRemoveWhatIsOnlyRecommended)
 {
-    GuardedModel index(essential("base", "Recommends: nice\nSuggests: nicer\n") +
-                       paragraph("nice") + paragraph("nicer"));
+    GuardedModel<TypeParam> index(essential("base", "Recommends: nice\nSuggests: nicer\n") +
+                                  paragraph("nice") + paragraph("nicer"));
 
     EXPECT_EQ(index.remove(u"nice"), TransactionResult::Committed);
     EXPECT_EQ(index.remove(u"nicer"), TransactionResult::Committed);
     EXPECT_EQ(index.guard.reason(), "");
 }
 
-TEST(EssentialGuard, AllowsToRemoveOneOfTwoAlternatives)
+TYPED_TEST(EssentialGuardTest, AllowsToRemoveOneOfTwoAlternatives)
 {
-    GuardedModel index(essential("base", "Depends: one | two\n") + paragraph("one") +
-                       paragraph("two"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: one | two\n") + paragraph("one") +
+                                  paragraph("two"));
 
     EXPECT_EQ(index.remove(u"one"), TransactionResult::Committed);
     EXPECT_EQ(index.remove(u"two"), TransactionResult::RolledBack);
 }
 
-TEST(EssentialGuard, AllowsToBreakAnAlternativeThatIsNotUsed)
+TYPED_TEST(EssentialGuardTest, AllowsToBreakAnAlternativeThatIsNotUsed)
 {
-    GuardedModel index(essential("base", "Depends: one | two\n") + paragraph("one") +
-                       paragraph("two", "Depends: lib\n") + paragraph("lib"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: one | two\n") + paragraph("one") +
+                                  paragraph("two", "Depends: lib\n") + paragraph("lib"));
 
     EXPECT_EQ(index.remove(u"lib"), TransactionResult::Committed);
     EXPECT_EQ(index.remove(u"one"), TransactionResult::RolledBack);
 }
 
-TEST(EssentialGuard, TakesAProviderForThePackage)
+TYPED_TEST(EssentialGuardTest, TakesAProviderForThePackage)
 {
-    GuardedModel index(essential("base", "Depends: awk\n") + paragraph("mawk", "Provides: awk\n") +
-                       paragraph("gawk", "Provides: awk\n"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: awk\n") +
+                                  paragraph("mawk", "Provides: awk\n") +
+                                  paragraph("gawk", "Provides: awk\n"));
 
     EXPECT_EQ(index.remove(u"mawk"), TransactionResult::Committed);
     EXPECT_EQ(index.remove(u"gawk"), TransactionResult::RolledBack);
 }
 
-TEST(EssentialGuard, KeepsAPackageThatAnotherOneProvides)
+TYPED_TEST(EssentialGuardTest, KeepsAPackageThatAnotherOneProvides)
 {
-    GuardedModel index(essential("base", "Depends: awk\n") + paragraph("awk") +
-                       paragraph("gawk", "Provides: awk\n"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: awk\n") + paragraph("awk") +
+                                  paragraph("gawk", "Provides: awk\n"));
 
     EXPECT_EQ(index.remove(u"awk"), TransactionResult::Committed);
     EXPECT_TRUE(index.package(u"awk"));
     EXPECT_EQ(index.remove(u"gawk"), TransactionResult::RolledBack);
 }
 
-TEST(EssentialGuard, ComparesVersions)
+TYPED_TEST(EssentialGuardTest, ComparesVersions)
 {
-    GuardedModel index(essential("base", "Depends: lib (>= 2)\n") +
-                       "Package: lib\nVersion: 1\nArchitecture: all\n\n"
-                       "Package: lib\nVersion: 2.1\nArchitecture: all\n");
+    GuardedModel<TypeParam> index(essential("base", "Depends: lib (>= 2)\n") +
+                                  "Package: lib\nVersion: 1\nArchitecture: all\n\n"
+                                  "Package: lib\nVersion: 2.1\nArchitecture: all\n");
     auto const remove = [&](ustring const& label) {
         Transaction const transaction = index.model->beginTransaction(/*revertible=*/true);
         index.package(u"lib")->getReleases().find(label)->destroy();
@@ -135,27 +141,28 @@ TEST(EssentialGuard, ComparesVersions)
     EXPECT_EQ(remove(u"1 all"), TransactionResult::Committed);
 }
 
-TEST(EssentialGuard, LetsPackagesThatNeedEachOtherWork)
+TYPED_TEST(EssentialGuardTest, LetsPackagesThatNeedEachOtherWork)
 {
-    GuardedModel index(essential("base", "Depends: one\n") + paragraph("one", "Depends: two\n") +
-                       paragraph("two", "Depends: one\n") + paragraph("other"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: one\n") +
+                                  paragraph("one", "Depends: two\n") +
+                                  paragraph("two", "Depends: one\n") + paragraph("other"));
 
     EXPECT_EQ(index.remove(u"other"), TransactionResult::Committed);
     EXPECT_EQ(index.remove(u"two"), TransactionResult::RolledBack);
 }
 
-TEST(EssentialGuard, IgnoresWhatLackedFromTheStart)
+TYPED_TEST(EssentialGuardTest, IgnoresWhatLackedFromTheStart)
 {
-    GuardedModel index(essential("base", "Depends: gone, lib\n") + paragraph("lib") +
-                       paragraph("other"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: gone, lib\n") + paragraph("lib") +
+                                  paragraph("other"));
 
     EXPECT_EQ(index.remove(u"other"), TransactionResult::Committed);
     EXPECT_EQ(index.remove(u"lib"), TransactionResult::RolledBack);
 }
 
-TEST(EssentialGuard, RefusesAVersionThatNoLongerFits)
+TYPED_TEST(EssentialGuardTest, RefusesAVersionThatNoLongerFits)
 {
-    GuardedModel index(essential("base", "Depends: lib (= 1)\n") + paragraph("lib"));
+    GuardedModel<TypeParam> index(essential("base", "Depends: lib (= 1)\n") + paragraph("lib"));
     ModelSnapshot const before(index.model);
 
     Transaction const transaction = index.model->beginTransaction(/*revertible=*/true);
@@ -165,20 +172,24 @@ TEST(EssentialGuard, RefusesAVersionThatNoLongerFits)
     EXPECT_EQ(ModelSnapshot(index.model), before);
 }
 
-TEST(NeededByEssential, FindsThePackageThatAloneSatisfiesIt)
-{
-    test::LoadedModel const index(essential("base", "Depends: one | two, base2, lib\n") +
-                                  essential("base2", "") + paragraph("one") + paragraph("two") +
-                                  paragraph("lib"));
+template <class Form> class NeededByEssential : public testing::Test
+{};
+TYPED_TEST_SUITE(NeededByEssential, test::BothForms, test::FormName);
 
-    EXPECT_EQ(debian::neededByEssential(index.loaded.index), index.package(u"lib"));
+TYPED_TEST(NeededByEssential, FindsThePackageThatAloneSatisfiesIt)
+{
+    test::LoadedModel<TypeParam> const index(essential("base", "Depends: one | two, base2, lib\n") +
+                                             essential("base2", "") + paragraph("one") +
+                                             paragraph("two") + paragraph("lib"));
+
+    EXPECT_EQ(debian::neededByEssential<TypeParam>(index.loaded.index), index.package(u"lib"));
 }
 
-TEST(NeededByEssential, IsEmptyIfAllCanGo)
+TYPED_TEST(NeededByEssential, IsEmptyIfAllCanGo)
 {
-    test::LoadedModel const index(paragraph("a", "Depends: b\n") + paragraph("b"));
+    test::LoadedModel<TypeParam> const index(paragraph("a", "Depends: b\n") + paragraph("b"));
 
-    EXPECT_FALSE(debian::neededByEssential(index.loaded.index));
+    EXPECT_FALSE(debian::neededByEssential<TypeParam>(index.loaded.index));
 }
 
 }  // namespace

@@ -1,8 +1,6 @@
 #include "Loader.h"
 
 #include "ModelSnapshot.h"
-#include "model/AlternativeImpl.h"
-#include "model/DependencyGroupImpl.h"
 #include "reader/ReadError.h"
 #include "tarnkiln/kernel/ListenerHolder.h"
 #include "tarnkiln/kernel/Transaction.h"
@@ -17,35 +15,34 @@
 namespace {
 
 using namespace tarn::kiln;
-using debian::LoadResult;
 using debian::ModelSnapshot;
+using test::ElementForm;
 using test::LoadedModel;
 using test::paragraph;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-debian::model::Alternative alternativeOf(LoadedModel const& loaded, ustring const& package,
-                                         std::size_t group, std::size_t place)
-{
-    return loaded.release(package)->getGroups().at(group)->getAlternatives().at(place);
-}
-
 /// Loads a text that is expected to fail.
-class FailingLoad
+template <ElementForm Form> class FailingLoad
 {
 public:
     explicit FailingLoad(Model const& model) : m_model(model) {}
-    void operator()(std::string const& text) const { test::loadText(m_model, text); }
+    void operator()(std::string const& text) const { test::loadText<Form>(m_model, text); }
 
 private:
     Model m_model;
 };
 
-TEST(Loader, KeepsWhatTheParagraphSays)
+template <class Form> class LoaderTest : public testing::Test
+{};
+TYPED_TEST_SUITE(LoaderTest, test::BothForms, test::FormName);
+
+TYPED_TEST(LoaderTest, KeepsWhatTheParagraphSays)
 {
-    LoadedModel const loaded("Package: tool\nVersion: 1:2.0-3\nArchitecture: amd64\n"
-                             "Section: utils\nMaintainer: J\xC3\xBCrgen <j@example.org>\n"
-                             "Installed-Size: 12\nEssential: yes\nDescription: does it\n more\n");
+    LoadedModel<TypeParam> const loaded(
+        "Package: tool\nVersion: 1:2.0-3\nArchitecture: amd64\n"
+        "Section: utils\nMaintainer: J\xC3\xBCrgen <j@example.org>\n"
+        "Installed-Size: 12\nEssential: yes\nDescription: does it\n more\n");
 
     auto const release = loaded.release(u"tool");
 
@@ -60,24 +57,24 @@ TEST(Loader, KeepsWhatTheParagraphSays)
     EXPECT_EQ(release->getPackage(), loaded.package(u"tool"));
 }
 
-TEST(Loader, KeepsReleasesOfAPackageApart)
+TYPED_TEST(LoaderTest, KeepsReleasesOfAPackageApart)
 {
-    LoadedModel const loaded("Package: a\nVersion: 1\nArchitecture: amd64\n\n"
-                             "Package: a\nVersion: 1\nArchitecture: i386\n\n"
-                             "Package: a\nVersion: 2\nArchitecture: amd64\n");
+    LoadedModel<TypeParam> const loaded("Package: a\nVersion: 1\nArchitecture: amd64\n\n"
+                                        "Package: a\nVersion: 1\nArchitecture: i386\n\n"
+                                        "Package: a\nVersion: 2\nArchitecture: amd64\n");
 
     std::vector<ustring> labels;
-    for (auto const& [label, release] : loaded.package(u"a")->getReleases())
-        labels.push_back(label);
+    for (auto const& release : debian::members(loaded.package(u"a")->getReleases()))
+        labels.push_back(release->getLabel());
 
     EXPECT_THAT(labels, ElementsAre(u"1 amd64", u"1 i386", u"2 amd64"));
     EXPECT_EQ(loaded.loaded.index->getPackages().size(), 1u);
 }
 
-TEST(Loader, CountsARepeatedReleaseAndKeepsTheFirst)
+TYPED_TEST(LoaderTest, CountsARepeatedReleaseAndKeepsTheFirst)
 {
-    LoadedModel const loaded(paragraph("a", "Section: first\nDepends: a\n") +
-                             paragraph("a", "Section: second\nDepends: b\n"));
+    LoadedModel<TypeParam> const loaded(paragraph("a", "Section: first\nDepends: a\n") +
+                                        paragraph("a", "Section: second\nDepends: b\n"));
 
     EXPECT_EQ(loaded.loaded.releases, 1u);
     EXPECT_EQ(loaded.loaded.repeated, 1u);
@@ -85,53 +82,55 @@ TEST(Loader, CountsARepeatedReleaseAndKeepsTheFirst)
     EXPECT_THAT(loaded.loaded.missing, IsEmpty());
 }
 
-TEST(Loader, KeepsDependenciesInTheirOrder)
+TYPED_TEST(LoaderTest, KeepsDependenciesInTheirOrder)
 {
-    LoadedModel const loaded(paragraph("a", "Depends: b (>= 2) | c, d\nPre-Depends: e\n"
-                                            "Recommends: f\nSuggests: g\nConflicts: h\n"));
+    LoadedModel<TypeParam> const loaded(paragraph("a",
+                                                  "Depends: b (>= 2) | c, d\nPre-Depends: e\n"
+                                                  "Recommends: f\nSuggests: g\nConflicts: h\n"));
 
     std::vector<ustring> kinds;
-    for (auto const& group : loaded.release(u"a")->getGroups())
+    for (auto const& group : debian::members(loaded.release(u"a")->getGroups()))
         kinds.push_back(group->getKind());
 
     EXPECT_THAT(kinds,
                 ElementsAre(u"Pre-Depends", u"Depends", u"Depends", u"Recommends", u"Suggests"));
     EXPECT_EQ(loaded.loaded.groups, 5u);
     EXPECT_EQ(loaded.loaded.alternatives, 6u);
-    EXPECT_EQ(alternativeOf(loaded, u"a", 1, 0)->getRelation(), u">=");
-    EXPECT_EQ(alternativeOf(loaded, u"a", 1, 0)->getBound(), u"2");
-    EXPECT_EQ(alternativeOf(loaded, u"a", 1, 1)->getRelation(), u"");
+    EXPECT_EQ(loaded.alternative(u"a", 1, 0)->getRelation(), u">=");
+    EXPECT_EQ(loaded.alternative(u"a", 1, 0)->getBound(), u"2");
+    EXPECT_EQ(loaded.alternative(u"a", 1, 1)->getRelation(), u"");
     EXPECT_THAT(loaded.loaded.missing, ElementsAre("b", "c", "d", "e", "f", "g"));
 }
 
-TEST(Loader, FindsPackagesBeforeAndBehindTheirUsers)
+TYPED_TEST(LoaderTest, FindsPackagesBeforeAndBehindTheirUsers)
 {
-    LoadedModel const loaded(paragraph("a") + paragraph("b", "Depends: a, c\n") + paragraph("c"));
+    LoadedModel<TypeParam> const loaded(paragraph("a") + paragraph("b", "Depends: a, c\n") +
+                                        paragraph("c"));
 
-    EXPECT_EQ(alternativeOf(loaded, u"b", 0, 0)->getTarget(), loaded.package(u"a"));
-    EXPECT_EQ(alternativeOf(loaded, u"b", 1, 0)->getTarget(), loaded.package(u"c"));
+    EXPECT_EQ(loaded.alternative(u"b", 0, 0)->getTarget(), loaded.package(u"a"));
+    EXPECT_EQ(loaded.alternative(u"b", 1, 0)->getTarget(), loaded.package(u"c"));
     EXPECT_THAT(loaded.loaded.missing, IsEmpty());
 }
 
-TEST(Loader, MakesOneProxyForEachMissingName)
+TYPED_TEST(LoaderTest, MakesOneProxyForEachMissingName)
 {
-    LoadedModel const loaded(paragraph("a", "Depends: gone | other\n") +
-                             paragraph("b", "Depends: gone\n"));
+    LoadedModel<TypeParam> const loaded(paragraph("a", "Depends: gone | other\n") +
+                                        paragraph("b", "Depends: gone\n"));
 
-    auto* const target = alternativeOf(loaded, u"a", 0, 0)->getTargetImpl();
+    auto* const target = loaded.alternative(u"a", 0, 0)->getTargetImpl();
 
     ASSERT_TRUE(target->isProxy());
     EXPECT_EQ(target->getProxyId()->getModelId().value_or(u""), u"packages:available");
-    EXPECT_EQ(alternativeOf(loaded, u"b", 0, 0)->getTargetImpl(), target);
-    EXPECT_NE(alternativeOf(loaded, u"a", 0, 1)->getTargetImpl(), target);
+    EXPECT_EQ(loaded.alternative(u"b", 0, 0)->getTargetImpl(), target);
+    EXPECT_NE(loaded.alternative(u"a", 0, 1)->getTargetImpl(), target);
     EXPECT_THAT(loaded.loaded.missing, ElementsAre("gone", "other"));
     EXPECT_FALSE(loaded.package(u"gone"));
 }
 
-TEST(Loader, MakesVirtualPackagesOfWhatIsProvided)
+TYPED_TEST(LoaderTest, MakesVirtualPackagesOfWhatIsProvided)
 {
-    LoadedModel const loaded(paragraph("a", "Provides: mail, post (= 2)\n") +
-                             paragraph("b", "Provides: mail\nDepends: mail\n"));
+    LoadedModel<TypeParam> const loaded(paragraph("a", "Provides: mail, post (= 2)\n") +
+                                        paragraph("b", "Provides: mail\nDepends: mail\n"));
 
     auto const mail = loaded.package(u"mail");
 
@@ -141,56 +140,56 @@ TEST(Loader, MakesVirtualPackagesOfWhatIsProvided)
     EXPECT_EQ(mail->getProviders().at(0), loaded.release(u"a"));
     EXPECT_EQ(mail->getProviders().at(1), loaded.release(u"b"));
     EXPECT_EQ(loaded.release(u"a")->getProvides().at(1), loaded.package(u"post"));
-    EXPECT_EQ(alternativeOf(loaded, u"b", 0, 0)->getTarget(), mail);
+    EXPECT_EQ(loaded.alternative(u"b", 0, 0)->getTarget(), mail);
 }
 
-TEST(Loader, GivesTheSameIdentifiersEachTime)
+TYPED_TEST(LoaderTest, GivesTheSameIdentifiersEachTime)
 {
     std::string const text = paragraph("a", "Depends: b | c, d\nProvides: v\n") + paragraph("b");
-    LoadedModel const first(text);
-    LoadedModel const second(text);
+    LoadedModel<TypeParam> const first(text);
+    LoadedModel<TypeParam> const second(text);
 
     EXPECT_EQ(ModelSnapshot(first.model), ModelSnapshot(second.model));
 }
 
-TEST(Loader, LeavesAConsistentModel)
+TYPED_TEST(LoaderTest, LeavesAConsistentModel)
 {
-    LoadedModel const loaded(paragraph("a", "Depends: b | gone, d\nProvides: v\n") +
-                             paragraph("b", "Provides: v, d\n"));
+    LoadedModel<TypeParam> const loaded(paragraph("a", "Depends: b | gone, d\nProvides: v\n") +
+                                        paragraph("b", "Provides: v, d\n"));
 
     EXPECT_THAT(loaded.model->checkInvariants(), IsEmpty());
 }
 
-TEST(Loader, TellsOfItsProgress)
+TYPED_TEST(LoaderTest, TellsOfItsProgress)
 {
     std::string const text = paragraph("a") + paragraph("b");
     std::istringstream stream(text);
     debian::ControlFile file(stream, "index");
     std::vector<std::size_t> calls;
+    debian::Loader<TypeParam> loader(Model::create(ModelConstellation()));
 
-    debian::Loader(Model::create(ModelConstellation())).load(file, [&](std::size_t bytes) {
-        calls.push_back(bytes);
-    });
+    loader.load(file, [&](std::size_t bytes) { calls.push_back(bytes); });
 
     EXPECT_THAT(calls, ElementsAre(text.size(), text.size()));
 }
 
-class LoaderFailure : public testing::Test
+template <class Form> class LoaderFailure : public testing::Test
 {
 protected:
     LoaderFailure() : model(Model::create(ModelConstellation()))
     {
-        stranger = debian::model::Package::create(model);
+        stranger = debian::Package<Form>::create(model);
         stranger->setName(u"stranger");
     }
 
     Model model;
-    debian::model::Package stranger;
+    debian::Package<Form> stranger;
 };
+TYPED_TEST_SUITE(LoaderFailure, test::BothForms, test::FormName);
 
-TEST_F(LoaderFailure, LeavesTheModelAsItWas)
+TYPED_TEST(LoaderFailure, LeavesTheModelAsItWas)
 {
-    ModelSnapshot const before(model);
+    ModelSnapshot const before(this->model);
     std::string const good = paragraph("a", "Depends: b\nProvides: c\n");
     std::string const texts[] = {"", good + "Package: cut", good + "no colon\n",
                                  good + "Package: b\nVersion: 1\n",
@@ -198,28 +197,28 @@ TEST_F(LoaderFailure, LeavesTheModelAsItWas)
 
     for (std::string const& text : texts)
     {
-        test::errorOf(FailingLoad(model), text);
+        test::errorOf(FailingLoad<TypeParam>(this->model), text);
 
-        EXPECT_EQ(ModelSnapshot(model), before) << text;
-        EXPECT_THAT(model->checkInvariants(), IsEmpty()) << text;
+        EXPECT_EQ(ModelSnapshot(this->model), before) << text;
+        EXPECT_THAT(this->model->checkInvariants(), IsEmpty()) << text;
     }
-    EXPECT_EQ(model->getElementCount(), 1u);
+    EXPECT_EQ(this->model->getElementCount(), 1u);
 }
 
-TEST_F(LoaderFailure, NamesFileLineAndReason)
+TYPED_TEST(LoaderFailure, NamesFileLineAndReason)
 {
-    EXPECT_EQ(test::errorOf(FailingLoad(model), paragraph("a") + "nonsense\n"),
+    EXPECT_EQ(test::errorOf(FailingLoad<TypeParam>(this->model), paragraph("a") + "nonsense\n"),
               "index:5: line has no colon after a field name");
 }
 
-TEST_F(LoaderFailure, LetsTheNextLoadSucceed)
+TYPED_TEST(LoaderFailure, LetsTheNextLoadSucceed)
 {
-    test::errorOf(FailingLoad(model), paragraph("a") + "nonsense\n");
+    test::errorOf(FailingLoad<TypeParam>(this->model), paragraph("a") + "nonsense\n");
 
-    LoadResult const loaded = test::loadText(model, paragraph("a"));
+    auto const loaded = test::loadText<TypeParam>(this->model, paragraph("a"));
 
     EXPECT_EQ(loaded.releases, 1u);
-    EXPECT_THAT(model->checkInvariants(), IsEmpty());
+    EXPECT_THAT(this->model->checkInvariants(), IsEmpty());
 }
 
 /// Refuses everything.
@@ -229,16 +228,16 @@ public:
     bool transactionValidating(ReportData& /*report*/) { return false; }
 };
 
-TEST_F(LoaderFailure, IsRaisedIfAListenerRefusesTheIndex)
+TYPED_TEST(LoaderFailure, IsRaisedIfAListenerRefusesTheIndex)
 {
-    ModelSnapshot const before(model);
+    ModelSnapshot const before(this->model);
     Refuser refuser;
-    model->addListener(&refuser);
+    this->model->addListener(&refuser);
 
-    EXPECT_THROW(test::loadText(model, paragraph("a")), std::runtime_error);
+    EXPECT_THROW(test::loadText<TypeParam>(this->model, paragraph("a")), std::runtime_error);
 
-    model->removeListener(&refuser);
-    EXPECT_EQ(ModelSnapshot(model), before);
+    this->model->removeListener(&refuser);
+    EXPECT_EQ(ModelSnapshot(this->model), before);
 }
 
 }  // namespace

@@ -14,84 +14,92 @@ using test::paragraph;
 using testing::ElementsAre;
 using testing::UnorderedElementsAre;
 
-std::vector<std::string> removableWith(LoadedModel const& index, tarn::kiln::ustring const& leaf)
+template <test::ElementForm Form>
+std::vector<std::string> removableWith(LoadedModel<Form> const& index,
+                                       tarn::kiln::ustring const& leaf)
 {
     std::vector<std::string> names;
-    for (auto const& package : PackageGraph(index.loaded.index).removableWith(index.package(leaf)))
-        names.push_back(debian::textOf(package));
+    for (auto const& package :
+         PackageGraph<Form>(index.loaded.index).removableWith(index.package(leaf)))
+        names.push_back(debian::textOf<Form>(package));
     return names;
 }
 
-TEST(PackageGraph, RemovesWhatOnlyTheLeafNeeds)
+template <class Form> class PackageGraphTest : public testing::Test
+{};
+TYPED_TEST_SUITE(PackageGraphTest, test::BothForms, test::FormName);
+
+TYPED_TEST(PackageGraphTest, RemovesWhatOnlyTheLeafNeeds)
 {
-    LoadedModel const index(paragraph("leaf", "Depends: own, shared\n") +
-                            paragraph("own", "Pre-Depends: deep\n") + paragraph("deep") +
-                            paragraph("shared", "Depends: below\n") + paragraph("below") +
-                            paragraph("other", "Depends: shared\n"));
+    LoadedModel<TypeParam> const index(
+        paragraph("leaf", "Depends: own, shared\n") + paragraph("own", "Pre-Depends: deep\n") +
+        paragraph("deep") + paragraph("shared", "Depends: below\n") + paragraph("below") +
+        paragraph("other", "Depends: shared\n"));
 
     EXPECT_THAT(removableWith(index, u"leaf"), ElementsAre("leaf", "own", "deep"));
 }
 
-TEST(PackageGraph, KeepsWhatOthersRecommend)
+TYPED_TEST(PackageGraphTest, KeepsWhatOthersRecommend)
 {
-    LoadedModel const index(paragraph("leaf", "Depends: liked, named\n") + paragraph("liked") +
-                            paragraph("named") +
-                            paragraph("other", "Recommends: liked\nSuggests: named\n"));
+    LoadedModel<TypeParam> const index(paragraph("leaf", "Depends: liked, named\n") +
+                                       paragraph("liked") + paragraph("named") +
+                                       paragraph("other", "Recommends: liked\nSuggests: named\n"));
 
     EXPECT_THAT(removableWith(index, u"leaf"), ElementsAre("leaf", "named"));
 }
 
-TEST(PackageGraph, RemovesPackagesThatNeedEachOther)
+TYPED_TEST(PackageGraphTest, RemovesPackagesThatNeedEachOther)
 {
-    LoadedModel const index(paragraph("leaf", "Depends: one\n") +
-                            paragraph("one", "Depends: two\n") +
-                            paragraph("two", "Depends: one\n"));
+    LoadedModel<TypeParam> const index(paragraph("leaf", "Depends: one\n") +
+                                       paragraph("one", "Depends: two\n") +
+                                       paragraph("two", "Depends: one\n"));
 
     EXPECT_THAT(removableWith(index, u"leaf"), UnorderedElementsAre("leaf", "one", "two"));
 }
 
-TEST(PackageGraph, KeepsACircleThatIsUsedFromOutside)
+TYPED_TEST(PackageGraphTest, KeepsACircleThatIsUsedFromOutside)
 {
-    LoadedModel const index(
+    LoadedModel<TypeParam> const index(
         paragraph("leaf", "Depends: one\n") + paragraph("one", "Depends: two\n") +
         paragraph("two", "Depends: one\n") + paragraph("other", "Depends: two\n"));
 
     EXPECT_THAT(removableWith(index, u"leaf"), ElementsAre("leaf"));
 }
 
-TEST(PackageGraph, FollowsProviders)
+TYPED_TEST(PackageGraphTest, FollowsProviders)
 {
-    LoadedModel const index(
+    LoadedModel<TypeParam> const index(
         paragraph("leaf", "Depends: mail\n") + paragraph("exim", "Provides: mail\n") +
         paragraph("postfix", "Provides: mail\n") + paragraph("other", "Depends: postfix\n"));
 
     EXPECT_THAT(removableWith(index, u"leaf"), ElementsAre("leaf", "exim"));
 }
 
-TEST(PackageGraph, KeepsEssentialPackages)
+TYPED_TEST(PackageGraphTest, KeepsEssentialPackages)
 {
-    LoadedModel const index(paragraph("leaf", "Depends: base\n") +
-                            paragraph("base", "Essential: yes\n"));
+    LoadedModel<TypeParam> const index(paragraph("leaf", "Depends: base\n") +
+                                       paragraph("base", "Essential: yes\n"));
 
     EXPECT_THAT(removableWith(index, u"leaf"), ElementsAre("leaf"));
 }
 
-TEST(PackageGraph, ChoosesTheLeafWithWhichMostCanGo)
+TYPED_TEST(PackageGraphTest, ChoosesTheLeafWithWhichMostCanGo)
 {
-    LoadedModel const index(paragraph("alone") + paragraph("big", "Depends: one, two\n") +
-                            paragraph("one") + paragraph("two") +
-                            paragraph("small", "Depends: x\n") + paragraph("x"));
+    LoadedModel<TypeParam> const index(
+        paragraph("alone") + paragraph("big", "Depends: one, two\n") + paragraph("one") +
+        paragraph("two") + paragraph("small", "Depends: x\n") + paragraph("x"));
 
-    EXPECT_EQ(debian::textOf(PackageGraph(index.loaded.index).chooseLeaf()), "big");
+    EXPECT_EQ(debian::textOf<TypeParam>(PackageGraph<TypeParam>(index.loaded.index).chooseLeaf()),
+              "big");
 }
 
-TEST(PackageGraph, HasNoLeafIfAllAreUsedOrEssential)
+TYPED_TEST(PackageGraphTest, HasNoLeafIfAllAreUsedOrEssential)
 {
-    LoadedModel const index(paragraph("base", "Essential: yes\n") +
-                            paragraph("one", "Depends: two\n") +
-                            paragraph("two", "Depends: one\n"));
+    LoadedModel<TypeParam> const index(paragraph("base", "Essential: yes\n") +
+                                       paragraph("one", "Depends: two\n") +
+                                       paragraph("two", "Depends: one\n"));
 
-    EXPECT_FALSE(PackageGraph(index.loaded.index).chooseLeaf());
+    EXPECT_FALSE(PackageGraph<TypeParam>(index.loaded.index).chooseLeaf());
 }
 
 }  // namespace

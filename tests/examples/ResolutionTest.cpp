@@ -1,8 +1,6 @@
 #include "Resolution.h"
 
 #include "ModelSnapshot.h"
-#include "model/AlternativeImpl.h"
-#include "model/DependencyGroupImpl.h"
 #include "tarnkiln/kernel/ModelConstellationImpl.h"
 #include "tests/examples/LoadText.h"
 
@@ -17,45 +15,49 @@ using test::paragraph;
 std::string const TEXT = paragraph("a", "Depends: here | there, nowhere\n") +
                          paragraph("b", "Depends: there, a\n") + paragraph("here");
 
-debian::LoadResult loadAvailable(LoadedModel const& index, std::string const& text)
+template <test::ElementForm Form>
+debian::LoadResult<Form> loadAvailable(LoadedModel<Form> const& index, std::string const& text)
 {
     Model const available = Model::create(index.model->getModelConstellation());
     available->setModelURI(u"packages:available");
-    return test::loadText(available, text);
+    return test::loadText<Form>(available, text);
 }
 
-TEST(Resolution, LeadsMissingPackagesToTheOtherModel)
+template <class Form> class ResolutionTest : public testing::Test
+{};
+TYPED_TEST_SUITE(ResolutionTest, test::BothForms, test::FormName);
+
+TYPED_TEST(ResolutionTest, LeadsMissingPackagesToTheOtherModel)
 {
-    LoadedModel const index(TEXT);
+    LoadedModel<TypeParam> const index(TEXT);
     auto const available = loadAvailable(index, paragraph("there") + paragraph("here"));
 
-    debian::Resolution const resolution = debian::resolveTargets(index.loaded.index);
+    debian::Resolution const resolution = debian::resolveTargets<TypeParam>(index.loaded.index);
 
     EXPECT_EQ(resolution.found, 1u);
     EXPECT_EQ(resolution.notFound, 1u);
-    auto const& alternatives = index.release(u"a")->getGroups().at(0)->getAlternatives();
-    EXPECT_EQ(alternatives.at(0)->getTargetImpl(), index.package(u"here").getImpl());
-    EXPECT_EQ(alternatives.at(1)->getTargetImpl(),
+    EXPECT_EQ(index.alternative(u"a", 0, 0)->getTargetImpl(), index.package(u"here").getImpl());
+    EXPECT_EQ(index.alternative(u"a", 0, 1)->getTargetImpl(),
               available.index->getPackages().find(u"there").getImpl());
 }
 
-TEST(Resolution, FindsNothingWithoutTheOtherModel)
+TYPED_TEST(ResolutionTest, FindsNothingWithoutTheOtherModel)
 {
-    LoadedModel const index(TEXT);
+    LoadedModel<TypeParam> const index(TEXT);
 
-    debian::Resolution const resolution = debian::resolveTargets(index.loaded.index);
+    debian::Resolution const resolution = debian::resolveTargets<TypeParam>(index.loaded.index);
 
     EXPECT_EQ(resolution.found, 0u);
     EXPECT_EQ(resolution.notFound, 2u);
 }
 
-TEST(Resolution, IsNoChange)
+TYPED_TEST(ResolutionTest, IsNoChange)
 {
-    LoadedModel const index(TEXT);
+    LoadedModel<TypeParam> const index(TEXT);
     loadAvailable(index, paragraph("there"));
     debian::ModelSnapshot const before(index.model);
 
-    debian::resolveTargets(index.loaded.index);
+    debian::resolveTargets<TypeParam>(index.loaded.index);
 
     EXPECT_EQ(debian::ModelSnapshot(index.model), before);
 }

@@ -3,8 +3,6 @@
 #include "ChangeReport.h"
 #include "ModelSnapshot.h"
 #include "Removal.h"
-#include "model/AlternativeImpl.h"
-#include "model/DependencyGroupImpl.h"
 #include "tarnkiln/kernel/ModelConstellationImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
 #include "tests/examples/LoadText.h"
@@ -24,10 +22,12 @@ using testing::HasSubstr;
 using testing::IsEmpty;
 
 /// An index whose last change is recorded.
-class RecordedModel : public test::LoadedModel
+template <test::ElementForm Form> class RecordedModel : public test::LoadedModel<Form>
 {
 public:
-    explicit RecordedModel(std::string const& text) : LoadedModel(text)
+    using test::LoadedModel<Form>::model;
+
+    explicit RecordedModel(std::string const& text) : test::LoadedModel<Form>(text)
     {
         model->addListener(&recorder);
     }
@@ -41,9 +41,9 @@ public:
         EXPECT_EQ(transaction.commit(), TransactionResult::Committed);
         return *recorder.last();
     }
-    ReportData remove(std::vector<debian::model::Package> const& packages)
+    ReportData remove(std::vector<debian::Package<Form>> const& packages)
     {
-        return change([&] { debian::removePackages(packages); });
+        return change([&] { debian::removePackages<Form>(packages); });
     }
 
     /// Makes a change, takes it back and expects all to be as before.
@@ -67,39 +67,45 @@ std::string const TEXT = paragraph("a", "Depends: b (>= 1) | c, gone\nProvides: 
                          paragraph("b", "Installed-Size: 5\nProvides: v, a\n") +
                          paragraph("c", "Suggests: a\nProvides: w, v\n");
 
-TEST(Undo, BringsBackEachPackage)
+template <class Form> class UndoTest : public testing::Test
+{};
+TYPED_TEST_SUITE(UndoTest, test::BothForms, test::FormName);
+
+TYPED_TEST(UndoTest, BringsBackEachPackage)
 {
     for (ustring const name : {u"a", u"b", u"c", u"v", u"w"})
     {
-        RecordedModel index(TEXT);
+        RecordedModel<TypeParam> index(TEXT);
         index.expectUndone([&] { index.package(name)->destroy(); });
     }
 }
 
-TEST(Undo, BringsBackSeveralPackages)
+TYPED_TEST(UndoTest, BringsBackSeveralPackages)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
 
-    index.expectUndone([&] { debian::removePackages({index.package(u"a"), index.package(u"b")}); });
+    index.expectUndone([&] {
+        debian::removePackages<TypeParam>({index.package(u"a"), index.package(u"b")});
+    });
 }
 
-TEST(Undo, BringsBackAllPackages)
+TYPED_TEST(UndoTest, BringsBackAllPackages)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
 
     index.expectUndone([&] { index.loaded.index->getPackages().destroyAllContents(); });
 }
 
-TEST(Undo, BringsBackTheIndex)
+TYPED_TEST(UndoTest, BringsBackTheIndex)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
 
     index.expectUndone([&] { index.loaded.index->destroy(); });
 }
 
-TEST(Undo, BringsBackTheMiddleOfAnOrder)
+TYPED_TEST(UndoTest, BringsBackTheMiddleOfAnOrder)
 {
-    RecordedModel index(paragraph("a", "Depends: b, c, d, e\n"));
+    RecordedModel<TypeParam> index(paragraph("a", "Depends: b, c, d, e\n"));
 
     index.expectUndone([&] {
         auto const release = index.release(u"a");
@@ -108,9 +114,9 @@ TEST(Undo, BringsBackTheMiddleOfAnOrder)
     });
 }
 
-TEST(Undo, RestoresPlainValuesAndReferencesOfWhatChanged)
+TYPED_TEST(UndoTest, RestoresPlainValuesAndReferencesOfWhatChanged)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
 
     index.expectUndone([&] {
         auto const release = index.release(u"a");
@@ -123,23 +129,23 @@ TEST(Undo, RestoresPlainValuesAndReferencesOfWhatChanged)
     });
 }
 
-TEST(Undo, DestroysWhatWasCreated)
+TYPED_TEST(UndoTest, DestroysWhatWasCreated)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
 
     index.expectUndone([&] {
-        auto const added = debian::model::Package::create(index.model);
+        auto const added = debian::Package<TypeParam>::create(index.model);
         added->setName(u"added");
         added->setIndex(index.loaded.index);
         index.release(u"a")->getProvides().push_back(added);
     });
 }
 
-TEST(Undo, TurnsReferencesToTheNewElement)
+TYPED_TEST(UndoTest, TurnsReferencesToTheNewElement)
 {
-    RecordedModel index(paragraph("a", "Suggests: b\n") + paragraph("b"));
+    RecordedModel<TypeParam> index(paragraph("a", "Suggests: b\n") + paragraph("b"));
     auto const old = index.package(u"b");
-    auto const suggestion = index.release(u"a")->getGroups().at(0)->getAlternatives().at(0);
+    auto const suggestion = index.alternative(u"a", 0, 0);
     ReportData const report = index.remove({old});
     ASSERT_FALSE(suggestion->getTarget());
 
@@ -151,11 +157,12 @@ TEST(Undo, TurnsReferencesToTheNewElement)
     EXPECT_FALSE(old);
 }
 
-TEST(Undo, KeepsTheProxiesOfWhatIsMissing)
+TYPED_TEST(UndoTest, KeepsTheProxiesOfWhatIsMissing)
 {
-    RecordedModel index(paragraph("a", "Depends: gone\n") + paragraph("b", "Depends: gone\n"));
+    RecordedModel<TypeParam> index(paragraph("a", "Depends: gone\n") +
+                                   paragraph("b", "Depends: gone\n"));
     auto const targetOf = [&](ustring const& name) {
-        return index.release(name)->getGroups().at(0)->getAlternatives().at(0)->getTargetImpl();
+        return index.alternative(name, 0, 0)->getTargetImpl();
     };
     auto* const proxy = targetOf(u"b");
 
@@ -164,18 +171,18 @@ TEST(Undo, KeepsTheProxiesOfWhatIsMissing)
     EXPECT_EQ(targetOf(u"a"), proxy);
 }
 
-TEST(Undo, KeepsReferencesToTheOtherModel)
+TYPED_TEST(UndoTest, KeepsReferencesToTheOtherModel)
 {
-    RecordedModel index(paragraph("a", "Depends: gone\n"));
+    RecordedModel<TypeParam> index(paragraph("a", "Depends: gone\n"));
     Model const available = Model::create(index.model->getModelConstellation());
     available->setModelURI(u"packages:available");
-    auto const other = test::loadText(available, paragraph("gone"));
+    auto const other = test::loadText<TypeParam>(available, paragraph("gone"));
     auto const target = other.index->getPackages().find(u"gone");
-    ASSERT_EQ(index.release(u"a")->getGroups().at(0)->getAlternatives().at(0)->getTarget(), target);
+    ASSERT_EQ(index.alternative(u"a", 0, 0)->getTarget(), target);
 
     index.expectUndone([&] { index.package(u"a")->destroy(); });
 
-    EXPECT_EQ(index.release(u"a")->getGroups().at(0)->getAlternatives().at(0)->getTarget(), target);
+    EXPECT_EQ(index.alternative(u"a", 0, 0)->getTarget(), target);
 }
 
 /// Refuses everything.
@@ -185,9 +192,9 @@ public:
     bool transactionValidating(ReportData& /*report*/) { return false; }
 };
 
-TEST(Undo, LeavesTheModelAsItIsWhenItIsRefused)
+TYPED_TEST(UndoTest, LeavesTheModelAsItIsWhenItIsRefused)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
     ReportData const report = index.remove({index.package(u"a")});
     ModelSnapshot const after(index.model);
     Refuser refuser;
@@ -199,13 +206,17 @@ TEST(Undo, LeavesTheModelAsItIsWhenItIsRefused)
     EXPECT_EQ(ModelSnapshot(index.model), after);
 }
 
-TEST(ChangeReport, TellsOldValuesOfWhatWasDestroyed)
+template <class Form> class ChangeReportTest : public testing::Test
+{};
+TYPED_TEST_SUITE(ChangeReportTest, test::BothForms, test::FormName);
+
+TYPED_TEST(ChangeReportTest, TellsOldValuesOfWhatWasDestroyed)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
     ReportData const report = index.remove({index.package(u"c")});
     std::ostringstream output;
 
-    debian::printReport(output, report, /*maxLines=*/100);
+    debian::printReport<TypeParam>(output, report, /*maxLines=*/100);
 
     EXPECT_THAT(output.str(), HasSubstr("changed Package w; had providers = {a 1 all, c 1 all}\n"));
     EXPECT_THAT(output.str(), HasSubstr("destroyed Package c; had releases = {c 1 all}\n"));
@@ -216,21 +227,25 @@ TEST(ChangeReport, TellsOldValuesOfWhatWasDestroyed)
                                         "1 Package, 1 Release\n"));
 }
 
-TEST(ChangeReport, CountsTheLinesThatItLeavesOut)
+TYPED_TEST(ChangeReportTest, CountsTheLinesThatItLeavesOut)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
     ReportData const report = index.remove({index.package(u"c")});
     std::ostringstream output;
 
-    debian::printReport(output, report, /*maxLines=*/2);
+    debian::printReport<TypeParam>(output, report, /*maxLines=*/2);
 
     EXPECT_THAT(output.str(), HasSubstr("    and 5 lines more\n"));
     EXPECT_THAT(output.str(), testing::Not(HasSubstr("destroyed Release")));
 }
 
-TEST(ModelSnapshot, TellsWhichElementsDiffer)
+template <class Form> class ModelSnapshotTest : public testing::Test
+{};
+TYPED_TEST_SUITE(ModelSnapshotTest, test::BothForms, test::FormName);
+
+TYPED_TEST(ModelSnapshotTest, TellsWhichElementsDiffer)
 {
-    RecordedModel index(TEXT);
+    RecordedModel<TypeParam> index(TEXT);
     ModelSnapshot const before(index.model);
     auto const release = index.release(u"a");
     index.change([&] { release->setSummary(u"another"); });
@@ -241,30 +256,53 @@ TEST(ModelSnapshot, TellsWhichElementsDiffer)
     EXPECT_THAT(differences[0], HasSubstr(" differs"));
 }
 
-TEST(ModelSnapshot, SeesEachKindOfChange)
+TYPED_TEST(ModelSnapshotTest, SeesEachKindOfChange)
 {
-    std::function<void(RecordedModel&)> const changes[] = {
-        [](RecordedModel& index) { index.release(u"a")->setIsEssential(true); },
-        [](RecordedModel& index) { index.release(u"a")->setInstalledSize(0); },
-        [](RecordedModel& index) {
+    std::function<void(RecordedModel<TypeParam>&)> const changes[] = {
+        [](RecordedModel<TypeParam>& index) { index.release(u"a")->setIsEssential(true); },
+        [](RecordedModel<TypeParam>& index) { index.release(u"a")->setInstalledSize(0); },
+        [](RecordedModel<TypeParam>& index) {
             index.release(u"a")->getProvides().ensureAt(0, index.package(u"w"));
         },
-        [](RecordedModel& index) { index.release(u"a")->setPackage(debian::model::Package()); },
-        [](RecordedModel& index) { index.package(u"a")->destroy(); },
-        [](RecordedModel& index) { debian::model::Package::create(index.model); },
-        [](RecordedModel& index) {
-            index.release(u"a")->getGroups().at(0)->getAlternatives().at(0)->setTarget(
-                debian::model::Package());
+        [](RecordedModel<TypeParam>& index) {
+            index.release(u"a")->setPackage(debian::Package<TypeParam>());
+        },
+        [](RecordedModel<TypeParam>& index) { index.package(u"a")->destroy(); },
+        [](RecordedModel<TypeParam>& index) { debian::Package<TypeParam>::create(index.model); },
+        [](RecordedModel<TypeParam>& index) {
+            index.alternative(u"a", 0, 0)->setTarget(debian::Package<TypeParam>());
         },
     };
 
     for (auto const& step : changes)
     {
-        RecordedModel index(TEXT);
+        RecordedModel<TypeParam> index(TEXT);
         ModelSnapshot const before(index.model);
         index.change([&] { step(index); });
         EXPECT_NE(ModelSnapshot(index.model), before) << &step - changes;
     }
+}
+
+TEST(ModelSnapshotOfBothForms, IsTheSame)
+{
+    test::LoadedModel<debian::Generated> const generated(TEXT);
+    test::LoadedModel<debian::Reflective> const reflective(TEXT);
+    ModelSnapshot const one(generated.model);
+    ModelSnapshot const other(reflective.model);
+
+    EXPECT_THAT(one.differences(other, 10), IsEmpty());
+    EXPECT_EQ(one, other);
+    EXPECT_EQ(one.fingerprint(), other.fingerprint());
+}
+
+TEST(ModelSnapshotFingerprint, DiffersIfAnythingDiffers)
+{
+    test::LoadedModel<debian::Generated> const one(TEXT);
+    test::LoadedModel<debian::Generated> const other(TEXT);
+
+    other.release(u"a")->setSummary(u"another");
+
+    EXPECT_NE(ModelSnapshot(one.model).fingerprint(), ModelSnapshot(other.model).fingerprint());
 }
 
 }  // namespace
