@@ -106,6 +106,11 @@ bool ModelElement::Impl::hasPropertyValue(meta::Property const& property,
     reportNoSuchProperty(*this, property);
 }
 
+StoredField ModelElement::Impl::findStoredField(meta::Property const& /*property*/) const
+{
+    return {};
+}
+
 Value ModelElement::Impl::getPropertyValue(meta::Property const& property,
                                            ReflectionPrivateTag const&) const
 {

@@ -7,6 +7,7 @@
 #include "tarnkiln/kernel/ModelElement.h"
 #include "tarnkiln/kernel/ProxyId.h"
 #include "tarnkiln/kernel/ReflectionPrivateTag.h"
+#include "tarnkiln/kernel/StoredField.h"
 #include "tarnkiln/support/ModelAnchor.h"
 
 #include <boost/optional.hpp>
@@ -67,6 +68,12 @@ public:
     virtual void setPropertyValue(meta::Property const& property, Value const& value,
                                   ReflectionPrivateTag const& tag);
     /// @}
+    /// Whether all elements of this C++ class are of one metaclass, and `getPropertyValue` gives what
+    /// `findStoredField` leads to. Not so in classes that override one of the two by hand.
+    virtual bool isReadByFields() const { return false; }
+    /// Where this element keeps the value of `property`; nothing if it is computed or unknown. To be
+    /// asked only if `isReadByFields`.
+    virtual StoredField findStoredField(meta::Property const& property) const;
     /// Calls an operation by reflection, and gives its result if it has one.
     ///
     /// \throws tarnkiln::messages::NoSuchOperation  (operation, qualified class name) if the

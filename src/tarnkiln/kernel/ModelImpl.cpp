@@ -101,6 +101,14 @@ std::vector<ModelElement> Model::Impl::getAllElements() const
     return result;
 }
 
+std::vector<ModelElement::Impl*> Model::Impl::getAllElementImpls() const
+{
+    std::vector<ModelElement::Impl*> result;
+    result.reserve(m_elements.size());
+    m_elements.forEach([&](ModelElement::Impl* element) { result.push_back(element); });
+    return result;
+}
+
 void Model::Impl::elementCreated(ModelElement::Impl* element, bool topLevel)
 {
     validateTransaction();

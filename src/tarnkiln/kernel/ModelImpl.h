@@ -66,6 +66,8 @@ public:
     std::size_t getElementCount() const { return m_elements.size(); }
     /// Handles of all elements, in no promised order.
     std::vector<ModelElement> getAllElements() const;
+    /// The same in the same order, without a share in them.
+    std::vector<ModelElement::Impl*> getAllElementImpls() const;
     /// @}
 
     /// \name Transactions

@@ -83,6 +83,9 @@ public:
                           ReflectionPrivateTag const& tag) override;
     /// @}
 
+    /// What it keeps for its properties, for readers of many elements.
+    internal::ReflectiveCells const& getCells() const { return *m_cells; }
+
     // ModelElement::Impl
     void doDestroy(bool keepIncoming, bool multiModel) override;
     void inverseAdd(ModelElement const& element, meta::Property const& property) override;

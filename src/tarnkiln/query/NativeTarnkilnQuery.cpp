@@ -6,6 +6,7 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/query/Messages.h"
 #include "tarnkiln/query/internal/AssociatedObjectConstraint.h"
+#include "tarnkiln/query/internal/FastEngine.h"
 #include "tarnkiln/query/internal/NativeQueryState.h"
 #include "tarnkiln/query/internal/NativeResultIterator.h"
 #include "tarnkiln/query/internal/PlainEngine.h"
@@ -119,8 +120,9 @@ void NativeTarnkilnQuery::setResultOffset(std::size_t offset)
 std::vector<ModelElement>
 NativeTarnkilnQuery::getFirstResult(std::vector<std::size_t> const& columns)
 {
+    requireRunnable();
     std::vector<ModelElement> row;
-    getResultIterator(columns)->next(row);
+    NativeResultIterator(run(columns, /*most=*/1)).next(row);
     return row;
 }
 
@@ -128,13 +130,14 @@ std::unique_ptr<ReflectiveQuery::ResultIterator>
 NativeTarnkilnQuery::getResultIterator(std::vector<std::size_t> const& columns)
 {
     requireRunnable();
-    return std::make_unique<NativeResultIterator>(internal::runPlainly(*m_state, columns));
+    return std::make_unique<NativeResultIterator>(run(columns, /*most=*/0));
 }
 
 std::size_t NativeTarnkilnQuery::getResultCount()
 {
     requireRunnable();
-    return internal::runPlainly(*m_state, {}).getRowCount();
+    return m_engine == Engine::Plain ? internal::runPlainly(*m_state, {}).getRowCount()
+                                     : internal::countFast(*m_state);
 }
 
 void NativeTarnkilnQuery::setModel(Model const& model)
@@ -163,6 +166,18 @@ void NativeTarnkilnQuery::retargetTo(RetargetableQuery& target) const
 Model NativeTarnkilnQuery::getModel() const
 {
     return m_state->model;
+}
+
+void NativeTarnkilnQuery::useEngine(Engine engine)
+{
+    m_engine = engine;
+}
+
+internal::NativeResultSet NativeTarnkilnQuery::run(std::vector<std::size_t> const& columns,
+                                                   std::size_t most) const
+{
+    return m_engine == Engine::Plain ? internal::runPlainly(*m_state, columns)
+                                     : internal::runFast(*m_state, columns, most);
 }
 
 void NativeTarnkilnQuery::requireRunnable() const

@@ -4,8 +4,9 @@
 #include "tarnkiln/query/RetargetableQuery.h"
 
 namespace tarn::kiln::internal {
+class NativeResultSet;
 struct NativeQueryState;
-}
+}  // namespace tarn::kiln::internal
 
 namespace tarn::kiln::query {
 
@@ -20,9 +21,19 @@ class TARNKILN_EXPORT NativeTarnkilnQuery final : public RetargetableQuery
 public:
     class NativeResultIterator;  // internal/NativeResultIterator.h
 
+    /// How rows are found. The rows, their order and the failures are the same.
+    enum class Engine
+    {
+        Fast,
+        Plain  ///< Tries all combinations; what `Fast` is measured by.
+    };
+
     /// \param model  may be empty, until `setModel`.
     explicit NativeTarnkilnQuery(Model const& model);
     ~NativeTarnkilnQuery() override;
+
+    /// For comparing the engines; a new query has the fast one.
+    void useEngine(Engine engine);
 
     // ReflectiveQuery
     void reset() override;
@@ -49,8 +60,10 @@ public:
 
 private:
     void requireRunnable() const;
+    internal::NativeResultSet run(std::vector<std::size_t> const& columns, std::size_t most) const;
 
     std::unique_ptr<internal::NativeQueryState> const m_state;
+    Engine m_engine = Engine::Fast;
 };
 
 /// A query without a model.

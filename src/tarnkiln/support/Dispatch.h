@@ -26,6 +26,8 @@ template <class Derived, class Base> class TARNKILN_EXPORT Dispatched : public B
 {
 public:
     using Base::Base;
+    using Dispatch = Dispatched;  ///< The innermost of these bases, seen from a class.
+    using Above = Base;
 
     // ElementImpl
     meta::Class const& getMetaClass() const override;
@@ -38,6 +40,8 @@ public:
                            internal::ReflectionPrivateTag const& tag) const override;
     void setPropertyValue(meta::Property const& property, Value const& value,
                           internal::ReflectionPrivateTag const& tag) override;
+    bool isReadByFields() const override;
+    StoredField findStoredField(meta::Property const& property) const override;
     void doDestroy(bool keepIncoming, bool multiModel) override;
     void inverseAdd(ModelElement const& element, meta::Property const& property) override;
     void inverseRemove(ModelElement const& element, meta::Property const& property) override;

@@ -11,6 +11,7 @@
 #include <boost/optional.hpp>
 
 #include <type_traits>
+#include <typeinfo>
 
 namespace tarn::kiln::support {
 
@@ -42,7 +43,11 @@ template <class Class> struct ComputedRowsOf
 {
     using Type = RowList<>;
 };
-template <class Class> requires requires { typename Class::ComputedRows; }
+template <class Class>
+requires requires
+{
+    typename Class::ComputedRows;
+}
 struct ComputedRowsOf<Class>
 {
     using Type = typename Class::ComputedRows;
@@ -137,9 +142,40 @@ Value Dispatched<Derived, Base>::getPropertyValue(meta::Property const& property
 {
     boost::optional<Value> value;
     if (mayRead(property, tag))
-        atReadable<Derived>(property,
-                            [&](auto row) { value = row.get(self(), property, tag); });
+        atReadable<Derived>(property, [&](auto row) { value = row.get(self(), property, tag); });
     return value ? *value : Base::getPropertyValue(property, tag);
+}
+
+/// Whether `Impl` and the classes above leave what `Dispatched` says of metaclass and values alone.
+template <class Impl> constexpr bool isUnaltered()
+{
+    if constexpr (std::is_same_v<Impl, ModelElement::Impl>)
+        return true;
+    else if constexpr (requires { &Impl::getPropertyValue, &Impl::getMetaClass; })
+        return std::is_base_of_v<typename Impl::Dispatch, Impl> &&
+               std::is_same_v<typename Impl::Dispatch, Dispatched<Impl, typename Impl::Above>> &&
+               std::is_same_v<decltype(&Impl::getPropertyValue),
+                              decltype(&Impl::Dispatch::getPropertyValue)> &&
+               std::is_same_v<decltype(&Impl::getMetaClass),
+                              decltype(&Impl::Dispatch::getMetaClass)> &&
+               isUnaltered<typename Impl::Above>();
+    else
+        return false;
+}
+
+template <class Derived, class Base> bool Dispatched<Derived, Base>::isReadByFields() const
+{
+    // A class of a client that derives from `Derived` may override what it likes.
+    return isUnaltered<Derived>() && typeid(*this) == typeid(Derived);
+}
+
+template <class Derived, class Base>
+StoredField Dispatched<Derived, Base>::findStoredField(meta::Property const& property) const
+{
+    StoredField field;
+    if (property && atReadable<Derived>(property, [&](auto row) { field = row.stored(self()); }))
+        return field;
+    return Base::findStoredField(property);
 }
 
 template <class Derived, class Base>

@@ -13,6 +13,8 @@
 #include "tarnkiln/support/Rows.h"
 
 #include <algorithm>
+#include <type_traits>
+#include <typeinfo>
 #include <vector>
 
 namespace tarn::kiln::support {
@@ -89,6 +91,7 @@ template <Slot const& SLOT> struct NoSteps
     static AbstractOwnedCollection* collection(auto const& /*element*/) { return nullptr; }
     /// The target of a single reference, unresolved.
     static ModelElement::Impl* reference(auto const& /*element*/) { return nullptr; }
+    static StoredField stored(auto const& /*element*/) { return {}; }
     /// Stores `value`; false if the property has no setter.
     static bool set(auto& /*element*/, Value const& /*value*/) { return false; }
 };
@@ -130,6 +133,15 @@ template <auto FIELD, Slot const& SLOT> struct FieldSteps : NoSteps<SLOT>
     }
 };
 
+/// The type by which a `StoredField` is given: a literal's is that of its number.
+template <class Plain> StoredField fieldOfType()
+{
+    if constexpr (std::is_enum_v<Plain> && Literals<Plain>)
+        return {.type = &typeid(std::underlying_type_t<Plain>), .isLiteral = true};
+    else
+        return {.type = &typeid(Plain)};
+}
+
 template <auto FIELD, Slot const& SLOT> struct PlainFieldSteps : FieldSteps<FIELD, SLOT>
 {
     using Owner = FieldOwner<FIELD>;
@@ -140,10 +152,17 @@ template <auto FIELD, Slot const& SLOT> struct PlainFieldSteps : FieldSteps<FIEL
     {
         return PlainField<Plain>::toValue(property, element.*FIELD);
     }
+    static StoredField stored(Owner const& element)
+    {
+        StoredField field = fieldOfType<Plain>();
+        field.offset =
+            reinterpret_cast<char const*>(&(element.*FIELD)) -
+            reinterpret_cast<char const*>(static_cast<ModelElement::Impl const*>(&element));
+        return field;
+    }
     static Value old(auto const& /*record*/, Plain const* old, meta::Property const& property)
     {
-        return old ? PlainField<Plain>::toValue(property, *old)
-                   : Value::createEmptyValue(property);
+        return old ? PlainField<Plain>::toValue(property, *old) : Value::createEmptyValue(property);
     }
 };
 
@@ -189,6 +208,12 @@ struct SingleReferenceSteps : FieldSteps<FIELD, SLOT>
                      internal::ReflectionPrivateTag const& tag)
     {
         return Value::createElementValue(property, Target(target(element, tag)));
+    }
+    static StoredField stored(Owner const& /*element*/)
+    {
+        return {.target = [](ModelElement::Impl const& element) -> ModelElement::Impl* {
+            return (static_cast<Owner const&>(element).*FIELD).get();
+        }};
     }
     static Value old(auto const& /*record*/, Pointer const* old, meta::Property const& property)
     {
@@ -347,6 +372,7 @@ struct Steps<Container<Target, SLOT, SETTER>> : NoSteps<SLOT>
     {
         return Value::createElementValue(property, ModelElement(container(element)));
     }
+    static StoredField stored(Element const& /*element*/) { return {.target = target}; }
     static Value old(auto const& record, NoOldValue const* /*old*/, meta::Property const& property)
     {
         return Value::createElementValue(property, ModelElement(oldContainer(record)));
@@ -388,6 +414,7 @@ private:
     {
         return containerOf<Element>(element, SLOT);
     }
+    static Element* target(ModelElement::Impl const& element) { return container(element); }
     static Element* oldContainer(ModelElement::Impl::Storage const& record)
     {
         bool const wasHeld =

@@ -35,6 +35,11 @@ public:
         std::size_t const number = layout().numberOf(slot);
         return {words()[number], states()[number]};
     }
+    /// Where the word of the slot lies, as long as the element lives.
+    std::uint64_t const& word(ReflectiveSlot const& slot) const
+    {
+        return words()[layout().numberOf(slot)];
+    }
     /// Frees nothing of what was there.
     void set(ReflectiveSlot const& slot, ReflectiveCell cell)
     {

@@ -32,6 +32,8 @@ public:
     explicit ReflectiveSlot(meta::Property const& property);
 
     meta::Property const& property() const { return m_property; }
+    /// Of plain values, as it was when the layout was made.
+    meta::Type const& type() const { return m_type; }
     SlotKind kind() const { return m_kind; }
     /// The slot in change records: the property's index; `NO_INDEX` for -1.
     unsigned long index() const { return m_index; }

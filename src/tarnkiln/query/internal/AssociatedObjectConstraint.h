@@ -21,6 +21,7 @@ public:
                  std::vector<std::size_t> const& ids) const override;
     void retarget(RetargetableQuery& target) const override;
 
+    meta::Property const& getProperty() const { return m_property; }
     std::size_t getSource() const { return m_source; }
     std::size_t getTarget() const { return m_target; }
     /// What the property of `source` refers to; stand-ins, empty and dead handles too.

@@ -1,7 +1,7 @@
 /// \file
 /// The rows of a finished run.
 #pragma once
-#include "tarnkiln/kernel/ModelElement.h"
+#include "tarnkiln/kernel/ModelElementImpl.h"
 
 #include <cstddef>
 #include <vector>
@@ -18,7 +18,7 @@ public:
 
     void reserve(std::size_t rows) { m_cells.reserve(rows * m_width); }
     /// Rows are given cell by cell.
-    void addCell(ModelElement const& element) { m_cells.push_back(element); }
+    void addCell(ModelElement::Impl* element) { m_cells.emplace_back(element); }
 
     std::size_t getInstanceCount() const { return m_instances; }
     std::size_t getRowCount() const { return m_cells.size() / m_width; }

@@ -186,7 +186,7 @@ NativeResultSet runPlainly(NativeQueryState const& query, std::vector<std::size_
         for (std::size_t const id : wanted)
         {
             query.checkInstance(id);
-            result.addCell(row[positionOf(id, found.columns)]);
+            result.addCell(row[positionOf(id, found.columns)].getImpl());
         }
     }
     return result;

@@ -1,0 +1,95 @@
+#include "tarnkiln/query/internal/PlainPlace.h"
+
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/StandardTypeOf.h"
+#include "tarnkiln/meta/internal/PackedPayload.h"
+
+#include <boost/optional.hpp>
+
+#include <typeinfo>
+
+namespace tarn::kiln::internal {
+namespace {
+
+/// Whether values of `kind` are of `type`, as the comparators for it expect.
+bool suits(SlotKind kind, meta::Type const& type)
+{
+    if (kind == SlotKind::Enumeration)
+        return plainKindOf(type) == kind;
+    return withPayloadType(kind, [&]<class T>() { return type == meta::standardTypeOf<T>(); });
+}
+}  // namespace
+
+KeptBy keptBy(ModelElement::Impl const& element)
+{
+    if (typeid(element) == typeid(ReflectiveModelElementImpl))
+        return KeptBy::Layout;
+    return element.isReadByFields() ? KeptBy::Class : KeptBy::Nobody;
+}
+
+PlainPlace PlainPlace::find(ModelElement::Impl const& element, KeptBy by,
+                            meta::Property const& property)
+{
+    PlainPlace place;
+    if (by == KeptBy::Nobody || !property || property->getUpper() >= 2)
+        return place;
+    meta::Type const type = property->getType();
+    if (by == KeptBy::Class)
+    {
+        StoredField const field = element.findStoredField(property);
+        if (!field.type || !place.useField(field))
+            return PlainPlace();
+    }
+    else
+    {
+        ReflectiveSlot const* const slot = cellsOf(element).layout().find(property);
+        if (!slot || slot->kind() >= SlotKind::Other || slot->type() != type ||
+            !element.getMetaClass()->isATypeOf(property))
+            return PlainPlace();
+        place.useCell(*slot);
+    }
+    return suits(place.m_kind, type) ? place : PlainPlace();
+}
+
+/// False if there are no comparators for fields of its type.
+bool PlainPlace::useField(StoredField const& field)
+{
+    m_offset = field.offset;
+    m_form = Form::Field;
+    if (field.isLiteral)
+    {
+        m_kind = SlotKind::Enumeration;
+        return *field.type == typeid(int) || *field.type == typeid(unsigned) ||
+               *field.type == typeid(long) || *field.type == typeid(unsigned long);
+    }
+    for (int number = 0; number < static_cast<int>(SlotKind::Enumeration); ++number)
+    {
+        m_kind = static_cast<SlotKind>(number);
+        bool const found = withPayloadType(m_kind, [&]<class T>() {
+            if (*field.type != typeid(boost::optional<T>))
+                return *field.type == typeid(T);
+            m_form = Form::OptionalField;
+            m_payload = [](void const* optional) -> void const* {
+                return static_cast<boost::optional<T> const*>(optional)->get_ptr();
+            };
+            return true;
+        });
+        if (found)
+            return true;
+    }
+    return false;
+}
+
+void PlainPlace::useCell(ReflectiveSlot const& slot)
+{
+    m_form = Form::Cell;
+    m_kind = slot.kind();
+    m_slot = &slot;
+    withPayloadType(m_kind, [&]<class T>() {
+        static T const defaultPayload{};
+        m_isInPlace = Packed<T>::IN_PLACE;
+        m_default = &defaultPayload;
+    });
+}
+}  // namespace tarn::kiln::internal

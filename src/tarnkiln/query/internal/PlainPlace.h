@@ -1,0 +1,120 @@
+/// \file
+/// Where elements of one kind keep a plain value.
+#pragma once
+#include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/meta/Property.h"
+#include "tarnkiln/meta/ReflectiveModelElementImpl.h"
+#include "tarnkiln/meta/internal/ReflectiveCells.h"
+#include "tarnkiln/meta/internal/SlotKind.h"
+
+#include <cstddef>
+#include <cstdint>
+
+namespace tarn::kiln::internal {
+
+/// What an element keeps for a property, without a `Value` around it.
+struct KeptValue
+{
+    enum class Shape : std::uint8_t
+    {
+        Single,    ///< A value of that shape.
+        Optional,  ///< A value of the shape `OptionalSingle` that is there.
+        Absent,    ///< An absent value of the shape `OptionalSingle`.
+        Unknown    ///< The element must be asked.
+    };
+
+    Shape shape = Shape::Unknown;
+    /// Of the C++ type of the place's kind; a literal's is its number, of which 32 bits count. Lies
+    /// in the element. Null if there is none.
+    void const* payload = nullptr;
+};
+
+/// How elements may be told apart so that those of one kind keep their values alike.
+enum class KeptBy : std::uint8_t
+{
+    Class,   ///< A generated class: the C++ class.
+    Layout,  ///< A class known at run time: the layout.
+    Nobody   ///< Each element must be asked.
+};
+
+/// How elements of the C++ class of `element` are told apart.
+KeptBy keptBy(ModelElement::Impl const& element);
+
+inline ReflectiveCells const& cellsOf(ModelElement::Impl const& element)
+{
+    return static_cast<ReflectiveModelElementImpl const&>(element).getCells();
+}
+
+/// The place of one property in the elements of one kind.
+///
+/// Reading there is reading by `getPropertyValue` with all rights, and never fails.
+class PlainPlace
+{
+public:
+    /// No place: all values are unknown.
+    PlainPlace() = default;
+    /// The place that elements of the kind of `element` have for a property with one value, if it
+    /// is a plain one and of a type with comparators.
+    static PlainPlace find(ModelElement::Impl const& element, KeptBy by,
+                           meta::Property const& property);
+
+    bool isKnown() const { return m_form != Form::None; }
+    SlotKind kind() const { return m_kind; }
+    /// From the beginning of the element, for elements of generated classes.
+    std::ptrdiff_t offset() const { return m_offset; }
+
+    KeptValue read(ModelElement::Impl const& element) const
+    {
+        void const* const field = reinterpret_cast<char const*>(&element) + m_offset;
+        switch (m_form)
+        {
+        case Form::Field:
+            return {KeptValue::Shape::Single, field};
+        case Form::OptionalField: {
+            void const* const payload = m_payload(field);
+            return {payload ? KeptValue::Shape::Optional : KeptValue::Shape::Absent, payload};
+        }
+        case Form::Cell:
+            return readCell(element);
+        case Form::None:
+            break;
+        }
+        return {};
+    }
+
+private:
+    enum class Form : std::uint8_t
+    {
+        None,
+        Field,
+        OptionalField,
+        Cell
+    };
+
+    bool useField(StoredField const& field);
+    void useCell(ReflectiveSlot const& slot);
+    KeptValue readCell(ModelElement::Impl const& element) const
+    {
+        ReflectiveCells const& cells = cellsOf(element);
+        CellState const state = cells.get(*m_slot).state;
+        if (state == CellState::Empty)
+            return {KeptValue::Shape::Absent, nullptr};
+        if (state != CellState::Single && state != CellState::Optional)
+            return {};
+        std::uint64_t const& word = cells.word(*m_slot);
+        void const* payload = &word;
+        if (!m_isInPlace)
+            payload = word ? reinterpret_cast<void const*>(word) : m_default;
+        return {state == CellState::Single ? KeptValue::Shape::Single : KeptValue::Shape::Optional,
+                payload};
+    }
+
+    Form m_form = Form::None;
+    SlotKind m_kind = SlotKind::Other;
+    bool m_isInPlace = false;                         ///< The word of the cell is the payload.
+    std::ptrdiff_t m_offset = 0;                      ///< Of a field.
+    void const* (*m_payload)(void const*) = nullptr;  ///< Looks into an optional field.
+    ReflectiveSlot const* m_slot = nullptr;           ///< Of a cell.
+    void const* m_default = nullptr;                  ///< What a null word of a cell points to.
+};
+}  // namespace tarn::kiln::internal
