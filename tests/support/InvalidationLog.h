@@ -49,4 +49,24 @@ private:
     InvalidationLog* m_previous;
     std::vector<Call> m_calls;
 };
+
+/// Takes the callback away for as long as it lives, whoever has installed it.
+class WithoutInvalidationLog : private tarn::kiln::ElementImpl
+{
+public:
+    class Scope
+    {
+    public:
+        Scope() : m_callback(std::exchange(installed(), nullptr)) {}
+        ~Scope() { installed() = m_callback; }
+        Scope(Scope const&) = delete;
+        Scope& operator=(Scope const&) = delete;
+
+    private:
+        InvalidateCallback const m_callback;
+    };
+
+private:
+    static InvalidateCallback& installed() { return m_callback; }
+};
 }  // namespace testkit

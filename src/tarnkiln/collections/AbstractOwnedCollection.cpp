@@ -1,6 +1,7 @@
 #include "tarnkiln/collections/AbstractOwnedCollection.h"
 
 #include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/meta/Extension.h"
 
 namespace tarn::kiln {
 
@@ -20,10 +21,24 @@ meta::Property const& AbstractOwnedCollection::getCollectionProperty() const
     return m_property;
 }
 
+void AbstractOwnedCollection::basicSetProperty(meta::Property const& property) noexcept
+{
+    m_property = property;
+    m_feature = Feature(m_property);
+}
+
+/// Neither an extension nor a computed property has a slot.
 void AbstractOwnedCollection::modifying()
 {
-    if (m_owner && m_feature)
-        m_owner->notifyModifying(m_feature.index());
+    if (!m_owner || !m_feature)
+        return;
+    unsigned long const index = m_feature.index();
+    meta::Extension const extension =
+        index == 0 ? meta::Extension::cast(m_property) : meta::Extension();
+    if (extension)
+        m_owner->notifyModifying(extension);
+    else
+        m_owner->notifyModifying(index);
 }
 
 namespace {

@@ -50,6 +50,9 @@ public:
     /// Drops all contents.
     virtual void basicDropContents() noexcept = 0;
     /// @}
+    /// Makes this the collection of another property of the same type and shape; for an extension
+    /// that gives way to that of another model.
+    void basicSetProperty(meta::Property const& property) noexcept;
 
     /// Empty for a snapshot without one and while the metamodel is being built.
     meta::Property const& getCollectionProperty() const;
@@ -75,8 +78,8 @@ protected:
     ModelElement::Impl* const m_owner;
 
 private:
-    Feature const m_feature;
-    meta::Property const m_property;  ///< Empty if the property is given by a slot.
+    Feature m_feature;
+    meta::Property m_property;  ///< Empty if the property is given by a slot.
 };
 
 /// The bracket around one change of a collection: a transaction if none is open, else nothing.

@@ -4,8 +4,10 @@
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/ChangedExtensions.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StructuredType.h"
 
@@ -97,6 +99,68 @@ std::vector<meta::Property> ModelElement::Impl::Changes::getChangedProperties() 
         }
     }
     return result;
+}
+
+bool ModelElement::Impl::Changes::anyChanged() const
+{
+    return m_modified.any() || (m_changedExtensions && !m_changedExtensions->entries().empty());
+}
+
+bool ModelElement::Impl::Changes::setModified(meta::Extension const& extension)
+{
+    if (m_changedExtensions && m_changedExtensions->find(extension))
+        return true;
+    internal::ChangedExtensions::Entry entry;
+    entry.extension = extension;
+    makeChangedExtensions().keep(std::move(entry));
+    return false;
+}
+
+bool ModelElement::Impl::Changes::isExtensionChanged(ustring const& name) const
+{
+    if (!m_changedExtensions)
+        return false;
+    meta::Extension const extension = findExtension(name);
+    return extension && m_changedExtensions->find(extension);
+}
+
+std::vector<meta::Extension> ModelElement::Impl::Changes::getChangedExtensions() const
+{
+    std::vector<meta::Extension> result;
+    if (!m_changedExtensions)
+        return result;
+    for (auto const& entry : m_changedExtensions->entries())
+    {
+        if (entry.extension)
+            result.push_back(entry.extension);
+    }
+    return result;
+}
+
+internal::ChangedExtensions& ModelElement::Impl::Changes::makeChangedExtensions()
+{
+    if (!m_changedExtensions)
+        m_changedExtensions = std::make_unique<internal::ChangedExtensions>();
+    return *m_changedExtensions;
+}
+
+meta::Extension ModelElement::Impl::Changes::findExtension(ustring const& name) const
+{
+    return m_model->getExtension(m_metaClass, name);
+}
+
+Value ModelElement::Impl::Storage::getExtensionOldValue(ustring const& name) const
+{
+    meta::Extension const extension = changedExtensions() ? findExtension(name) : meta::Extension();
+    auto const* const changed = extension ? changedExtensions()->find(extension) : nullptr;
+    if (!changed)
+        reportException(
+            tarnkiln::messages::NoSuchProperty(name, internal::qualifiedName(getMetaClass())));
+    if (changed->old.isCollection())
+        return Value::createCollectionValue(extension, changed->old.getCollection());
+    // A rollback takes away what it puts in again.
+    return changed->old.isEmpty() ? getModel()->getExtensionDefault(getMetaClass(), name)
+                                  : changed->old.getValue();
 }
 
 void ModelElement::Impl::Storage::setOldContainer(ModelElement const& container,

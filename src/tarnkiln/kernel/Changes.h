@@ -5,14 +5,19 @@
 #include "tarnkiln/support/OldValues.h"
 #include "tarnkiln/support/SlotSet.h"
 #include "tarnkiln/meta/Class.h"
+#include "tarnkiln/meta/Extension.h"
 #include "tarnkiln/meta/Property.h"
 
 #include <boost/optional.hpp>
 
 #include <cstdint>
+#include <memory>
 #include <vector>
 
 namespace tarn::kiln {
+namespace internal {
+class ChangedExtensions;
+}
 
 /// The record of a shallow transaction: which slots of an element changed, and no values.
 ///
@@ -66,6 +71,16 @@ public:
     /// The changed properties, class by class upward, in the order of their owned attributes.
     std::vector<meta::Property> getChangedProperties() const;
 
+    /// \name Extensions
+    /// @{
+    /// Whether the extension changed that the element's class has by that name.
+    bool isExtensionChanged(ustring const& name) const;
+    /// The changed extensions that are still there, in the order of their first change.
+    std::vector<meta::Extension> getChangedExtensions() const;
+    /// Marks the extension; true if it was marked before.
+    bool setModified(meta::Extension const& extension);
+    /// @}
+
     bool isCreated() const { return m_modified.test(0); }
     bool isDestroyed() const { return m_modified.test(slots() + 1); }
     bool isContainerChanged() const { return m_modified.test(slots()); }
@@ -81,10 +96,16 @@ public:
 
 protected:
     friend class ChangesHolder;
+    friend class ModelElement::Impl;
 
     void setContainerChanged(bool changed) { m_modified.set(slots(), changed); }
     void clearModified(unsigned long index) { m_modified.set(index, false); }
-    bool anyChanged() const { return m_modified.any(); }
+    bool anyChanged() const;
+    /// Null as long as none changed.
+    internal::ChangedExtensions* changedExtensions() const { return m_changedExtensions.get(); }
+    internal::ChangedExtensions& makeChangedExtensions();
+    /// The extension that the element's class has by that name; empty if there is none.
+    meta::Extension findExtension(ustring const& name) const;
 
 private:
     unsigned long slots() const { return m_modified.size() - 2; }
@@ -96,6 +117,7 @@ private:
     std::uint32_t m_keepsElement : 1 = 0;
     std::uint32_t m_holderCount : 31 = 0;
     ModelElement::Impl* m_element = nullptr; ///< Not to be followed unless it is kept.
+    std::unique_ptr<internal::ChangedExtensions> m_changedExtensions; ///< Null while there are none.
 };
 
 /// The record of a deep transaction: also the old values. Each class derives its own.
@@ -112,6 +134,13 @@ public:
     /// \throws tarnkiln::messages::NoSuchProperty  (property, class) if it is none of the class.
     virtual Value getOldValue(meta::Property const& property,
                               ReflectionPrivateTag const& tag) const;
+
+    /// The value that the extension of that name had when the transaction began; a value that
+    /// shares the record's collection for many values.
+    ///
+    /// \throws tarnkiln::messages::NoSuchProperty  (name, qualified class name) if the class has no
+    ///     such extension, or it did not change.
+    Value getExtensionOldValue(ustring const& name) const;
 
     /// The container before the transaction; meaningful if `isContainerChanged`.
     ModelElement getOldContainer() const;

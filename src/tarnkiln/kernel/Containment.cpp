@@ -265,6 +265,7 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
         if (removeFromContainer && !isTopLevel())
             _callInverseRemove(*m_container, m_containmentFeature);
         doDestroy(keepIncoming, multiModel);
+        recordEndingExtensions();
         level.finish();
     }
     invalidate();

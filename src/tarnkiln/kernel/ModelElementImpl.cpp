@@ -6,9 +6,11 @@
 #include "tarnkiln/kernel/ModelElementBuilder.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/ExtensionValues.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/AbstractMethodInvoker.h"
 #include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
 #include "tarnkiln/meta/Operation.h"
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
@@ -60,6 +62,7 @@ ModelElement::Impl::~Impl()
     }
     unpinContainer();
     unanchor();
+    destroyExtensionValues();
 }
 
 Model ModelElement::Impl::getModel() const
@@ -69,24 +72,50 @@ Model ModelElement::Impl::getModel() const
 
 void ModelElement::Impl::anchor()
 {
-    if (m_aside != Aside::Nothing || !m_model)
+    if (isProxy() || anchorImpl() || !m_model)
         return;
-    m_anchor = m_model->m_anchor.get();
-    m_anchor->addRef();
+    support::ModelAnchor* const anchor = m_model->m_anchor.get();
+    anchor->addRef();
+    if (internal::ExtensionValues* const values = extensionValues()) {
+        values->anchor = anchor;
+        return;
+    }
+    m_anchor = anchor;
     m_aside = Aside::Anchor;
 }
 
 void ModelElement::Impl::unanchor()
 {
-    if (m_aside != Aside::Anchor)
+    support::ModelAnchor* const anchor = anchorImpl();
+    if (!anchor)
         return;
-    m_aside = Aside::Nothing;
-    m_anchor->removeRef();
-    m_anchor = nullptr;
+    if (internal::ExtensionValues* const values = extensionValues()) {
+        values->anchor = nullptr;
+    }
+    else {
+        m_aside = Aside::Nothing;
+        m_anchor = nullptr;
+    }
+    anchor->removeRef();
+}
+
+/// Null as long as the element is not dead.
+support::ModelAnchor* ModelElement::Impl::anchorImpl() const
+{
+    if (internal::ExtensionValues const* const values = extensionValues())
+        return values->anchor;
+    return m_aside == Aside::Anchor ? m_anchor : nullptr;
+}
+
+Model::Impl* ModelElement::Impl::asideModel() const
+{
+    support::ModelAnchor const* const anchor = anchorImpl();
+    return anchor ? anchor->getModel() : m_model;
 }
 
 void ModelElement::Impl::invalidate()
 {
+    dropEndingExtensions();
     pinContainer();
     anchor();
     ElementImpl::invalidate();
@@ -112,15 +141,24 @@ StoredField ModelElement::Impl::findStoredField(meta::Property const& /*property
 }
 
 Value ModelElement::Impl::getPropertyValue(meta::Property const& property,
-                                           ReflectionPrivateTag const&) const
+                                           ReflectionPrivateTag const& tag) const
 {
-    reportNoSuchProperty(*this, property);
+    meta::Extension const extension =
+        tag == PUBLIC_ACCESS ? meta::Extension() : meta::Extension::cast(property);
+    if (!extension || !isExtensionOfClass(extension))
+        reportNoSuchProperty(*this, property);
+    return getExtension(extension->getName());
 }
 
-void ModelElement::Impl::setPropertyValue(meta::Property const& property, Value const&,
-                                          ReflectionPrivateTag const&)
+void ModelElement::Impl::setPropertyValue(meta::Property const& property, Value const& value,
+                                          ReflectionPrivateTag const& tag)
 {
-    reportNoSuchProperty(*this, property);
+    meta::Extension const extension =
+        tag == PUBLIC_ACCESS ? meta::Extension() : meta::Extension::cast(property);
+    if (!extension)
+        reportNoSuchProperty(*this, property);
+    if (isExtensionOfClass(extension))
+        setExtension(extension->getName(), value);
 }
 
 boost::optional<Value> ModelElement::Impl::invoke(meta::Operation const& operation,
@@ -187,6 +225,7 @@ void ModelElement::Impl::copyStateFromStorage(Storage* storage)
 {
     if (storage->isContainerChanged())
         basicSetContainer(storage);
+    restoreExtensions(*storage);
 }
 
 meta::Property ModelElement::Impl::getPropertyByIndex(unsigned long) const
@@ -227,6 +266,12 @@ void ModelElement::Impl::notifyModifying(unsigned long index)
 {
     if (index != NO_INDEX && m_validity == ElementValidity::Valid)
         m_model->elementModifying(this, index);
+}
+
+void ModelElement::Impl::notifyModifying(meta::Extension const& extension)
+{
+    if (Model::Impl* const model = getModelImpl())
+        model->elementModifying(this, extension);
 }
 
 void ModelElement::Impl::notifyCreated()

@@ -14,11 +14,13 @@
 
 #include <functional>
 #include <memory>
+#include <unordered_map>
 #include <vector>
 
 namespace tarn::kiln {
 
 namespace internal {
+class ExtensionValues;
 class InvariantChecker;
 }
 namespace support {
@@ -59,7 +61,9 @@ public:
     void invalidate() override;
 
     /// \name Reflection
-    /// The base class knows no property: each of these fails with `NoSuchProperty`.
+    /// The base class knows no property but the extensions of its model, under other tags than
+    /// `PUBLIC_ACCESS`: each of these fails with `NoSuchProperty` for all others. Setting an
+    /// extension of another class does nothing.
     /// @{
     virtual bool hasPropertyValue(meta::Property const& property,
                                   ReflectionPrivateTag const& tag) const;
@@ -116,6 +120,8 @@ public:
     virtual Storage* createStorage() const = 0;
     /// Keeps the present value of the slot `index` in `storage`.
     virtual void copyValue(Storage* storage, unsigned long index) const;
+    /// The same for an extension. A value that was kept before stays.
+    void copyValue(Storage* storage, meta::Extension const& extension) const;
     /// Writes the old values back, then the link to the container. Announces nothing.
     virtual void copyStateFromStorage(Storage* storage);
     virtual meta::Property getPropertyByIndex(unsigned long index) const;
@@ -180,6 +186,8 @@ public:
     /// \throws tarnkiln::messages::ModelFrozen, NoOpenTransaction, ChangesProhibited  if the model
     ///     may not be changed now.
     void notifyModifying(unsigned long index);
+    /// The same for an extension, of any element.
+    void notifyModifying(meta::Extension const& extension);
     /// Makes a constructed element `Valid` and enters it in its model, top-level.
     ///
     /// \throws tarnkiln::messages::UUIDConflict  if its model has an element with its UUID.
@@ -187,6 +195,45 @@ public:
     /// Destroys the element and all that it contains, in the open transaction or its own.
     void destroy();
     void destroyRecursively(bool keepIncoming, bool removeFromContainer, bool multiModel);
+    /// @}
+
+    /// \name Extensions
+    /// The values of the properties that the model has added to the class of this element; names
+    /// are those of `Model::Impl::getExtension`. An element has what it was given, else the
+    /// default, which is never stored; and loses it when the extension goes.
+    ///
+    /// Setting fails with `CannotModifyProxy` for a proxy, and does nothing for a dead element.
+    /// Elements that are values are kept in memory until this one is destroyed.
+    /// @{
+    /// The value, or the default. Many values are a collection, which belongs to this element and
+    /// is made at the first call; changes go through it.
+    ///
+    /// \throws tarnkiln::messages::NoSuchExtension  (name, qualified class name) if the class has
+    ///     no such extension, or that no default or no collection.
+    Value getExtension(ustring const& name) const;
+    /// Gives the extension, which has a single value, another one, in the open transaction or in
+    /// one of its own. The default takes away what was set.
+    ///
+    /// What fails after a transaction was joined dooms that.
+    /// \throws tarnkiln::messages::NoSuchExtension  (name, qualified class name) if the class has
+    ///     no such extension, or it has many values.
+    /// \throws tarnkiln::messages::CannotCastIncompatibleTypes, InvalidValue  if the value does not
+    ///     suit, as `Value::checkCompatibleWithProperty` says.
+    /// \throws tarnkiln::messages::ModelFrozen, ChangesProhibited  if the model may not be changed
+    ///     now.
+    void setExtension(ustring const& name, Value const& value);
+    /// The same; `InvalidValue` for an extension that is no more.
+    void setExtension(meta::Extension const& extension, Value const& value);
+    /// Whether it has another value than the default; of many values, whether there are any. False
+    /// if the class has no such extension.
+    bool hasNonDefaultExtension(ustring const& name) const;
+    /// The names of the extensions of which this element holds a value or a collection, in
+    /// ascending order. Among them may be some that are no more.
+    std::vector<ustring> _extensionNames() const;
+    /// Makes values of the first extension of each pair, which is one of the model that the element
+    /// comes from, those of the second.
+    void updateDynamicValuesOnMoveToAnotherModel(
+        std::unordered_map<meta::Extension, meta::Extension> const& mapping);
     /// @}
 
     /// \name Proxies
@@ -230,10 +277,7 @@ public:
     /// @}
 
     /// The model; null for a proxy or a dead element whose model is gone.
-    Model::Impl* getModelImpl() const
-    {
-        return m_aside == Aside::Anchor ? m_anchor->getModel() : m_model;
-    }
+    Model::Impl* getModelImpl() const { return m_aside < Aside::Anchor ? m_model : asideModel(); }
 
 protected:
     /// Tells the invalidate callback, if there is one, that `collection` dies with this element.
@@ -252,19 +296,38 @@ private:
     void unpinContainer();
     void anchor();
     void unanchor();
+    support::ModelAnchor* anchorImpl() const;
+    Model::Impl* asideModel() const;
+
+    /// Null as long as there are none.
+    internal::ExtensionValues* extensionValues() const
+    {
+        return m_aside == Aside::Extensions ? m_extensionValues : nullptr;
+    }
+    internal::ExtensionValues& makeExtensionValues() const;
+    void destroyExtensionValues();
+    meta::Extension findExtension(ustring const& name) const;
+    DynamicValue* findExtensionValue(ustring const& name, meta::Extension const& extension) const;
+    AbstractOwnedCollection* makeExtensionCollection(meta::Extension const& extension) const;
+    bool isExtensionOfClass(meta::Extension const& extension) const;
+    void recordEndingExtensions();
+    void dropEndingExtensions();
+    void restoreExtensions(Storage& storage);
+
     static constexpr std::uint32_t NOT_TOP_LEVEL = ~std::uint32_t{0};
     static constexpr std::uint32_t NOT_RECORDED = ~std::uint32_t{0};
 
-    /// What `m_proxyId` and `m_anchor` share their place for.
+    /// What the members of the union share their place for.
     enum class Aside : unsigned char
     {
         Nothing,
         ProxyId, ///< Of a proxy, dead or not.
-        Anchor   ///< Of any other dead element.
+        Anchor,  ///< Of any other dead element.
+        Extensions ///< Of an element that was given any, dead or not; with the anchor.
     };
 
     bool m_containerPinned = false; ///< A dead element keeps its container in memory.
-    Aside m_aside = Aside::Nothing;
+    mutable Aside m_aside = Aside::Nothing; ///< Reading an extension may make its collection.
     std::uint32_t m_topLevelIndex = NOT_TOP_LEVEL;
     std::uint32_t m_recordPlace = NOT_RECORDED; ///< In the last transaction that recorded it.
     Impl* m_container = nullptr;
@@ -272,8 +335,9 @@ private:
     Model::Impl* m_model; ///< Not to be followed in a dead element, which has an anchor.
     union
     {
-        tarn::kiln::ProxyId* m_proxyId = nullptr; ///< Owned.
-        support::ModelAnchor* m_anchor;           ///< Counted.
+        tarn::kiln::ProxyId* m_proxyId = nullptr;             ///< Owned.
+        support::ModelAnchor* m_anchor;                       ///< Counted.
+        mutable internal::ExtensionValues* m_extensionValues; ///< Owned.
     };
 };
 

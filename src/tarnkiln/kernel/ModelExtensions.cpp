@@ -7,6 +7,7 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/DeclaredExtensions.h"
+#include "tarnkiln/kernel/internal/ExtensionGroups.h"
 #include "tarnkiln/kernel/internal/TypeKind.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/ClassImpl.h"
@@ -54,17 +55,6 @@ void requireCollection(meta::Extension const& extension)
         reportException(messages::CannotInstantiateCollection(qualifiedName(extension->getType())));
 }
 
-/// What `extended` has from the model with that counter; made if there is nothing.
-meta::DynamicExtensions requireGroup(meta::Class const& extended, unsigned long modelCounter)
-{
-    if (auto const present = extended->getExtensions().find(modelCounter))
-        return present;
-    auto const group = meta::DynamicExtensions::create(extended->getModel());
-    group->setModelID(modelCounter);
-    group->setOwningClass(extended);
-    return group;
-}
-
 meta::Extension makeExtension(meta::DynamicExtensions const& owner, meta::Type const& type,
                               meta::ExtensionPrototype const& prototype)
 {
@@ -79,12 +69,6 @@ meta::Extension makeExtension(meta::DynamicExtensions const& owner, meta::Type c
     extension->setIsPublicAccessor(true);
     extension->setIsPublicMutator(true);
     return extension;
-}
-
-void requireCommit(Transaction const& transaction)
-{
-    if (transaction.commit() != TransactionResult::Committed)
-        reportException(messages::NoOpenTransaction());
 }
 }  // namespace
 
@@ -109,17 +93,23 @@ void Model::Impl::extendMetaclass(meta::Class const& extended,
 
     Transaction const transaction = locked.getModel()->beginTransaction(/*revertible=*/true);
     meta::Extension const extension =
-        makeExtension(requireGroup(extended, m_modelCounter), type, prototype);
+        makeExtension(internal::requireExtensionGroup(extended, m_modelCounter), type, prototype);
     if (defaultValue)
         defaultValue->checkCompatibleWithProperty(extension);
     if (!isSingle)
         requireCollection(extension);
-    requireCommit(transaction);
+    // Another transaction is open and may end as it likes.
+    if (transaction.commit() != TransactionResult::Committed)
+    {
+        m_extensions->markIncomplete();
+        reportException(messages::NoOpenTransaction());
+    }
 
     // A reference is never stored as a default: it could keep an element of another model.
     bool const isEmptyByDefault = isSingle && isReference;
-    m_extensions->add(
-        name, {extension, isEmptyByDefault ? Value::createEmptyValue(type, true) : defaultValue});
+    m_extensions->add(name, {extension,
+                             isEmptyByDefault ? Value::createEmptyValue(type, true) : defaultValue,
+                             extended});
     notifyExtensionAdded(extension);
 }
 
@@ -137,9 +127,9 @@ void Model::Impl::unextendMetaclass(meta::Class const& extended, ustring const& 
         [&](ExtensionListener& listener) { listener.extensionRemoved(getModel(), extension); });
     meta::DynamicExtensions const group = extension->getOwner();
     extension->destroy();
-    if (group && group->getExtensions().empty())
-        group->destroy();
-    requireCommit(transaction);
+    internal::dropEmptyExtensionGroup(group);
+    if (transaction.commit() != TransactionResult::Committed)
+        reportException(messages::NoOpenTransaction());
     m_extensions->remove(declaredName, extension);
 }
 
@@ -153,7 +143,24 @@ meta::Extension Model::Impl::getDeclaredExtension(meta::Class const& extended,
     return found ? found : meta::Extension();
 }
 
+internal::DeclaredExtensionRecord const*
+Model::Impl::findExtensionRecord(meta::Class const& metaClass, ustring const& name) const
+{
+    if (m_extensions->isComplete())
+        return m_extensions->findFor(metaClass, name);
+    meta::Extension const extension = findExtensionInRegistry(metaClass, name);
+    return extension ? m_extensions->find(name, extension) : nullptr;
+}
+
+/// What this model extends is in its own table; others may have declared more in its name.
 meta::Extension Model::Impl::getExtension(meta::Class const& metaClass, ustring const& name) const
+{
+    DeclaredExtensions::Record const* const known = findExtensionRecord(metaClass, name);
+    return known ? known->extension : findExtensionInRegistry(metaClass, name);
+}
+
+meta::Extension Model::Impl::findExtensionInRegistry(meta::Class const& metaClass,
+                                                     ustring const& name) const
 {
     MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
     // A description may close the superclasses to a ring.
@@ -169,9 +176,7 @@ meta::Extension Model::Impl::getExtension(meta::Class const& metaClass, ustring 
 
 Value Model::Impl::getExtensionDefault(meta::Class const& metaClass, ustring const& name) const
 {
-    meta::Extension const extension = getExtension(metaClass, name);
-    DeclaredExtensions::Record const* const record =
-        extension ? m_extensions->find(name, extension) : nullptr;
+    DeclaredExtensions::Record const* const record = findExtensionRecord(metaClass, name);
     if (!record || !record->defaultValue)
         reportException(messages::NoSuchExtension(name, qualifiedName(metaClass)));
     return *record->defaultValue;

@@ -35,7 +35,7 @@ Model::Impl::Impl(UUID const& id, ModelConstellation const& constellation)
     : ElementImpl(id, ElementValidity::Valid)
     , m_modelCounter(++modelsCreated)
     , m_anchor(new support::ModelAnchor(this))
-    , m_extensions(std::make_unique<internal::DeclaredExtensions>())
+    , m_extensions(std::make_unique<internal::DeclaredExtensions>(m_modelCounter))
     , m_usageProvider(std::make_unique<DefaultModelUsageProvider>())
     , m_transactionFactory(std::make_unique<internal::LocalTransactionFactoryImpl>(*this))
 {
@@ -162,6 +162,13 @@ void Model::Impl::elementModifying(ModelElement::Impl* element, unsigned long in
     validateTransaction();
     if (isRecording())
         m_currentTransaction->elementModifying(element, index);
+}
+
+void Model::Impl::elementModifying(ModelElement::Impl* element, meta::Extension const& extension)
+{
+    validateTransaction();
+    if (isRecording())
+        m_currentTransaction->elementModifying(element, extension);
 }
 
 void Model::Impl::elementMadeTopLevel(ModelElement::Impl* element)
@@ -400,7 +407,7 @@ void Model::Impl::destroyAllContents()
 
 /// Top-level elements in their order, in which they also lie in memory more or less, and then what
 /// they contain.
-void Model::Impl::convertAllReferencesToProxies(bool multiModel)
+std::vector<ModelElement> Model::Impl::getElementsInOrder() const
 {
     std::vector<ModelElement> elements = m_topLevelElements.all();
     if (elements.size() != m_elements.size()) {
@@ -409,7 +416,12 @@ void Model::Impl::convertAllReferencesToProxies(bool multiModel)
                 elements.emplace_back(element);
         });
     }
-    for (ModelElement const& element : elements) {
+    return elements;
+}
+
+void Model::Impl::convertAllReferencesToProxies(bool multiModel)
+{
+    for (ModelElement const& element : getElementsInOrder()) {
         boost::optional<ProxyId> proxyId;
         element->convertReferencesToProxies(multiModel, proxyId);
     }

@@ -27,6 +27,7 @@ class DataSource;
 }
 namespace internal {
 class DeclaredExtensions;
+struct DeclaredExtensionRecord;
 class LocalTransactionFactoryImpl;
 }
 
@@ -106,6 +107,7 @@ public:
     void elementDestroying(ModelElement::Impl* element);
     void allElementsDestroying();
     void elementModifying(ModelElement::Impl* element, unsigned long index);
+    void elementModifying(ModelElement::Impl* element, meta::Extension const& extension);
     void elementMadeTopLevel(ModelElement::Impl* element);
     void elementNoLongerTopLevel(ModelElement::Impl* element);
     void remove(ModelElement::Impl* element);
@@ -181,6 +183,15 @@ public:
     /// \throws tarnkiln::messages::NoSuchExtension  (name, qualified class name) if there is no such
     ///     extension, or none with a default.
     Value getExtensionDefault(meta::Class const& metaClass, ustring const& name) const;
+    /// What stands in this model for `extension`, which another model declared: an extension of
+    /// this model that has the same name and shape and is on the same class or above; `extension`
+    /// itself if there is no such name; empty if there is another extension of that name that
+    /// differs, or that is on a class below.
+    ///
+    /// \param defaultValue  of `extension`. Both must be absent or equal, unless the type is a
+    ///     class or there are many values.
+    meta::Extension validateExtension(meta::Extension const& extension,
+                                      boost::optional<Value> const& defaultValue) const;
     /// Tells all listeners that there is a new extension.
     void notifyExtensionAdded(meta::Extension const& extension);
     /// Not owned; one that is there is not added again.
@@ -209,6 +220,22 @@ public:
     /// \throws tarnkiln::messages::CannotJoinShallowTransaction, UniquenessConstraint  as for a
     ///     new model.
     void migrateToConstellation(ModelConstellation const& target);
+    /// Moves all elements into another model, with their UUIDs, proxies and extension values; there
+    /// they count as created, in the open transaction or in one of its own. This model is empty
+    /// afterwards, has no extensions and can be used. Its dead elements stay dead elements of it.
+    ///
+    /// Extensions go along; one that `target` has already, in the same shape, is taken instead. A
+    /// failure leaves both models as they were. Danger: what the transaction of `target` takes back
+    /// later, or a listener of `target` refuses at its end, is lost; it does not return to here.
+    /// \throws tarnkiln::messages::CannotChangeModel  if `target` is this model or not live, if
+    ///     this model has a listener or an open transaction, or if a listener of the registry
+    ///     refuses that the extensions move.
+    /// \throws tarnkiln::messages::ExtensionNameMustBeUnique  if `target` has another extension of
+    ///     a name that this model has, on the same line of inheritance.
+    /// \throws tarnkiln::messages::ModelFrozen   if `target` is frozen.
+    /// \throws tarnkiln::messages::UUIDConflict  if `target` has an element with the UUID of one.
+    /// \throws tarnkiln::messages::CreateWithDestroyAll, ChangesProhibited  as for a new element.
+    void moveAllContentsTo(Model const& target);
     /// Whether other models change together with this one.
     bool isMultiModel() const;
     unsigned long getModelCounter() const { return m_modelCounter; }
@@ -288,6 +315,13 @@ private:
 
     void forgetListener(ListenerHolderBase* holder);
     void removeAllListeners();
+    class ContentsMove; // ModelMoving.cpp
+
+    internal::DeclaredExtensionRecord const* findExtensionRecord(meta::Class const& metaClass,
+                                                                 ustring const& name) const;
+    meta::Extension findExtensionInRegistry(meta::Class const& metaClass,
+                                            ustring const& name) const;
+    std::vector<ModelElement> getElementsInOrder() const;
     void tellExtensionListeners(std::function<void(ExtensionListener&)> const& tell);
     void destroyExtensions();
     void convertAllReferencesToProxies(bool multiModel);

@@ -76,6 +76,29 @@ std::vector<meta::Property> ReportData::getChangedProperties(ModelElement const&
     return record ? record->getChangedProperties() : std::vector<meta::Property>();
 }
 
+bool ReportData::isExtensionChanged(ModelElement const& element, ustring const& name) const
+{
+    ModelElement::Impl::Changes const* const record = element ? findRecord(element) : nullptr;
+    return record && record->isExtensionChanged(name);
+}
+
+std::vector<meta::Extension> ReportData::getChangedExtensions(ModelElement const& element) const
+{
+    ModelElement::Impl::Changes const* const record = element ? findRecord(element) : nullptr;
+    return record ? record->getChangedExtensions() : std::vector<meta::Extension>();
+}
+
+Value ReportData::getExtensionOldValue(ModelElement const& element, ustring const& name) const
+{
+    if (!m_deep)
+        reportException(tarnkiln::messages::GetOldValueFromNonDeep());
+    auto const* const record = findRecord(element);
+    if (!record)
+        reportException(tarnkiln::messages::NoSuchProperty(
+            name, element.getImpl() ? internal::qualifiedName(element->getMetaClass()) : ustring()));
+    return static_cast<ModelElement::Impl::Storage const*>(record)->getExtensionOldValue(name);
+}
+
 Value ReportData::getOldValue(ModelElement const& element, meta::Property const& property) const
 {
     if (!m_deep)

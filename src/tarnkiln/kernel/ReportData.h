@@ -55,6 +55,16 @@ public:
     bool isChanged(ModelElement const& element, meta::Property const& property) const;
     /// Empty for an element that is not live or did not change.
     std::vector<meta::Property> getChangedProperties(ModelElement const& element) const;
+    /// The same for the extension of that name.
+    bool isExtensionChanged(ModelElement const& element, ustring const& name) const;
+    /// Those that are still there, in the order of their first change.
+    std::vector<meta::Extension> getChangedExtensions(ModelElement const& element) const;
+    /// The value that the extension had before the transaction, also of a destroyed element.
+    ///
+    /// \throws tarnkiln::messages::GetOldValueFromNonDeep  if the transaction was shallow.
+    /// \throws tarnkiln::messages::NoSuchProperty  (name, qualified class name; empty for an empty
+    ///     handle) if the extension of the element did not change, or there is none.
+    Value getExtensionOldValue(ModelElement const& element, ustring const& name) const;
     /// The value before the transaction, also of a destroyed element; the empty value for a
     /// property that the transaction did not record.
     ///

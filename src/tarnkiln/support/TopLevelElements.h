@@ -62,6 +62,18 @@ public:
         while (!m_elements.empty())
             erase(m_elements.back().getImpl());
     }
+    /// Drops all handles of elements that stand in another set by now.
+    void abandon()
+    {
+        m_elements.clear();
+        m_mayReturn = 0;
+    }
+    /// Tells the elements their places, after they had places in another set.
+    void resume()
+    {
+        for (std::size_t i = 0; i < m_elements.size(); ++i)
+            m_elements[i]->m_topLevelIndex = static_cast<std::uint32_t>(i);
+    }
     std::vector<ModelElement> const& all() const { return m_elements; }
     std::size_t size() const { return m_elements.size(); }
 

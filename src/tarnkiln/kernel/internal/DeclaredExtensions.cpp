@@ -1,5 +1,9 @@
 #include "tarnkiln/kernel/internal/DeclaredExtensions.h"
 
+#include "tarnkiln/meta/ClassImpl.h"
+#include "tarnkiln/meta/DynamicExtensionsImpl.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
+
 #include <algorithm>
 #include <utility>
 
@@ -39,6 +43,32 @@ DeclaredExtensions::Record const* DeclaredExtensions::find(ustring const& name,
     auto const range = m_records.equal_range(name);
     auto const place = findIn(range, extension);
     return place == range.second ? nullptr : &place->second;
+}
+
+bool DeclaredExtensions::isCurrent(Record const& record) const
+{
+    if (!record.extension)
+        return false;
+    auto const* const group = record.extension->getOwnerImpl();
+    return group && group->isLive() && group->getModelID() == m_modelCounter &&
+           group->getOwningClassImpl() == record.extended.getImpl();
+}
+
+DeclaredExtensions::Record const* DeclaredExtensions::findFor(meta::Class const& metaClass,
+                                                              ustring const& name) const
+{
+    Record const* nearest = nullptr;
+    if (!metaClass)
+        return nearest;
+    auto const [first, last] = m_records.equal_range(name);
+    for (auto place = first; place != last; ++place)
+    {
+        Record const& record = place->second;
+        if (isCurrent(record) && metaClass->isA(record.extended) &&
+            (!nearest || record.extended->isA(nearest->extended)))
+            nearest = &record;
+    }
+    return nearest;
 }
 
 void DeclaredExtensions::add(ustring const& name, Record record)

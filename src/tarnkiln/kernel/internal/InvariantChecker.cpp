@@ -1,8 +1,13 @@
 #include "tarnkiln/kernel/internal/InvariantChecker.h"
 
 #include "tarnkiln/Assert.h"
+#include "tarnkiln/collections/AbstractOwnedCollection.h"
+#include "tarnkiln/kernel/internal/DeclaredExtensions.h"
+#include "tarnkiln/kernel/internal/ExtensionValues.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/Class.h"
+#include "tarnkiln/meta/DynamicExtensionsImpl.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
 #include "tarnkiln/meta/Property.h"
 
 #include "sill/i18n/StringConversion.h"
@@ -60,6 +65,9 @@ std::vector<string> InvariantChecker::run()
         checkReference(reference);
     m_model.m_elements.forEach([this](ModelElement::Impl* element) { checkContainer(*element); });
     checkCycles();
+    checkDeclaredExtensions();
+    m_model.m_elements.forEach(
+        [this](ModelElement::Impl* element) { checkExtensionValues(*element); });
     return std::move(m_violations);
 }
 
@@ -169,6 +177,47 @@ void InvariantChecker::checkCycles()
             report("contains itself", *at);
         settled.insert(path.begin(), path.end());
     });
+}
+
+/// The registry may have lost any of them, or gained others in this model's name.
+void InvariantChecker::checkDeclaredExtensions()
+{
+    for (auto const& [name, record] : m_model.m_extensions->records()) {
+        if (!record.extension)
+            continue;
+        bool const isSingle = record.extension->getUpper() == 1;
+        if (isSingle && !record.defaultValue)
+            m_violations.push_back("the extension '" + sill::i18n::to_string(name)
+                                   + "' has a single value and no default");
+    }
+}
+
+void InvariantChecker::checkExtensionValues(ModelElement::Impl const& element)
+{
+    ExtensionValues const* const values = element.extensionValues();
+    if (!values)
+        return;
+    if (values->anchor)
+        report("is alive and anchored as a dead one", element);
+    for (ExtensionValues::Entry const& entry : values->entries()) {
+        if (entry.value.isEmpty() || !entry.extension)
+            continue;
+        if (entry.value.isCollection() == (entry.extension->getUpper() == 1))
+            report("has a value of another shape than its extension", element);
+        auto const* const group = entry.extension->getOwnerImpl();
+        if (!group || group->getModelID() != m_model.m_modelCounter)
+            report("has a value of an extension of another model", element);
+        AbstractOwnedCollection const* const collection = entry.value.getCollection();
+        if (collection
+            && (collection->getOwner() != &element
+                || collection->getCollectionProperty() != entry.extension))
+            report("has an extension's collection that is of something else", element);
+        auto const* const record =
+            m_model.m_extensions->find(entry.extension->getName(), entry.extension);
+        if (!collection && record && record->defaultValue
+            && entry.value.getValue() == *record->defaultValue)
+            report("stores the default of an extension", element);
+    }
 }
 
 void InvariantChecker::report(string const& sentence, ModelElement::Impl const& element)

@@ -17,6 +17,8 @@ namespace tarn::kiln::internal {
 /// | top level | exactly the elements without a link stand in the set |
 /// | containment | a link and the composite reference that holds the element agree; no cycles |
 /// | opposites | a reference between two elements of the model is answered by the other end |
+/// | extensions | values differ from the default, collections are of their element and extension, |
+/// |            | and both are of live extensions of this model, as far as these live |
 class InvariantChecker
 {
 public:
@@ -40,6 +42,8 @@ private:
     void checkReference(Reference const& reference);
     void checkContainer(ModelElement::Impl const& element);
     void checkCycles();
+    void checkDeclaredExtensions();
+    void checkExtensionValues(ModelElement::Impl const& element);
     bool isHere(ModelElement::Impl const& element) const;
     bool refersBack(Reference const& reference) const;
     void report(string const& sentence, ModelElement::Impl const& element);

@@ -171,13 +171,32 @@ void TransactionImpl::elementModifying(ModelElement::Impl* element, unsigned lon
         return;
     announceFirstChange();
     record(element, [&](ModelElement::Impl::Changes& changes) {
-        if (changes.isCreated() || (!has(DEEP) && changes.isDestroyed())
-            || changes.isSlotChanged(index))
+        if (isSettled(changes) || changes.isSlotChanged(index))
             return;
         if (has(DEEP))
             element->copyValue(static_cast<ModelElement::Impl::Storage*>(&changes), index);
         changes.setModified(index);
     });
+}
+
+void TransactionImpl::elementModifying(ModelElement::Impl* element,
+                                       meta::Extension const& extension)
+{
+    if (!startRecording())
+        return;
+    announceFirstChange();
+    record(element, [&](ModelElement::Impl::Changes& changes) {
+        if (isSettled(changes))
+            return;
+        if (has(DEEP))
+            element->copyValue(static_cast<ModelElement::Impl::Storage*>(&changes), extension);
+        changes.setModified(extension);
+    });
+}
+
+bool TransactionImpl::isSettled(ModelElement::Impl::Changes const& record) const
+{
+    return record.isCreated() || (!has(DEEP) && record.isDestroyed());
 }
 
 void TransactionImpl::containerChanging(ModelElement::Impl* element)

@@ -45,6 +45,7 @@ public:
     virtual void elementDestroying(ModelElement::Impl* element);
     virtual void allElementsDestroying();
     virtual void elementModifying(ModelElement::Impl* element, unsigned long index);
+    virtual void elementModifying(ModelElement::Impl* element, meta::Extension const& extension);
     /// Keeps the present link to the container, in a deep transaction.
     void containerChanging(ModelElement::Impl* element);
     /// Takes back what `elementCreated` recorded, when the creation has failed after all.
@@ -125,6 +126,8 @@ private:
     void announceFirstChange();
     template <class Fill>
     void record(ModelElement::Impl* element, Fill const& fill);
+    /// Whether the record takes no more changes of values.
+    bool isSettled(ModelElement::Impl::Changes const& record) const;
     bool hasNews() const;
     bool anyListener(ReportKind kind) const;
     bool belongsTo(ModelElement::Impl::Changes const& record,
