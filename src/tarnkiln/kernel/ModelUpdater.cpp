@@ -1,0 +1,6 @@
+#include "tarnkiln/kernel/ModelUpdater.h"
+
+namespace tarn::kiln {
+
+ModelUpdater::~ModelUpdater() = default;
+}  // namespace tarn::kiln
