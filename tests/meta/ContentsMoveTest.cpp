@@ -452,6 +452,39 @@ TEST_F(MovedContents, RecordChangesOfCollectionsUnderTheExtensionOfTheTarget)
     EXPECT_THAT(numbersIn(m_child->getExtension(u"pages")), ElementsAre(1));
 }
 
+TEST_F(MovedContents, MayTakeOneExtensionForThoseOfSeveralClasses)
+{
+    RegistryElement<Class> const text(u"MovedText");
+    RegistryElement<Class> const novel(u"MovedNovel");
+    RegistryElement<Class> const magazine(u"MovedMagazine");
+    {
+        RegistrySession session;
+        novel->setSuperclass(text);
+        magazine->setSuperclass(text);
+        session.commit();
+    }
+    for (Class const& cls : {novel.get(), magazine.get()})
+        m_source->extendMetaclass(cls, prototype(u"row"), number(0));
+    m_target->extendMetaclass(text, prototype(u"row"), number(0));
+    ModelElement const one = ModelElement::createReflective(m_source, novel);
+    ModelElement const two = ModelElement::createReflective(m_source, magazine);
+    one->setExtension(u"row", number(1));
+    two->setExtension(u"row", number(2));
+
+    m_target->setUsageProvider(std::make_unique<StrictProvider>(5));
+    EXPECT_THROW(move(), std::runtime_error);
+    EXPECT_EQ(one->getExtension(u"row"), number(1)) << "it has that of its own class again";
+    EXPECT_EQ(two->getExtension(u"row"), number(2));
+    move();
+    EXPECT_EQ(one->getExtension(u"row"), number(1));
+    EXPECT_EQ(two->getExtension(u"row"), number(2));
+
+    EXPECT_TRUE(novel->getExtensions().empty());
+    EXPECT_TRUE(magazine->getExtensions().empty());
+    m_target->destroy();
+    m_target = Model();
+}
+
 TEST_F(MovedContents, StayIfAnExtensionOfTheTargetIsInTheWay)
 {
     extend(m_source, u"other", 1);

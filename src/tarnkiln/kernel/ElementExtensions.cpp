@@ -122,7 +122,7 @@ Value ModelElement::Impl::getExtension(ustring const& name) const
     DynamicValue const* const held = findExtensionValue(name, extension);
     if (!extension)
         reportNoSuchExtension(*this, name);
-    if (!isSingle(extension))
+    if (held ? held->isCollection() : !isSingle(extension))
         return Value::createCollectionValue(extension, held ? held->getCollection()
                                                             : makeExtensionCollection(extension));
     return held ? held->getValue() : getModelImpl()->getExtensionDefault(getMetaClass(), name);
@@ -187,7 +187,7 @@ void ModelElement::Impl::setExtension(meta::Extension const& extension, Value co
             extensionValues()->reset(extension);
         }
     }
-    else if (!present || !(present->getValue() == wanted.getValue()))
+    else if (!present || present->isCollection() || !(present->getValue() == wanted.getValue()))
     {
         makeExtensionValues().reserve(extension);
         notifyModifying(extension);
@@ -209,7 +209,7 @@ void ModelElement::Impl::copyValue(Storage* storage, meta::Extension const& exte
     ChangedExtensions::Entry entry;
     entry.extension = extension;
     entry.wasSet = present != nullptr;
-    if (isSingle(extension))
+    if (present ? !present->isCollection() : isSingle(extension))
     {
         entry.old = DynamicValue(
             present ? present->getValue()

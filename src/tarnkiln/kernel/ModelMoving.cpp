@@ -5,6 +5,7 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/internal/DeclaredExtensions.h"
 #include "tarnkiln/kernel/internal/ExtensionGroups.h"
+#include "tarnkiln/kernel/internal/ExtensionValues.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/kernel/internal/TypeKind.h"
 #include "tarnkiln/meta/ClassImpl.h"
@@ -91,13 +92,13 @@ private:
     void takeBackExtensions();
     void moveElement(ModelElement::Impl& element);
     void takeBackElements();
+    void takeBackValues(ModelElement::Impl& element) const;
     void leaveTarget(ModelElement::Impl& element);
 
     Impl& m_source;
     Impl& m_target;
     std::vector<std::pair<ustring, DeclaredExtensionRecord>> m_moving;  ///< By name.
     Mapping m_matched;  ///< From those that end to those of the target that stand for them.
-    Mapping m_back;     ///< The same the other way round.
     std::vector<ModelElement> m_elements;
     std::size_t m_begun = 0;  ///< So many of the elements are no more as they were, ...
     std::size_t m_moved = 0;  ///< ... of which so many have arrived.
@@ -137,7 +138,6 @@ void Model::Impl::ContentsMove::matchExtensions()
             continue;
         }
         m_matched.emplace(record.extension, match);
-        m_back.emplace(match, record.extension);
     }
 }
 
@@ -212,21 +212,20 @@ void Model::Impl::ContentsMove::takeBackExtensions()
 /// The extensions that the target had already have taken the place of these.
 void Model::Impl::ContentsMove::endMatchedExtensions()
 {
-    if (m_source.m_extensions->isEmpty())
-        return;
-    m_source.m_extensions->clear();
-    if (m_matched.empty())
-        return;
-    MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
-    Transaction const transaction = locked.getModel()->beginTransaction(/*revertible=*/true);
-    for (auto const& [extension, match] : m_matched)
+    if (!m_matched.empty())
     {
-        meta::DynamicExtensions const group =
-            extension ? extension->getOwner() : meta::DynamicExtensions();
-        if (group)
-            group->destroy();
+        MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
+        Transaction const transaction = locked.getModel()->beginTransaction(/*revertible=*/true);
+        for (auto const& [extension, match] : m_matched)
+        {
+            meta::DynamicExtensions const group =
+                extension ? extension->getOwner() : meta::DynamicExtensions();
+            if (group)
+                group->destroy();
+        }
+        transaction.commit();
     }
-    transaction.commit();
+    m_source.m_extensions->clear();
 }
 
 // ---------------------------------------------------------------------------- elements
@@ -255,6 +254,8 @@ void Model::Impl::ContentsMove::moveElements()
     m_target.m_proxies.merge(m_source.m_proxies);
     m_source.m_elements.clear();
     m_source.m_topLevelElements.abandon();
+    for (auto const& [name, record] : m_moving)
+        m_source.m_extensions->remove(name, record.extension);
     step.close();
     transaction.commit();
     if (m_source.m_usageProvider)
@@ -283,12 +284,24 @@ void Model::Impl::ContentsMove::takeBackElements()
         m_target.m_elements.erase(&element);
         m_target.m_topLevelElements.erase(&element);
         element.m_model = &m_source;
-        if (!m_back.empty())
-            element.updateDynamicValuesOnMoveToAnotherModel(m_back);
+        takeBackValues(element);
     }
     if (m_begun != m_moved)  // a conflict has made it nil
         m_elements[m_moved].getImpl()->m_uuid = m_uuid;
     m_source.m_topLevelElements.resume();
+}
+
+/// Extensions of several classes may have given way to one of a class above them.
+void Model::Impl::ContentsMove::takeBackValues(ModelElement::Impl& element) const
+{
+    internal::ExtensionValues* const values = element.extensionValues();
+    if (!values)
+        return;
+    for (auto const& [extension, match] : m_matched)
+    {
+        if (element.isExtensionOfClass(extension))
+            values->replaceExtension(match, extension);
+    }
 }
 
 void Model::Impl::ContentsMove::leaveTarget(ModelElement::Impl& element)

@@ -28,9 +28,10 @@ namespace {
 void swapCollection(ChangedExtensions::Entry& entry, ExtensionValues& values)
 {
     AbstractOwnedCollection& old = *entry.old.getCollection();
-    if (ExtensionValues::DynamicValue* const present = values.find(entry.extension))
+    ExtensionValues::DynamicValue* const present = values.find(entry.extension);
+    if (present && present->isCollection())
         present->getCollection()->basicSwapContents(old);
-    else if (entry.spare)
+    else if (!present && entry.spare)
     {
         entry.spare->basicSwapContents(old);
         values.put(entry.extension, ExtensionValues::DynamicValue(entry.spare.release()));
