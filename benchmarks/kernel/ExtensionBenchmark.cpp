@@ -141,8 +141,7 @@ BENCHMARK(BM_Read_PropertyByReflection)->Apply(sizes);
 void BM_Read_Extension(benchmark::State& state)
 {
     ustring const name = SHELF;
-    readAll(state,
-            [&](Node const& node) { return node->getExtension(name).template getValue<int>(); });
+    readAll(state, [&](Node const& node) { return node->getExtension(name).getValue<int>(); });
 }
 BENCHMARK(BM_Read_Extension)->Apply(sizes);
 

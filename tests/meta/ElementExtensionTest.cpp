@@ -468,6 +468,88 @@ TEST_F(ExtendedElements, KeepHostArraysThroughTheirConverter)
     registry.unregisterOwnershipConverter(StandardTypes::hostArrayMeta);
 }
 
+// ---------------------------------------------------------------------------- moving
+
+TEST_F(ExtendedElements, GiveValuesOfOneExtensionToAnother)
+{
+    m_node->setExtension(u"shelf", number(3));
+    m_node->setExtension(u"friend", Value(nodes(), m_other));
+    addPage(m_node, 1);
+    m_model->extendMetaclass(nodes(), prototype(u"row"), number(0));
+    m_model->extendMetaclass(nodes(), manyNumbers(u"sheets"), boost::none);
+
+    for (Node const& node : {m_node, m_other})
+        node->updateDynamicValuesOnMoveToAnotherModel(
+            {{extension(u"shelf"), extension(u"row")},
+             {extension(u"pages"), extension(u"sheets")}});
+
+    EXPECT_EQ(m_node->_extensionNames(), (Names{u"friend", u"row", u"sheets"}));
+    EXPECT_EQ(m_node->getExtension(u"row"), number(3));
+    EXPECT_EQ(shelf(m_node), 0);
+    EXPECT_THAT(numbersIn(m_node->getExtension(u"sheets")), ElementsAre(1));
+    EXPECT_THAT(m_other->_extensionNames(), IsEmpty());
+}
+
+// ---------------------------------------------------------------------------- invariants
+
+class BrokenExtensions : public ExtendedElements
+{
+protected:
+    BrokenExtensions()
+    {
+        m_node->setExtension(u"shelf", number(3));
+        addPage(m_node, 1);
+    }
+    ~BrokenExtensions() override
+    {
+        m_model->destroy();
+        m_model = Model();
+    }
+
+    void expectReported(std::string const& sentence) const
+    {
+        EXPECT_THAT(m_model->checkInvariants(), ElementsAre(::testing::HasSubstr(sentence)));
+    }
+};
+
+TEST_F(BrokenExtensions, AreReportedIfTheValueHasAnotherShape)
+{
+    {
+        RegistrySession session;
+        extension(u"shelf")->setUpper(2);
+        session.commit();
+    }
+    expectReported("has a value of another shape than its extension");
+}
+
+TEST_F(BrokenExtensions, AreReportedIfTheyBelongToAnotherModel)
+{
+    Model const other = Model::create(ModelConstellation());
+    other->extendMetaclass(nodes(), prototype(u"row"), number(0));
+    {
+        RegistrySession session;
+        extension(u"shelf")->setOwner(other->getDeclaredExtension(nodes(), u"row")->getOwner());
+        session.commit();
+    }
+    expectReported("has a value of an extension of another model");
+}
+
+TEST_F(BrokenExtensions, AreReportedIfTheirCollectionIsOfSomethingElse)
+{
+    m_node->getExtension(u"pages").getValue<AbstractPrimitiveCollection&>().basicSetProperty(
+        extension(u"types"));
+
+    expectReported("has an extension's collection that is of something else");
+}
+
+TEST_F(BrokenExtensions, AreReportedIfTheDefaultIsStored)
+{
+    m_model->extendMetaclass(nodes(), prototype(u"row"), number(3));
+    m_node->updateDynamicValuesOnMoveToAnotherModel({{extension(u"shelf"), extension(u"row")}});
+
+    expectReported("stores the default of an extension");
+}
+
 // ---------------------------------------------------------------------------- the end
 
 TEST_F(ExtendedElements, TellAHostOfTheirCollectionsBeforeTheyDieThemselves)
