@@ -34,6 +34,19 @@ void* allocate(std::size_t size)
     return block;
 }
 
+/// `std::stable_sort` and its like take their buffers this way.
+void* allocateOrNothing(std::size_t size) noexcept
+{
+    try
+    {
+        return allocate(size);
+    }
+    catch (std::bad_alloc const&)
+    {
+        return nullptr;
+    }
+}
+
 void release(void* block)
 {
     if (block)
@@ -74,6 +87,14 @@ void* operator new(std::size_t size)
 void* operator new[](std::size_t size)
 {
     return testkit::allocate(size);
+}
+void* operator new(std::size_t size, std::nothrow_t const&) noexcept
+{
+    return testkit::allocateOrNothing(size);
+}
+void* operator new[](std::size_t size, std::nothrow_t const&) noexcept
+{
+    return testkit::allocateOrNothing(size);
 }
 void operator delete(void* block) noexcept
 {
