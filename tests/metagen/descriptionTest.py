@@ -263,6 +263,16 @@ class Names(Folder):
         self.books["qualifiedBy"] = "uuid"
         self.refuse("/classes/1/properties/0/name", "getUuid means something else for every element")
 
+    def test_of_properties_are_no_types_of_search_instances(self):
+        self.title["name"] = "Handle"
+        self.books["qualifiedBy"] = "Handle"
+        self.refuse("/classes/1/properties/0/name", "Handle means something else in generated code")
+
+    def test_of_properties_are_not_those_of_their_class(self):
+        self.title["name"] = "Book"
+        self.books["qualifiedBy"] = "Book"
+        self.refuse("/classes/1/properties/0/name", "Book means something else in generated code")
+
     def test_of_operations_are_no_accessors(self):
         self.book["operations"][0]["name"] = "setTitle"
         self.refuse("/classes/1/operations/0/name", "setTitle stands for title")

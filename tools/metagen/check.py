@@ -154,7 +154,8 @@ class Rules:
         """No two members of a class have one name, nor does one hide what all elements have."""
         seen, functions = {}, {}
         for where, prop in self.each(f"{place}/properties", cls["properties"]):
-            self.check_word(f"{where}/name", cpp_name(prop))
+            self.check_word(f"{where}/name", cpp_name(prop),
+                            words.SEARCH_INSTANCES | {cls["name"]})
             self.check_once(f"{where}/name", prop["name"], seen, "a property")
             if self.find(cls["superclass"], prop["name"]):
                 self.refuse(f"{where}/name", f"a superclass has a property {prop['name']}")

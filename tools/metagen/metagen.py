@@ -17,7 +17,8 @@ import source
 
 ROOT = pathlib.Path(__file__).resolve().parent
 PER_CLASS = {"Handle.h": "{name}.h", "Impl.h": "{name}Impl.h",
-             "Builder.h": "{name}Builder.h", "Class.cpp": "{name}.cpp"}
+             "Builder.h": "{name}Builder.h", "Constrainables.h": "{name}Constrainables.h",
+             "Class.cpp": "{name}.cpp"}
 ROWS = {"Rows.h": ".h", "Rows.cpp": ".cpp"}
 PER_CATALOGUE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt"}
 # What a client has besides.

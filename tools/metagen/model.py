@@ -247,6 +247,39 @@ class Property:
         """The function that gives the metamodel's element; the meta package declares it."""
         return f"propertyOf<rows::properties::{self.owner.name}{capital(self.name)}>"
 
+    # The member of the search instance
+
+    @property
+    def constrained(self):
+        """The type of its values, as the class of search instances spells it.
+
+        A member of that class may have the name of the type, which then needs a scope.
+        """
+        plain = self.type if self.is_element else self.value["cpp"]
+        hidden = {prop.cpp_name for prop in self.owner.properties}
+        return self.owner.package.rooted(self.facts["type"], plain) if plain in hidden else plain
+
+    @property
+    def takes_patterns(self):
+        """Whether queries can match the values with patterns: they are texts, and required."""
+        return self.facts["type"] in ("String", "StdString") and self.facts["lower"] != 0
+
+    @property
+    def constrainable(self):
+        """The declaration of the member."""
+        form = "Reference" if self.is_element else "Value"
+        arguments = [self.constrained] + ["true"] * self.takes_patterns
+        return fill(f"    query::Constrainable{form}<", arguments, f"> {self.cpp_name};", 8)
+
+    @property
+    def constrainable_doc(self):
+        doc = self.cpp.get("doc")
+        return comment(sentence(doc), 4) if doc else ""
+
+    @property
+    def constrainable_initializer(self):
+        return fill(f"      {self.cpp_name}(", ["*this", f"{self.element}()"], ")", 10)
+
     def computed_row(self, end):
         """Its row in the table of what can only be read; `end` closes the line."""
         return fill("        support::Computed<", [f"&Impl::{self.getter}", self.constant],
@@ -519,6 +552,44 @@ class Class:
         return self.header(f"{self.name}Builder")
 
     @property
+    def constrainables_header(self):
+        return self.header(f"{self.name}Constrainables")
+
+    @property
+    def constrainables_includes(self):
+        base = self.base.constrainables_header if self.base else \
+            "tarnkiln/query/ModelElementConstrainables.h"
+        headers = {base, self.handle_header}
+        for prop in self.properties:
+            form = "RelationWithAttachment" if prop.is_element else "WithAttachment"
+            headers.add(f"tarnkiln/query/Constrainable{form}.h")
+            if prop.target:
+                headers.add(prop.target.handle_header)
+        return sorted(headers | {h for h in self.constrained_headers if not h.startswith("<")})
+
+    @property
+    def constrainables_system_includes(self):
+        headers = {h for h in self.constrained_headers if h.startswith("<")}
+        return sorted_blocks(headers | {"<utility>"})
+
+    @property
+    def constrained_headers(self):
+        """What the types of plain values need."""
+        return {prop.value["include"] for prop in self.properties
+                if not prop.is_element and "include" in prop.value}
+
+    @property
+    def constrainables_head(self):
+        return fill(f"class {self.package.export_word}{self.name}::Constrainables ",
+                    [f": public {self.base_handle}::Constrainables"], "", 4)
+
+    @property
+    def constrainables_initializers(self):
+        """What the constructor of a search instance initializes, from the base on."""
+        base = f"    : {self.base_handle}::Constrainables(query, metaClass, mode)"
+        return ",\n".join([base] + [prop.constrainable_initializer for prop in self.properties])
+
+    @property
     def impl_includes(self):
         headers = {self.handle_header, "tarnkiln/support/Dispatch.h"}
         if self.base:
@@ -561,7 +632,8 @@ class Class:
 
     @property
     def source_includes(self):
-        headers = {self.builder_header, self.package.meta_package_header,
+        headers = {self.builder_header, self.constrainables_header,
+                   self.package.meta_package_header,
                    "tarnkiln/support/BuilderSteps.h", "tarnkiln/support/DispatchSteps.h",
                    "tarnkiln/support/Handle.h"}
         for prop in self.stored:

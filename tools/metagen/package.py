@@ -196,6 +196,15 @@ class Package:
         cls = self.by_name.get(type_name)
         return self.spelled(cls.package.namespace, cls.name) if cls else type_name
 
+    def rooted(self, type_name, plain):
+        """`plain`, the C++ type of a class or a plain value, with all the scopes around it."""
+        cls, row = self.by_name.get(type_name), self.carried.get(type_name, {})
+        if cls:
+            return f"::{cls.package.namespace}::{cls.name}"
+        if "namespace" in row:
+            return f"::{row['namespace']}::{row['name']}"
+        return f"::{LIBRARY_NAMESPACE}{plain}"
+
     def spelled(self, namespace, name):
         if namespace == self.namespace:
             return name

@@ -15,8 +15,8 @@ RESERVED = frozenset("""
 LIBRARY = frozenset("""
     AbstractOwnedCollection ElementMap ElementMultimap ElementSequence Feature Model ModelElement
     PrimitiveSequence PrimitiveSet ProxyId ReferenceCollection Slot Transaction UUID
-    UnorderedElementSet Value internal meta reportException string support ustring boost std tarn
-    tarnkiln Impl Builder BuilderBase BuilderImpl Constrainables Storage
+    UnorderedElementSet Value internal meta query reportException string support ustring boost std
+    tarn tarnkiln Impl Builder BuilderBase BuilderImpl Constrainables Storage
 """.split())
 
 # Functions and constants of every element that a member of such a name would hide.
@@ -34,3 +34,6 @@ MEMBERS = frozenset("""
     removeRef self setInvalidateCallback setPropertyValue storeLink unpinContainer visitReferences
     IN_MEMORY_ONLY NO_INDEX NO_PROXY_RESOLVE PRIVILEGED_ACCESS PUBLIC_ACCESS SLOTS
 """.split())
+
+# Types of search instances, whose members are named like properties.
+SEARCH_INSTANCES = frozenset("Constrainables Handle".split())

@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/ArgumentImpl.h"
 
 #include "tarnkiln/meta/ArgumentBuilder.h"
+#include "tarnkiln/meta/ArgumentConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/support/BuilderSteps.h"
@@ -75,6 +76,18 @@ Argument::Builder::Builder() = default;
 Argument::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Argument::Builder::~Builder() = default;
+
+Argument::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Argument::metaClass(), source.second)
+{}
+
+Argument::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : TypedElement::Constrainables(query, metaClass, mode),
+      operation(*this, propertyOf<rows::properties::ArgumentOperation>()),
+      isInput(*this, propertyOf<rows::properties::ArgumentIsInput>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

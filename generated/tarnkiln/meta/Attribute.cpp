@@ -3,6 +3,7 @@
 
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/AttributeBuilder.h"
+#include "tarnkiln/meta/AttributeConstrainables.h"
 #include "tarnkiln/meta/AttributeMapImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
@@ -79,6 +80,18 @@ Attribute::Builder::Builder() = default;
 Attribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Attribute::Builder::~Builder() = default;
+
+Attribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Attribute::metaClass(), source.second)
+{}
+
+Attribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : ModelElement::Constrainables(query, metaClass, mode),
+      key(*this, propertyOf<rows::properties::AttributeKey>()),
+      owner(*this, propertyOf<rows::properties::AttributeOwner>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

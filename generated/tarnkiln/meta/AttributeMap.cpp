@@ -3,6 +3,7 @@
 
 #include "tarnkiln/meta/AttributeImpl.h"
 #include "tarnkiln/meta/AttributeMapBuilder.h"
+#include "tarnkiln/meta/AttributeMapConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -65,6 +66,18 @@ AttributeMap::Builder::Builder() = default;
 AttributeMap::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 AttributeMap::Builder::~Builder() = default;
+
+AttributeMap::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, AttributeMap::metaClass(), source.second)
+{}
+
+AttributeMap::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : ModelElement::Constrainables(query, metaClass, mode),
+      owner(*this, propertyOf<rows::properties::AttributeMapOwner>()),
+      attributes(*this, propertyOf<rows::properties::AttributeMapAttributes>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

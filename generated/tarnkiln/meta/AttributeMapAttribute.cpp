@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/AttributeMapAttributeImpl.h"
 
 #include "tarnkiln/meta/AttributeMapAttributeBuilder.h"
+#include "tarnkiln/meta/AttributeMapAttributeConstrainables.h"
 #include "tarnkiln/meta/AttributeMapImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
@@ -63,6 +64,17 @@ AttributeMapAttribute::Builder::Builder() = default;
 AttributeMapAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 AttributeMapAttribute::Builder::~Builder() = default;
+
+AttributeMapAttribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, AttributeMapAttribute::metaClass(), source.second)
+{}
+
+AttributeMapAttribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Attribute::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::AttributeMapAttributeValue>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

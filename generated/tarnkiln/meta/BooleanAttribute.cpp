@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/BooleanAttributeImpl.h"
 
 #include "tarnkiln/meta/BooleanAttributeBuilder.h"
+#include "tarnkiln/meta/BooleanAttributeConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -51,6 +52,17 @@ BooleanAttribute::Builder::Builder() = default;
 BooleanAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 BooleanAttribute::Builder::~Builder() = default;
+
+BooleanAttribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, BooleanAttribute::metaClass(), source.second)
+{}
+
+BooleanAttribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Attribute::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::BooleanAttributeValue>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

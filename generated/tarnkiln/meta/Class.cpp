@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/ClassImpl.h"
 
 #include "tarnkiln/meta/ClassBuilder.h"
+#include "tarnkiln/meta/ClassConstrainables.h"
 #include "tarnkiln/meta/DynamicExtensionsImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
@@ -87,6 +88,19 @@ Class::Builder::Builder() = default;
 Class::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Class::Builder::~Builder() = default;
+
+Class::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Class::metaClass(), source.second)
+{}
+
+Class::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : StructuredType::Constrainables(query, metaClass, mode),
+      superclass(*this, propertyOf<rows::properties::ClassSuperclass>()),
+      extensions(*this, propertyOf<rows::properties::ClassExtensions>()),
+      isAbstract(*this, propertyOf<rows::properties::ClassIsAbstract>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/DataTypeImpl.h"
 
 #include "tarnkiln/meta/DataTypeBuilder.h"
+#include "tarnkiln/meta/DataTypeConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -43,6 +44,16 @@ DataType::Builder::Builder() = default;
 DataType::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 DataType::Builder::~Builder() = default;
+
+DataType::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, DataType::metaClass(), source.second)
+{}
+
+DataType::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : StructuredType::Constrainables(query, metaClass, mode)
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/DateTimeAttributeImpl.h"
 
 #include "tarnkiln/meta/DateTimeAttributeBuilder.h"
+#include "tarnkiln/meta/DateTimeAttributeConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -51,6 +52,17 @@ DateTimeAttribute::Builder::Builder() = default;
 DateTimeAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 DateTimeAttribute::Builder::~Builder() = default;
+
+DateTimeAttribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, DateTimeAttribute::metaClass(), source.second)
+{}
+
+DateTimeAttribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Attribute::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::DateTimeAttributeValue>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -4,6 +4,7 @@
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/DynamicExtensionsBuilder.h"
+#include "tarnkiln/meta/DynamicExtensionsConstrainables.h"
 #include "tarnkiln/meta/ExtensionImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
@@ -94,6 +95,19 @@ DynamicExtensions::Builder::Builder() = default;
 DynamicExtensions::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 DynamicExtensions::Builder::~Builder() = default;
+
+DynamicExtensions::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, DynamicExtensions::metaClass(), source.second)
+{}
+
+DynamicExtensions::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : ModelElement::Constrainables(query, metaClass, mode),
+      modelID(*this, propertyOf<rows::properties::DynamicExtensionsModelID>()),
+      extensions(*this, propertyOf<rows::properties::DynamicExtensionsExtensions>()),
+      owningClass(*this, propertyOf<rows::properties::DynamicExtensionsOwningClass>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/EnumImpl.h"
 
 #include "tarnkiln/meta/EnumBuilder.h"
+#include "tarnkiln/meta/EnumConstrainables.h"
 #include "tarnkiln/meta/EnumLiteralImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PrimitiveTypeImpl.h"
@@ -80,6 +81,18 @@ Enum::Builder::Builder() = default;
 Enum::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Enum::Builder::~Builder() = default;
+
+Enum::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Enum::metaClass(), source.second)
+{}
+
+Enum::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Type::Constrainables(query, metaClass, mode),
+      literals(*this, propertyOf<rows::properties::EnumLiterals>()),
+      underlyingType(*this, propertyOf<rows::properties::EnumUnderlyingType>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -4,6 +4,7 @@
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/EnumImpl.h"
 #include "tarnkiln/meta/EnumLiteralBuilder.h"
+#include "tarnkiln/meta/EnumLiteralConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -96,6 +97,19 @@ EnumLiteral::Builder::Builder() = default;
 EnumLiteral::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 EnumLiteral::Builder::~Builder() = default;
+
+EnumLiteral::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, EnumLiteral::metaClass(), source.second)
+{}
+
+EnumLiteral::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : NamedElement::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::EnumLiteralValue>()),
+      parentEnum(*this, propertyOf<rows::properties::EnumLiteralParentEnum>()),
+      publicIdentifier(*this, propertyOf<rows::properties::EnumLiteralPublicIdentifier>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -4,6 +4,7 @@
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/DynamicExtensionsImpl.h"
 #include "tarnkiln/meta/ExtensionBuilder.h"
+#include "tarnkiln/meta/ExtensionConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -85,6 +86,18 @@ Extension::Builder::Builder() = default;
 Extension::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Extension::Builder::~Builder() = default;
+
+Extension::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Extension::metaClass(), source.second)
+{}
+
+Extension::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Property::Constrainables(query, metaClass, mode),
+      extendedMetaclass(*this, propertyOf<rows::properties::ExtensionExtendedMetaclass>()),
+      owner(*this, propertyOf<rows::properties::ExtensionOwner>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

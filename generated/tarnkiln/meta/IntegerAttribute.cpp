@@ -2,6 +2,7 @@
 #include "tarnkiln/meta/IntegerAttributeImpl.h"
 
 #include "tarnkiln/meta/IntegerAttributeBuilder.h"
+#include "tarnkiln/meta/IntegerAttributeConstrainables.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -51,6 +52,17 @@ IntegerAttribute::Builder::Builder() = default;
 IntegerAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 IntegerAttribute::Builder::~Builder() = default;
+
+IntegerAttribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, IntegerAttribute::metaClass(), source.second)
+{}
+
+IntegerAttribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Attribute::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::IntegerAttributeValue>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

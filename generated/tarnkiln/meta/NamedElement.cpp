@@ -3,6 +3,7 @@
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/NamedElementBuilder.h"
+#include "tarnkiln/meta/NamedElementConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -51,6 +52,17 @@ NamedElement::Builder::Builder() = default;
 NamedElement::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 NamedElement::Builder::~Builder() = default;
+
+NamedElement::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, NamedElement::metaClass(), source.second)
+{}
+
+NamedElement::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : ModelElement::Constrainables(query, metaClass, mode),
+      name(*this, propertyOf<rows::properties::NamedElementName>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -5,6 +5,7 @@
 #include "tarnkiln/meta/ArgumentImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/OperationBuilder.h"
+#include "tarnkiln/meta/OperationConstrainables.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -119,6 +120,22 @@ Operation::Builder::Builder() = default;
 Operation::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Operation::Builder::~Builder() = default;
+
+Operation::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Operation::metaClass(), source.second)
+{}
+
+Operation::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : TypedElement::Constrainables(query, metaClass, mode),
+      arguments(*this, propertyOf<rows::properties::OperationArguments>()),
+      owningType(*this, propertyOf<rows::properties::OperationOwningType>()),
+      isAbstract(*this, propertyOf<rows::properties::OperationIsAbstract>()),
+      isStatic(*this, propertyOf<rows::properties::OperationIsStatic>()),
+      isPublic(*this, propertyOf<rows::properties::OperationIsPublic>()),
+      isEvent(*this, propertyOf<rows::properties::OperationIsEvent>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -4,6 +4,7 @@
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PackageBuilder.h"
+#include "tarnkiln/meta/PackageConstrainables.h"
 #include "tarnkiln/meta/TypeImpl.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -160,6 +161,27 @@ Package::Builder::Builder() = default;
 Package::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Package::Builder::~Builder() = default;
+
+Package::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Package::metaClass(), source.second)
+{}
+
+Package::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : NamedElement::Constrainables(query, metaClass, mode),
+      ownedTypes(*this, propertyOf<rows::properties::PackageOwnedTypes>()),
+      nestedPackages(*this, propertyOf<rows::properties::PackageNestedPackages>()),
+      qualifiedName(*this, propertyOf<rows::properties::PackageQualifiedName>()),
+      uri(*this, propertyOf<rows::properties::PackageUri>()),
+      parentPackage(*this, propertyOf<rows::properties::PackageParentPackage>()),
+      importedPackageURIs(*this, propertyOf<rows::properties::PackageImportedPackageURIs>()),
+      defaultVobjCategory(*this, propertyOf<rows::properties::PackageDefaultVobjCategory>()),
+      enumerations(*this, propertyOf<rows::properties::PackageEnumerations>()),
+      classes(*this, propertyOf<rows::properties::PackageClasses>()),
+      dataTypes(*this, propertyOf<rows::properties::PackageDataTypes>()),
+      primitiveTypes(*this, propertyOf<rows::properties::PackagePrimitiveTypes>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -3,6 +3,7 @@
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PrimitiveTypeBuilder.h"
+#include "tarnkiln/meta/PrimitiveTypeConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -43,6 +44,16 @@ PrimitiveType::Builder::Builder() = default;
 PrimitiveType::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 PrimitiveType::Builder::~Builder() = default;
+
+PrimitiveType::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, PrimitiveType::metaClass(), source.second)
+{}
+
+PrimitiveType::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Type::Constrainables(query, metaClass, mode)
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

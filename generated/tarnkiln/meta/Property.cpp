@@ -4,6 +4,7 @@
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PropertyBuilder.h"
+#include "tarnkiln/meta/PropertyConstrainables.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -236,6 +237,36 @@ Property::Builder::Builder() = default;
 Property::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Property::Builder::~Builder() = default;
+
+Property::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Property::metaClass(), source.second)
+{}
+
+Property::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : TypedElement::Constrainables(query, metaClass, mode),
+      isDerived(*this, propertyOf<rows::properties::PropertyIsDerived>()),
+      isComposite(*this, propertyOf<rows::properties::PropertyIsComposite>()),
+      isReadOnly(*this, propertyOf<rows::properties::PropertyIsReadOnly>()),
+      isUnique(*this, propertyOf<rows::properties::PropertyIsUnique>()),
+      qualifiedBy(*this, propertyOf<rows::properties::PropertyQualifiedBy>()),
+      customQualification(*this, propertyOf<rows::properties::PropertyCustomQualification>()),
+      isQualificationUnique(*this, propertyOf<rows::properties::PropertyIsQualificationUnique>()),
+      opposite(*this, propertyOf<rows::properties::PropertyOpposite>()),
+      propertyIndex(*this, propertyOf<rows::properties::PropertyPropertyIndex>()),
+      isPublicAccessor(*this, propertyOf<rows::properties::PropertyIsPublicAccessor>()),
+      isPublicMutator(*this, propertyOf<rows::properties::PropertyIsPublicMutator>()),
+      isTransient(*this, propertyOf<rows::properties::PropertyIsTransient>()),
+      isSparse(*this, propertyOf<rows::properties::PropertyIsSparse>()),
+      owningType(*this, propertyOf<rows::properties::PropertyOwningType>()),
+      vobjDispCategory(*this, propertyOf<rows::properties::PropertyVobjDispCategory>()),
+      vobjDispSkipEmpty(*this, propertyOf<rows::properties::PropertyVobjDispSkipEmpty>()),
+      isSetOnce(*this, propertyOf<rows::properties::PropertyIsSetOnce>()),
+      isVobjHidden(*this, propertyOf<rows::properties::PropertyIsVobjHidden>()),
+      defaultValue(*this, propertyOf<rows::properties::PropertyDefaultValue>()),
+      isQueryIndex(*this, propertyOf<rows::properties::PropertyIsQueryIndex>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -3,6 +3,7 @@
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/RealAttributeBuilder.h"
+#include "tarnkiln/meta/RealAttributeConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -51,6 +52,17 @@ RealAttribute::Builder::Builder() = default;
 RealAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 RealAttribute::Builder::~Builder() = default;
+
+RealAttribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, RealAttribute::metaClass(), source.second)
+{}
+
+RealAttribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Attribute::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::RealAttributeValue>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

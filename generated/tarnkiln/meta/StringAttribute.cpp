@@ -3,6 +3,7 @@
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/StringAttributeBuilder.h"
+#include "tarnkiln/meta/StringAttributeConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -51,6 +52,17 @@ StringAttribute::Builder::Builder() = default;
 StringAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 StringAttribute::Builder::~Builder() = default;
+
+StringAttribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, StringAttribute::metaClass(), source.second)
+{}
+
+StringAttribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Attribute::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::StringAttributeValue>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

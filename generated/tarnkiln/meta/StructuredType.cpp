@@ -5,6 +5,7 @@
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StructuredTypeBuilder.h"
+#include "tarnkiln/meta/StructuredTypeConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -110,6 +111,21 @@ StructuredType::Builder::Builder() = default;
 StructuredType::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 StructuredType::Builder::~Builder() = default;
+
+StructuredType::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, StructuredType::metaClass(), source.second)
+{}
+
+StructuredType::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Type::Constrainables(query, metaClass, mode),
+      vobjName(*this, propertyOf<rows::properties::StructuredTypeVobjName>()),
+      ownedAttributes(*this, propertyOf<rows::properties::StructuredTypeOwnedAttributes>()),
+      ownedOperations(*this, propertyOf<rows::properties::StructuredTypeOwnedOperations>()),
+      vobjCompactDisplay(*this, propertyOf<rows::properties::StructuredTypeVobjCompactDisplay>()),
+      vobjDispCategories(*this, propertyOf<rows::properties::StructuredTypeVobjDispCategories>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

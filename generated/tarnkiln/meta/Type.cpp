@@ -5,6 +5,7 @@
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/meta/TypeBuilder.h"
+#include "tarnkiln/meta/TypeConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -93,6 +94,19 @@ Type::Builder::Builder() = default;
 Type::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Type::Builder::~Builder() = default;
+
+Type::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Type::metaClass(), source.second)
+{}
+
+Type::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : NamedElement::Constrainables(query, metaClass, mode),
+      qualifiedName(*this, propertyOf<rows::properties::TypeQualifiedName>()),
+      isVobjHidden(*this, propertyOf<rows::properties::TypeIsVobjHidden>()),
+      owningPackage(*this, propertyOf<rows::properties::TypeOwningPackage>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

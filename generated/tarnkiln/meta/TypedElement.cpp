@@ -4,6 +4,7 @@
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/TypeImpl.h"
 #include "tarnkiln/meta/TypedElementBuilder.h"
+#include "tarnkiln/meta/TypedElementConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -83,6 +84,20 @@ TypedElement::Builder::Builder() = default;
 TypedElement::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 TypedElement::Builder::~Builder() = default;
+
+TypedElement::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, TypedElement::metaClass(), source.second)
+{}
+
+TypedElement::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : NamedElement::Constrainables(query, metaClass, mode),
+      type(*this, propertyOf<rows::properties::TypedElementType>()),
+      lower(*this, propertyOf<rows::properties::TypedElementLower>()),
+      upper(*this, propertyOf<rows::properties::TypedElementUpper>()),
+      isOrdered(*this, propertyOf<rows::properties::TypedElementIsOrdered>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -3,6 +3,7 @@
 
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/UUIDAttributeBuilder.h"
+#include "tarnkiln/meta/UUIDAttributeConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -51,6 +52,17 @@ UUIDAttribute::Builder::Builder() = default;
 UUIDAttribute::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 UUIDAttribute::Builder::~Builder() = default;
+
+UUIDAttribute::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, UUIDAttribute::metaClass(), source.second)
+{}
+
+UUIDAttribute::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Attribute::Constrainables(query, metaClass, mode),
+      value(*this, propertyOf<rows::properties::UUIDAttributeValue>())
+{}
 }  // namespace tarn::kiln::meta
 
 template class tarn::kiln::support::Record<

@@ -18,8 +18,9 @@ namespace tarn::kiln {
 class TARNKILN_EXPORT ModelElement : public ElementHandle
 {
 public:
-    class Impl;     // ModelElementImpl.h
-    class Builder;  // ModelElementBuilder.h
+    class Impl;            // ModelElementImpl.h
+    class Builder;         // ModelElementBuilder.h
+    class Constrainables;  // query/ModelElementConstrainables.h
 
     ModelElement() = default;
     explicit ModelElement(Impl* impl);  ///< Shares `impl`; null gives the empty handle.

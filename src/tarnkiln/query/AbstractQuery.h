@@ -33,6 +33,11 @@ public:
     /// The number of rows to leave out first.
     void setResultOffset(unsigned long offset);
 
+    /// The rows as tuples of handles, one for each search instance given:
+    /// `for (auto const& [book, reader] : query.results(books, readers))`; needs `Results.h`.
+    template <class... Instance>
+    Results<typename Instance::Handle...> results(Instance const&... columns);
+
 private:
     std::unique_ptr<RetargetableQuery> const m_query;
 };

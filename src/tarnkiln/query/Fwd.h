@@ -8,6 +8,7 @@ class NativeTarnkilnQuery;
 class ReflectiveQuery;
 class RetargetableQuery;
 class ValueComparatorRegistry;
+template <class... C> class Results;
 enum class SearchClassMatchMode : int;
 enum class ValueMatchRelation : int;
 }  // namespace tarn::kiln::query

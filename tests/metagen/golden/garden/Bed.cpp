@@ -2,6 +2,7 @@
 #include "acme/garden/BedImpl.h"
 
 #include "acme/garden/BedBuilder.h"
+#include "acme/garden/BedConstrainables.h"
 #include "acme/garden/GardenMetaPackage.h"
 #include "acme/garden/PlantImpl.h"
 #include "tarnkiln/support/BuilderSteps.h"
@@ -79,6 +80,20 @@ Bed::Builder::Builder() = default;
 Bed::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Bed::Builder::~Builder() = default;
+
+Bed::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Bed::metaClass(), source.second)
+{}
+
+Bed::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : ModelElement::Constrainables(query, metaClass, mode),
+      plants(*this, propertyOf<rows::properties::BedPlants>()),
+      size(*this, propertyOf<rows::properties::BedSize>()),
+      neighbours(*this, propertyOf<rows::properties::BedNeighbours>()),
+      area(*this, propertyOf<rows::properties::BedArea>())
+{}
 }  // namespace acme::garden
 
 template class tarn::kiln::support::Record<

@@ -4,6 +4,7 @@
 #include "acme/garden/BedImpl.h"
 #include "acme/garden/GardenMetaPackage.h"
 #include "acme/garden/PlantBuilder.h"
+#include "acme/garden/PlantConstrainables.h"
 #include "tarnkiln/collections/ElementMap.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
@@ -111,6 +112,22 @@ Plant::Builder::Builder() = default;
 Plant::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Plant::Builder::~Builder() = default;
+
+Plant::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Plant::metaClass(), source.second)
+{}
+
+Plant::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : ModelElement::Constrainables(query, metaClass, mode),
+      name(*this, propertyOf<rows::properties::PlantName>()),
+      bed(*this, propertyOf<rows::properties::PlantBed>()),
+      sown(*this, propertyOf<rows::properties::PlantSown>()),
+      height(*this, propertyOf<rows::properties::PlantHeight>()),
+      isHardy(*this, propertyOf<rows::properties::PlantIsHardy>()),
+      notes(*this, propertyOf<rows::properties::PlantNotes>())
+{}
 }  // namespace acme::garden
 
 template class tarn::kiln::support::Record<

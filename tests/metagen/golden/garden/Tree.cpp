@@ -4,6 +4,7 @@
 #include "acme/garden/BedImpl.h"
 #include "acme/garden/GardenMetaPackage.h"
 #include "acme/garden/TreeBuilder.h"
+#include "acme/garden/TreeConstrainables.h"
 #include "tarnkiln/support/BuilderSteps.h"
 #include "tarnkiln/support/DispatchSteps.h"
 #include "tarnkiln/support/Handle.h"
@@ -89,6 +90,19 @@ Tree::Builder::Builder() = default;
 Tree::Builder::Builder(Model const& model) : BuilderBase(model) {}
 
 Tree::Builder::~Builder() = default;
+
+Tree::Constrainables::Constrainables(
+    std::pair<query::AbstractQuery&, query::SearchClassMatchMode const> const& source)
+    : Constrainables(source.first, Tree::metaClass(), source.second)
+{}
+
+Tree::Constrainables::Constrainables(
+    query::AbstractQuery& query, meta::Class const& metaClass, query::SearchClassMatchMode mode)
+    : Plant::Constrainables(query, metaClass, mode),
+      planted(*this, propertyOf<rows::properties::TreePlanted>()),
+      graft(*this, propertyOf<rows::properties::TreeGraft>()),
+      stock(*this, propertyOf<rows::properties::TreeStock>())
+{}
 }  // namespace acme::garden
 
 template class tarn::kiln::support::Record<
