@@ -14,5 +14,17 @@ struct PayloadAccess
         return value.m_deleter == genericDeleter<T> ? static_cast<T const*>(value.m_data) : nullptr;
     }
     static void const* address(Value const& value) { return value.m_data; }
+    /// The collection of an element that the value shares; null if it holds something of its own.
+    static AbstractOwnedCollection const* managed(Value const& value)
+    {
+        return value.m_deleter ? nullptr : static_cast<AbstractOwnedCollection*>(value.m_data);
+    }
+    /// The same payload, as a required value.
+    static Value asSingle(Value const& value)
+    {
+        Value result(value);
+        result.m_flags = ValueFlags::Single;
+        return result;
+    }
 };
 }  // namespace tarn::kiln::support
