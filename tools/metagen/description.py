@@ -79,6 +79,8 @@ class Normal:
                 "name": name,
                 "parent": names[depth - 1] if depth else None,
                 "uriTail": self.data["uri"] + (f"/{qualified}" if depth else ""),
+                "defaultVobjCategory": self.data.get("defaultVobjCategory")
+                                       if depth == len(names) - 1 else None,
                 "uuid": None if depth else self.root,
             })
         return result
@@ -93,6 +95,9 @@ class Normal:
             "package": self.data["name"],
             "qualifiedName": self.qualified(entry["name"]),
             "vobjName": entry.get("vobjName", self.qualified(entry["name"])),
+            "vobjHidden": entry["vobjHidden"],
+            "vobjCompactDisplay": entry.get("vobjCompactDisplay", False),
+            "vobjDispCategories": entry.get("vobjDispCategories", []),
             "uuid": self.uuid(entry, entry["name"]),
         }
 

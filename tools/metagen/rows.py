@@ -27,7 +27,12 @@ def text(value):
 
 
 def narrow(value):
-    return f'"{value}"'
+    escaped = value.replace("\\", "\\\\").replace('"', '\\"')
+    return f'"{escaped}"'
+
+
+def optional_narrow(value):
+    return None if value is None else narrow(value)
 
 
 def bound(value):
@@ -83,6 +88,7 @@ class Rows:
                 scope = table[0].lower() + table[1:]
                 self.own_types[entry["name"]] = f"{{{table}, rows::{scope}::{entry['name']}}}"
         self.package_numbers = self.number_packages()
+        self.groups = []
         self.tables = {kind: Table(kind, row_type) for kind, row_type in (
             ("packages", "PackageRow"), ("primitiveTypes", "PrimitiveTypeRow"),
             ("classes", "StructuredTypeRow"), ("dataTypes", "StructuredTypeRow"),
@@ -91,6 +97,8 @@ class Rows:
             ("literals", "LiteralRow"))}
         self.fill_tables()
         self.spans = {kind: kind for kind, table in self.tables.items() if table.rows}
+        if self.groups:
+            self.spans["displayGroups"] = "displayGroups"
         if self.required:
             self.spans["requiredTypes"] = "requiredTypes"
         if self.imports:
@@ -138,6 +146,7 @@ class Rows:
             ("name", text(entry["name"])),
             ("parent", None if parent is None else str(parent)),
             ("uri", text(entry["uriTail"])),
+            ("defaultVobjCategory", optional_narrow(entry.get("defaultVobjCategory"))),
             ("uuid", None if entry["uuid"] is None else narrow(entry["uuid"]))])
 
     def add_structured(self, kind, entry):
@@ -154,11 +163,20 @@ class Rows:
             ("package", self.package(entry)),
             ("superclass", self.type(entry["superclass"]) if is_class else None),
             ("isAbstract", "true" if entry["abstract"] else None),
+            ("isVobjHidden", "true" if entry.get("vobjHidden") else None),
+            ("vobjCompactDisplay", "true" if entry.get("vobjCompactDisplay") else None),
+            ("vobjDispCategories", self.display_groups(entry.get("vobjDispCategories", []))),
             ("properties", properties), ("operations", operations),
             ("collection", f"{collection}<{entry['name']}>"),
             ("builder", self.builder(entry) if is_class else None),
             ("serializers", None if is_class else self.datatype_serializer(entry)),
             ("uuid", narrow(entry["uuid"]))])
+
+    def display_groups(self, names):
+        """Where the groups of a type stand among those of all types."""
+        first = len(self.groups)
+        self.groups += [narrow(name) for name in names]
+        return f"{{{first}, {len(names)}}}" if names else None
 
     def builder(self, entry):
         """What makes builders of a class; there is none for an abstract one."""
@@ -182,8 +200,7 @@ class Rows:
             ("opposite", self.member(entry["type"], entry["opposite"])),
             ("qualifiedBy", self.member(entry["type"], entry["qualifiedBy"])),
             ("defaultText", None if entry["default"] is None else text(entry["default"])),
-            ("vobjDispCategory",
-             narrow(entry["vobjDispCategory"]) if entry.get("vobjDispCategory") else None),
+            ("vobjDispCategory", optional_narrow(entry.get("vobjDispCategory"))),
             ("uuid", narrow(entry["uuid"]))])
 
     def add_operation(self, owner, entry):
@@ -238,6 +255,7 @@ class Rows:
         self.tables["enumerations"].add(entry["name"], [
             ("name", text(entry["name"])), ("package", self.package(entry)),
             ("underlyingType", self.type(entry["underlyingType"])),
+            ("isVobjHidden", "true" if entry.get("vobjHidden") else None),
             ("literals", literals),
             ("collection", f"{VALUE_COLLECTION}<{entry['name']}>"),
             ("serializers", f"support::installEnumSerializers<{entry['name']}>"),

@@ -117,6 +117,7 @@ struct PackageRow
     char16_t const* name;
     std::size_t parent = 0;      ///< The row of the package around it; the root names itself.
     char16_t const* uri;         ///< Behind `SchemaBase`, unless it has a scheme ("a://") itself.
+    char const* defaultVobjCategory = nullptr;
     char const* uuid = nullptr;  ///< Null: a fresh one. The root must have one.
 };
 
@@ -179,6 +180,9 @@ struct StructuredTypeRow
     std::size_t package;
     TypeReference superclass = {};  ///< Of a class.
     bool isAbstract = false;        ///< Of a class.
+    bool isVobjHidden = false;
+    bool vobjCompactDisplay = false;
+    RowRange vobjDispCategories = {};  ///< Among the display groups.
     RowRange properties = {};
     RowRange operations = {};
     meta::MetaRegistry::CollectionInstantiator collection = nullptr;
@@ -200,6 +204,7 @@ struct EnumRow
     char16_t const* name;
     std::size_t package;
     TypeReference underlyingType;
+    bool isVobjHidden = false;
     RowRange literals;
     meta::MetaRegistry::CollectionInstantiator collection = nullptr;
     SerializerInstaller serializers = nullptr;
@@ -218,6 +223,7 @@ struct PackageRows
     std::span<ArgumentRow const> arguments = {};
     std::span<EnumRow const> enumerations = {};
     std::span<LiteralRow const> literals = {};
+    std::span<char const* const> displayGroups = {};
     /// Primitive types of the registry without which the metamodel can not be built.
     std::span<char16_t const* const> requiredTypes = {};
     /// Build the metamodels whose types the rows refer to by name.

@@ -78,12 +78,14 @@ void PackageWalker::createElements()
         support::StructuredTypeRow const& row = m_rows.classes[i];
         m_elements.classes[i] =
             m_package.createClass(row.name, row.vobjName, row.isAbstract, row.uuid);
+        setDisplay(row, m_elements.classes[i]);
         createMembers(row);
     }
     for (std::size_t i = 0; i < m_rows.dataTypes.size(); ++i)
     {
         support::StructuredTypeRow const& row = m_rows.dataTypes[i];
         m_elements.dataTypes[i] = m_package.createDataType(row.name, row.vobjName, row.uuid);
+        setDisplay(row, m_elements.dataTypes[i]);
         createMembers(row);
     }
     for (char16_t const* const name : m_rows.requiredTypes)
@@ -109,6 +111,8 @@ void PackageWalker::createPackages()
         {
             m_elements.packages[i] = m_package.createPackage(row.name, uriOf(row));
         }
+        if (row.defaultVobjCategory)
+            m_package.setDefaultVobjCategory(m_elements.packages[i], row.defaultVobjCategory);
         createPrimitiveTypes(i);
     }
 }
@@ -121,6 +125,16 @@ void PackageWalker::createPrimitiveTypes(std::size_t package)
             m_elements.primitiveTypes[i] =
                 createNamed<meta::PrimitiveType>(m_rows.primitiveTypes[i]);
     }
+}
+
+void PackageWalker::setDisplay(support::StructuredTypeRow const& row,
+                               meta::StructuredType const& type)
+{
+    type->setIsVobjHidden(row.isVobjHidden);
+    m_package.setVobjCompactDisplay(type, row.vobjCompactDisplay);
+    for (std::size_t i = 0; i < row.vobjDispCategories.count; ++i)
+        type->getVobjDispCategories().push_back(
+            m_rows.displayGroups[row.vobjDispCategories.first + i]);
 }
 
 void PackageWalker::createMembers(support::StructuredTypeRow const& row)
@@ -187,6 +201,7 @@ void PackageWalker::createEnum(std::size_t number)
 {
     support::EnumRow const& row = m_rows.enumerations[number];
     m_elements.enumerations[number] = m_package.createEnum(row.name, row.uuid);
+    m_elements.enumerations[number]->setIsVobjHidden(row.isVobjHidden);
     for (std::size_t i = 0; i < row.literals.count; ++i)
     {
         support::LiteralRow const& literal = m_rows.literals[row.literals.first + i];

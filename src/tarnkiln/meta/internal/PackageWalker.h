@@ -32,6 +32,7 @@ public:
 private:
     void createPackages();
     void createPrimitiveTypes(std::size_t package);
+    void setDisplay(support::StructuredTypeRow const& row, meta::StructuredType const& type);
     void createMembers(support::StructuredTypeRow const& row);
     void createProperty(std::size_t number);
     void createOperation(std::size_t number);
