@@ -1,4 +1,5 @@
 // How a generated metamodel stands in the registry.
+#include "shapes/BellImpl.h"
 #include "shapes/DefaultsImpl.h"
 #include "shapes/Money.h"
 #include "shapes/NodeBuilder.h"
@@ -14,10 +15,13 @@
 #include "tarnkiln/meta/SchemaBase.h"
 #include "tests/generated/ShapesFixture.h"
 
+#include <gmock/gmock.h>
+
 namespace testkit::shapes {
 namespace {
 
 using meta::MetaRegistry;
+using ::testing::ElementsAre;
 using GeneratedPackage = ShapesTest;
 
 TEST_F(GeneratedPackage, IsFoundByItsUriAndFamily)
@@ -59,6 +63,40 @@ TEST_F(GeneratedPackage, DescribesItsClassesAsTheyAre)
     EXPECT_TRUE(Guarded::metaClass()->isAbstract());
     EXPECT_EQ(Vault::metaClass()->getSuperclass(), Guarded::metaClass());
     EXPECT_EQ(Vault::metaClass()->getVobjName(), "shapes.Vault");
+}
+
+TEST_F(GeneratedPackage, KeepsHowItsObjectsAreDisplayed)
+{
+    ShapesMetaPackage const& package = ShapesMetaPackage::getInstance();
+    meta::Class const& bell = Bell::metaClass();
+    meta::DataType const& money = package.getDataType(rows::dataTypes::Money);
+    meta::Property const strokes = property(bell, u"strokes");
+
+    EXPECT_EQ(package.getRootPackage()->getDefaultVobjCategory().value(), "Other");
+    EXPECT_EQ(bell->getVobjName(), "BellObject");
+    EXPECT_TRUE(bell->isVobjHidden());
+    EXPECT_TRUE(bell->getVobjCompactDisplay());
+    EXPECT_THAT(bell->getVobjDispCategories(), ElementsAre("Sound", "Place"));
+    EXPECT_EQ(strokes->getVobjDispCategory().value(), "Sound");
+    EXPECT_TRUE(strokes->getVobjDispSkipEmpty());
+    EXPECT_TRUE(strokes->isVobjHidden());
+    EXPECT_TRUE(money->getVobjCompactDisplay());
+    EXPECT_FALSE(money->isVobjHidden());
+    EXPECT_THAT(money->getVobjDispCategories(), ElementsAre("Sum"));
+    EXPECT_TRUE(package.getEnum(rows::enumerations::Colour)->isVobjHidden());
+}
+
+TEST_F(GeneratedPackage, DisplaysEverythingUnlessTold)
+{
+    meta::Class const& node = Node::metaClass();
+    meta::Property const name = property(node, u"name");
+
+    EXPECT_FALSE(node->isVobjHidden());
+    EXPECT_FALSE(node->getVobjCompactDisplay());
+    EXPECT_EQ(node->getVobjDispCategories().size(), 0u);
+    EXPECT_FALSE(name->isVobjHidden());
+    EXPECT_FALSE(name->getVobjDispCategory());
+    EXPECT_FALSE(name->getVobjDispSkipEmpty());
 }
 
 TEST_F(GeneratedPackage, AgreesWithItsElementsOnDefaults)

@@ -15,4 +15,11 @@ void Vault::Impl::paint(Colour colour, Money const& price)
     changed.setNet(net);
     setPrice(changed);
 }
+
+void Vault::Impl::doOpened()
+{
+    Price changed = getPrice();
+    changed.setIsFinal(true);
+    setPrice(changed);
+}
 }  // namespace testkit::shapes

@@ -316,6 +316,76 @@ class Classes(Folder):
         self.refuse("/classes/1/operations/0/abstract", "Book is not abstract")
 
 
+class Events(Folder):
+    def setUp(self):
+        super().setUp()
+        self.event = {"name": "returned", "event": True,
+                      "arguments": [{"name": "days", "type": "Integer"}]}
+        self.book["operations"].append(self.event)
+
+    def test_have_a_class_each(self):
+        self.assertEqual([event.name for event in self.load().events], ["BookReturnedEvent"])
+
+    def test_of_a_superclass_have_no_class_of_their_own(self):
+        self.novel["operations"] = [copy.deepcopy(self.event)]
+
+        self.assertEqual([event.name for event in self.load().events], ["BookReturnedEvent"])
+
+    def test_have_no_result(self):
+        self.event["result"] = {"type": "Integer"}
+        self.refuse("/classes/1/operations/1/result", "an event has no result")
+
+    def test_happen_to_an_element(self):
+        self.event["static"] = True
+        self.refuse("/classes/1/operations/1/static", "an event happens to an element")
+
+    def test_give_nothing_back(self):
+        self.event["arguments"][0]["isInput"] = False
+        self.refuse("/classes/1/operations/1/arguments/0/isInput", "an event gives nothing back")
+
+    def test_have_an_owner_and_an_operation_already(self):
+        for name in ("owner", "operation"):
+            self.event["arguments"][0]["name"] = name
+            self.refuse("/classes/1/operations/1/arguments/0/name",
+                        f"{name} means something else for every event")
+
+    def test_are_not_overloaded(self):
+        self.book["operations"].append({"name": "returned"})
+        self.refuse("/classes/1/operations/1/name", "an event has a name of its own")
+
+    def test_do_not_share_the_name_of_what_happens(self):
+        self.book["operations"].append({"name": "doReturned"})
+        self.refuse("/classes/1/operations/1/name", "doReturned means something else")
+
+    def test_do_not_share_the_name_of_a_type(self):
+        self.data["classes"].append({"name": "BookReturnedEvent"})
+        self.refuse("/classes/1/operations/1/name", "there is a type BookReturnedEvent")
+
+    def test_are_events_in_subclasses_too(self):
+        self.novel["operations"] = [{**copy.deepcopy(self.event), "event": False}]
+        self.refuse("/classes/2/operations/0/event", "returned is an event in a superclass")
+
+    def test_are_no_other_operations_in_superclasses(self):
+        self.novel["operations"] = [{"name": "lend", "event": True,
+                                     "arguments": [{"name": "days", "type": "Integer"}]}]
+        self.refuse("/classes/2/operations/0/event", "lend is no event in a superclass")
+
+
+class Operations(Folder):
+    def test_take_many_elements_only_if_nobody_calls_them_by_reflection(self):
+        lend = self.book["operations"][0]
+        lend["arguments"].append({"name": "readers", "type": "Novel", "upper": "*"})
+        self.refuse("/classes/1/operations/0/arguments/1/upper",
+                    "many elements can't be passed by reflection; say \"invoker\": false")
+        lend["invoker"] = False
+        self.load()
+
+    def test_give_many_elements_only_if_nobody_calls_them_by_reflection(self):
+        self.book["operations"][0]["result"] = {"type": "Novel", "upper": "*"}
+        self.refuse("/classes/1/operations/0/result/upper",
+                    "many elements can't be passed by reflection; say \"invoker\": false")
+
+
 class Properties(Folder):
     def test_have_types_that_exist(self):
         self.title["type"] = "Text"

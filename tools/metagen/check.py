@@ -280,16 +280,65 @@ class Rules:
     def check_operation(self, place, owner, operation):
         if operation["abstract"] and not owner["abstract"]:
             self.refuse(f"{place}/abstract", f"{owner['name']} is not abstract")
-        if operation["event"] and operation["result"] is not None:
-            self.refuse(f"{place}/result", "an event has no result")
+        if operation["event"]:
+            self.check_event(place, owner, operation)
+        above = self.operation_above(owner, operation)
+        if above and above["event"] != operation["event"]:
+            what = "an event" if above["event"] else "no event"
+            self.refuse(f"{place}/event", f"{operation['name']} is {what} in a superclass")
         if operation["result"] is not None and "typeKind" in operation["result"]:
             self.check_type(f"{place}/result/type", operation["result"])
+            self.check_invoker(f"{place}/result", operation, operation["result"])
         seen = {}
         for where, argument in self.each(f"{place}/arguments", operation["arguments"]):
             self.check_word(f"{where}/name", argument["name"])
             self.check_once(f"{where}/name", argument["name"], seen, "an argument")
             if "typeKind" in argument:
                 self.check_type(f"{where}/type", argument)
+                self.check_invoker(where, operation, argument)
+
+    def check_invoker(self, place, operation, typed):
+        """Values hold one element or many plain values."""
+        if operation["invoker"] and typed["typeKind"] == "Class" and typed["upper"] > 1:
+            self.refuse(f"{place}/upper", "many elements can't be passed by reflection; say "
+                                          "\"invoker\": false")
+
+    def check_event(self, place, owner, operation):
+        """It gives nothing back, and its class and functions have names of their own."""
+        if operation["result"] is not None:
+            self.refuse(f"{place}/result", "an event has no result")
+        if operation["static"]:
+            self.refuse(f"{place}/static", "an event happens to an element")
+        for where, argument in self.each(f"{place}/arguments", operation["arguments"]):
+            if argument["name"] in ("owner", "operation"):
+                self.refuse(f"{where}/name", f"{argument['name']} means something else for every "
+                                             "event")
+            if not argument["isInput"]:
+                self.refuse(f"{where}/isInput", "an event gives nothing back")
+        name = capital(cpp_name(operation))
+        taken = [each["name"] for key in ("classes", "dataTypes", "enumerations")
+                 for each in self.facts[key]]
+        if f"{owner['name']}{name}Event" in taken:
+            self.refuse(f"{place}/name", f"there is a type {owner['name']}{name}Event")
+        others = [each for each in owner["operations"] if each is not operation]
+        if operation["name"] in [each["name"] for each in others]:
+            self.refuse(f"{place}/name", "an event has a name of its own")
+        functions = {cpp_name(each) for each in others}
+        functions |= {each for prop in owner["properties"] for each in accessors(prop)}
+        if f"do{name}" in functions | words.MEMBERS:
+            self.refuse(f"{place}/name", f"do{name} means something else")
+
+    def operation_above(self, owner, operation):
+        """What `operation` is another body of, in a superclass; or None."""
+        types = [argument["type"] for argument in operation["arguments"]]
+        at = self.classes.get(owner["superclass"])
+        while at:
+            for each in at.get("operations", []):
+                if cpp_name(each) == cpp_name(operation) and \
+                        [argument["type"] for argument in each["arguments"]] == types:
+                    return each
+            at = self.classes.get(at["superclass"])
+        return None
 
     def check_fields(self, place, entry):
         seen = {}

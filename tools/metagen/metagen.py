@@ -25,6 +25,7 @@ PER_CATALOGUE = {"Catalogue.h": "Catalogue.h", "CMakeLists.txt": "CMakeLists.txt
 PER_CLIENT = {"Fwd.h": "Fwd.h"}
 META_PACKAGE = {"MetaPackage.h": ".h", "MetaPackage.cpp": ".cpp"}
 PER_ENUMERATION = {"Enumeration.h": "{name}.h"}
+PER_EVENT = {"Event.h": "{name}.h", "Event.cpp": "{name}.cpp"}
 PER_DATA_TYPE = {"DataType.h": "{name}.h", "DataType.cpp": "{name}.cpp",
                  "DatatypeSerializer.h": "{name}DatatypeSerializer.h",
                  "DatatypeSerializer.cpp": "{name}DatatypeSerializer.cpp"}
@@ -57,6 +58,7 @@ def render(package, command):
             add(template, pattern.format(name=cls.name), c=cls, b=builders.Builder(cls))
     add_each(PER_ENUMERATION, package.enumerations)
     add_each(PER_DATA_TYPE, package.data_types)
+    add_each(PER_EVENT, package.events)
     for template, name in (PER_CATALOGUE if package.is_catalogue else PER_CLIENT).items():
         add(template, name)
     if not package.is_catalogue:

@@ -56,6 +56,10 @@ def capital(name):
     return name[0].upper() + name[1:]
 
 
+def is_question(name):
+    return re.match(r"is[A-Z]", name) is not None
+
+
 def article(name):
     return "an" if name[0] in "AEIOU" else "a"
 
@@ -120,8 +124,7 @@ class Property:
 
     @property
     def getter(self):
-        is_question = re.match(r"is[A-Z]", self.cpp_name)
-        return self.cpp_name if is_question else "get" + capital(self.cpp_name)
+        return operations.accessor(self.cpp_name)
 
     @property
     def setter(self):
@@ -435,6 +438,16 @@ class Class:
         self.operations = [operations.Operation(entry, cpp["operations"][position], self)
                            for position, entry in enumerate(facts["operations"])
                            if "operations" in cpp]
+
+    @property
+    def functions(self):
+        """What stands for the operations."""
+        return [function for each in self.operations for function in each.functions]
+
+    @property
+    def events(self):
+        """The event classes that it brings along."""
+        return [operations.Event(each) for each in self.operations if each.has_event_class]
 
     def method(self, facts):
         """A pointer to the function that stands for an operation."""

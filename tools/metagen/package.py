@@ -133,6 +133,19 @@ class Package:
         headers = {"std::vector": "<vector>", "boost::optional": "<boost/optional.hpp>"}
         return {header for name, header in headers.items() if carrier.startswith(name)}
 
+    def type_headers(self, typed):
+        """Headers of the plain type itself."""
+        if typed["typeKind"] != "Class":
+            header = self.types[typed["type"]].get("include")
+        else:
+            cls = self.by_name.get(typed["type"])
+            header = cls.handle_header if cls else "tarnkiln/kernel/ModelElement.h"
+        return {header} - {None}
+
+    @property
+    def events(self):
+        return [event for cls in self.classes for event in cls.events]
+
     @property
     def is_catalogue(self):
         return self.namespace == "tarn::kiln::meta"

@@ -4,9 +4,9 @@
 ///     std::cout << book;                  // Book "Emma" 8d5a0ea6-2f6b-4c1e-9f2c-0f8f3c1d7a52
 ///     EXPECT_EQ(shelf->getBest(), book);  // fails with both of them in words
 ///
-/// GoogleTest streams what it can, so a test that includes this gets readable messages; it needs no
-/// header of GoogleTest itself. The forms may change with versions: no program should read them.
-/// Nothing is resolved or loaded to be shown.
+/// GoogleTest streams what it can. A test program gets readable messages if each source that
+/// compares such objects includes this; it needs no header of GoogleTest itself. The forms may
+/// change with versions: no program should read them. Nothing is resolved or loaded to be shown.
 #pragma once
 #include "tarnkiln/collections/AbstractOwnedCollection.h"
 #include "tarnkiln/kernel/ElementHandle.h"

@@ -1,9 +1,7 @@
 #include "tarnkiln/meta/DeferredInvocation.h"
 
-#include "tarnkiln/Assert.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
-#include "tarnkiln/kernel/ModelImpl.h"
-#include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/support/emitEvent.h"
 
 #include <memory>
 #include <utility>
@@ -21,11 +19,8 @@ DeferredInvocation::~DeferredInvocation() = default;
 void DeferredInvocation::emit(Operation const& operation, ModelElement const& owner,
                               std::vector<Value> arguments)
 {
-    TARNKILN_ASSERT(owner, "only a live element has events");
-    auto event = std::make_unique<DeferredInvocation>(operation, owner, std::move(arguments));
-    Transaction const transaction = owner->getModel()->beginTransaction(/*revertible=*/false);
-    transaction.eventEmitted(std::move(event));
-    transaction.commit();
+    support::emitInvocation(
+        owner, std::make_unique<DeferredInvocation>(operation, owner, std::move(arguments)));
 }
 
 void DeferredInvocation::invoke()

@@ -10,6 +10,7 @@
 #include "tarnkiln/support/Dispatch.h"
 
 #include <memory>
+#include <vector>
 
 namespace acme::garden {
 
@@ -62,6 +63,15 @@ public:
 
     /// Gives all plants their share.
     void water(int litres);
+
+    /// Somebody dug the bed over.
+    ///
+    /// An event: it waits, as a `BedDugEvent`, for the end of the open transaction, and is dropped
+    /// by a rollback. Where no transaction is open it happens at once.
+    void dug(int depth, Plant const& moved, std::vector<ustring> const& tools, Season season);
+
+    /// What happens when `dug` has waited.
+    void doDug(int depth, Plant const& moved, std::vector<ustring> const& tools, Season season);
 
 private:
     static std::unique_ptr<ElementMap<ustring, Plant>> makePlants(Impl* owner);

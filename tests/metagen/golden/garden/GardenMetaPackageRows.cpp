@@ -28,14 +28,14 @@ constexpr support::PackageRow packages[] = {
 
 constexpr support::StructuredTypeRow classes[] = {
     {.name = u"Bed", .vobjName = "acme.garden.Bed", .package = 1, .superclass = {u"ModelElement"},
-     .properties = {0, 4}, .operations = {0, 1}, .collection = support::makeElementCollection<Bed>,
+     .properties = {0, 4}, .operations = {0, 2}, .collection = support::makeElementCollection<Bed>,
      .builder = Bed::Builder::instantiate, .uuid = "1d8e7d08-cfd0-5623-8ce7-ee4119a75436"},
     {.name = u"Plant", .vobjName = "acme.garden.Plant", .package = 1,
      .superclass = {u"ModelElement"}, .isAbstract = true, .properties = {4, 6},
-     .operations = {1, 1}, .collection = support::makeElementCollection<Plant>,
+     .operations = {2, 1}, .collection = support::makeElementCollection<Plant>,
      .uuid = "8a0c9272-52c5-5b82-bd12-8fbecb4c898a"},
     {.name = u"Tree", .vobjName = "acme.garden.Tree", .package = 1,
-     .superclass = {Classes, rows::classes::Plant}, .properties = {10, 3}, .operations = {2, 1},
+     .superclass = {Classes, rows::classes::Plant}, .properties = {10, 3}, .operations = {3, 1},
      .collection = support::makeElementCollection<Tree>, .builder = Tree::Builder::instantiate,
      .uuid = "285336f1-7fb2-5a18-ab68-d01bd62d6293"},
 };
@@ -92,6 +92,9 @@ constexpr support::PropertyRow properties[] = {
 constexpr support::OperationRow operations[] = {
     {.name = u"water", .arguments = {0, 1}, .invoker = support::makeInvokerOf<&Bed::Impl::water>,
      .uuid = "ff604fa5-d75c-5b2c-bdb6-a140a2e2e74f"},
+    {.name = u"dug", .flags = EVENT, .arguments = {1, 4},
+     .invoker = support::makeInvokerOf<&Bed::Impl::dug>,
+     .uuid = "7c495795-a6bb-5ccd-b34d-266eda459aee"},
     {.name = u"yield", .type = {u"Real"}, .lower = 1, .upper = 1, .flags = ABSTRACT,
      .invoker = support::makeInvokerOf<&Plant::Impl::yield>,
      .uuid = "77dd4122-cefa-55c6-92f7-25dfa060f077"},
@@ -103,6 +106,14 @@ constexpr support::OperationRow operations[] = {
 constexpr support::ArgumentRow arguments[] = {
     {.name = u"litres", .type = {u"Integer"}, .lower = 1, .upper = 1,
      .uuid = "4d90f59f-5cf3-5f94-8e35-88479df013a9"},
+    {.name = u"depth", .type = {u"Integer"}, .lower = 1, .upper = 1,
+     .uuid = "a979860f-f188-52af-84f5-36aba7e0aec7"},
+    {.name = u"moved", .type = {Classes, rows::classes::Plant}, .lower = 1, .upper = 1,
+     .uuid = "1cc9575f-bd36-5331-9c6d-5255e04ef250"},
+    {.name = u"tools", .type = {u"String"}, .lower = 0, .upper = support::UNBOUNDED,
+     .isOrdered = true, .uuid = "9dc75992-357a-5dea-be9c-e2904b5cff7b"},
+    {.name = u"season", .type = {Enumerations, rows::enumerations::Season}, .lower = 1, .upper = 1,
+     .uuid = "5b4d1053-e5b4-55d4-acf0-5c65e330aa56"},
 };
 
 constexpr support::EnumRow enumerations[] = {

@@ -64,6 +64,7 @@ namespace operations {
 enum Row : std::size_t
 {
     BedWater,
+    BedDug,
     PlantYield,
     TreeYield
 };
@@ -72,7 +73,11 @@ enum Row : std::size_t
 namespace arguments {
 enum Row : std::size_t
 {
-    BedWaterLitres
+    BedWaterLitres,
+    BedDugDepth,
+    BedDugMoved,
+    BedDugTools,
+    BedDugSeason
 };
 }  // namespace arguments
 
