@@ -191,8 +191,7 @@ TEST_F(ValueOfACollection, OfTextsMustBeOfThatType)
 
 TEST_F(ValueOfACollection, MayHoldOperations)
 {
-    meta::Class const operations = makeClass(
-        u"Operations", meta::Operation::metaClass() ? meta::Operation::metaClass() : root);
+    meta::Class const operations = makeClass(u"Operations", meta::Operation::metaClass());
     meta::Operation const open = meta::Operation::create(model);
     meta::Operation const close = meta::Operation::create(model);
 
@@ -206,5 +205,9 @@ TEST_F(ValueOfACollection, MayHoldOperations)
     EXPECT_EQ(set.extractEntryValues().size(), 2u);
     EXPECT_RAISES_WITH(messages::CannotCastIncompatibleTypes,
                        Value(colour, std::vector<meta::Operation>()), u"Colour");
+    EXPECT_RAISES_WITH(messages::CannotCastIncompatibleTypes,
+                       Value(book, std::vector<meta::Operation>()), u"Book");
+    EXPECT_RAISES_WITH(messages::CannotCastIncompatibleTypes,
+                       Value(root, std::set<meta::Operation>()), u"ModelElement");
 }
 }  // namespace

@@ -14,6 +14,7 @@ namespace tarn::kiln::meta {
 namespace {
 
 using tarnkiln::tests::serializerOf;
+using ::testing::ElementsAre;
 using ::testing::IsNull;
 using ::testing::NotNull;
 
@@ -262,6 +263,21 @@ TEST_F(SerializerRegistry, LendsSerializersThatMakeAndReadValuesOfTheNamesake)
     EXPECT_RAISES_WITH(messages::CannotCastIncompatibleTypes,
                        serializer.serializeValue(serializer.createEmptyOptionalValue(truth)),
                        u"Boolean");
+}
+
+TEST_F(SerializerRegistry, LendsSerializersWhoseCollectionsGiveValuesOfTheNamesakeBack)
+{
+    PrimitiveType const number = named<PrimitiveType>(u"Integer");
+    PropertySerializer& serializer = serializerOf(number);
+    Value const two = serializer.parseValue(u"2", number);
+    Value const one = serializer.parseValue(u"1", number);
+
+    Value const sequence = serializer.combineAsUnmanagedSequenceValue(number, {two, one, two});
+    Value const set = serializer.combineAsUnmanagedSetValue(number, {two, one, two});
+
+    EXPECT_THAT(sequence.extractEntryValues(), ElementsAre(two, one, two));
+    EXPECT_THAT(set.extractEntryValues(), ElementsAre(one, two));
+    EXPECT_EQ(serializer.serializeValue(sequence.extractEntryValues()[0]), u"2");
 }
 
 TEST_F(SerializerRegistry, ReadsATextInTheFirstFlavourThatKnowsIt)

@@ -27,8 +27,7 @@ template <> bool suits<Model>(meta::Type const& type)
 template <> bool suits<meta::Operation>(meta::Type const& type)
 {
     auto const* const own = internal::classImpl(type);
-    return own && own->isLive() &&
-           (!meta::Operation::metaClass() || own->isA(meta::Operation::metaClass()));
+    return own && own->isLive() && own->isA(meta::Operation::metaClass());
 }
 
 template <> bool isKeptAsLiteral<long>(meta::Type const& type)

@@ -80,13 +80,20 @@ class PlainAccess<std::vector<T>> : public ContainerAccess<T, ValueFlags::Sequen
 template <class T> class PlainAccess<std::set<T>> : public ContainerAccess<T, ValueFlags::Set>
 {};
 
+/// The entries, of the type of `value`, which may be a namesake of the standard one.
 template <class Container> std::vector<Value> typeMapperBasedExtractor(Value const& value)
 {
-    Container const container = value.getValue<Container>();
+    using Entry = typename Container::value_type;
+    Container const container = ValueAccess<Container>::read(value);
     std::vector<Value> result;
     result.reserve(container.size());
-    for (typename Container::value_type const& entry : container)
-        result.emplace_back(value.getType(), entry);
+    for (Entry const& entry : container)
+    {
+        if constexpr (ElementReference<Entry>)
+            result.emplace_back(value.getType(), entry);
+        else
+            result.push_back(ValueAccess<Entry>::make(value.getType(), entry));
+    }
     return result;
 }
 
