@@ -1,9 +1,8 @@
 /// \file
 /// The kinds of collections that reflective elements have. Their class is that of nodes.
 #pragma once
-#include "tarnkiln/collections/ReflectiveElementMap.h"
-#include "tarnkiln/collections/ReflectiveElementMultimap.h"
 #include "tarnkiln/collections/ReflectiveElementSequence.h"
+#include "tarnkiln/collections/ReflectiveKeyedCollection.h"
 #include "tarnkiln/collections/ReflectiveUnorderedElementSet.h"
 #include "tests/contract/CollectionKinds.h"
 #include "tests/support/NodeMetamodel.h"

@@ -1,8 +1,7 @@
 // Which collections the properties of reflective elements have, and what goes into them.
 #include "tarnkiln/collections/ReflectiveDataTypeCollection.h"
-#include "tarnkiln/collections/ReflectiveElementMap.h"
-#include "tarnkiln/collections/ReflectiveElementMultimap.h"
 #include "tarnkiln/collections/ReflectiveElementSequence.h"
+#include "tarnkiln/collections/ReflectiveKeyedCollection.h"
 #include "tarnkiln/collections/ReflectiveUnorderedElementSet.h"
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 #include "tests/meta/ReflectiveFixture.h"

@@ -2,9 +2,8 @@
 
 #include "tarnkiln/collections/DataTypeKeys.h"
 #include "tarnkiln/collections/QualifierKeys.h"
-#include "tarnkiln/collections/ReflectiveElementMap.h"
-#include "tarnkiln/collections/ReflectiveElementMultimap.h"
 #include "tarnkiln/collections/ReflectiveElementSequence.h"
+#include "tarnkiln/collections/ReflectiveKeyedCollection.h"
 #include "tarnkiln/collections/ReflectiveUnorderedElementSet.h"
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/internal/TypeKind.h"
