@@ -3,16 +3,20 @@
 #include "tarnkiln/collections/PrimitiveSequence.h"
 #include "tarnkiln/collections/PrimitiveSet.h"
 #include "tarnkiln/kernel/ListenerHolder.h"
+#include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/meta/AbstractMethodInvoker.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/DataTypeImpl.h"
 #include "tarnkiln/meta/EnumImpl.h"
 #include "tarnkiln/meta/EnumLiteralImpl.h"
+#include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/SchemaBase.h"
 #include "tarnkiln/support/PrimitiveInstantiator.h"
 #include "tests/meta/RegistrySession.h"
 #include "tests/support/ExpectRaises.h"
+#include "tests/support/ScriptedListener.h"
 
 #include <boost/lexical_cast.hpp>
 #include <boost/uuid/uuid_io.hpp>
@@ -24,6 +28,22 @@ using tarnkiln::tests::RegistrySession;
 using ::testing::ElementsAre;
 
 constexpr char const* SOME_UUID = "3d1c8a52-7f0e-3b57-9c5e-0a6f5a1d2e01";
+
+/// Tells when it goes.
+class Invoker final : public AbstractMethodInvoker
+{
+public:
+    explicit Invoker(bool& isGone) : m_isGone(isGone) {}
+    ~Invoker() override { m_isGone = true; }
+
+    boost::optional<Value> invoke(ModelElement const&, std::vector<Value> const&) const override
+    {
+        return boost::none;
+    }
+
+private:
+    bool& m_isGone;
+};
 
 /// A package without a metamodel; what it makes ends with the test.
 class MetaPackage : public ::testing::Test, protected AbstractMetaPackage
@@ -196,6 +216,37 @@ TEST_F(MetaPackage, ReplacesTheOrderedCategoriesOfAType)
 
     EXPECT_THAT(book->getVobjDispCategories().getEntries(),
                 ElementsAre("General", "Details", "General"));
+    session.commit();
+}
+
+TEST_F(MetaPackage, ReplacesTheOrderedCategoriesInOneChange)
+{
+    Class const book = made(createClass(u"Book", "library.Book", /*isAbstract=*/false, SOME_UUID));
+    MetaRegistry::LockedModel const locked(MetaRegistry::getInstance());
+    testkit::ScriptedListener listener;
+    testkit::listen(locked.getModel(), listener);
+
+    setOrderedVobjDispCategories(book, {"General", "Details", "Other"});
+
+    EXPECT_EQ(listener.committed.size(), 1u);
+    EXPECT_EQ(book->getVobjDispCategories().size(), 3u);
+}
+
+TEST_F(MetaPackage, DestroysTheInvokerThatItReplaces)
+{
+    RegistrySession session;
+    Operation const lend = made(Operation::create(MetaRegistry::getInstance().getModel()));
+    bool isFirstGone = false;
+    bool isSecondGone = false;
+
+    setInvoker(lend, std::make_unique<Invoker>(isFirstGone));
+    EXPECT_FALSE(isFirstGone);
+    setInvoker(lend, std::make_unique<Invoker>(isSecondGone));
+
+    EXPECT_TRUE(isFirstGone);
+    EXPECT_FALSE(isSecondGone);
+    setInvoker(lend, nullptr);
+    EXPECT_TRUE(isSecondGone);
     session.commit();
 }
 

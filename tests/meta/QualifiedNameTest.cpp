@@ -1,3 +1,4 @@
+#include "tarnkiln/meta/StandardTypes.h"
 #include "tests/meta/MetamodelSketch.h"
 
 namespace tarn::kiln::meta {
@@ -16,6 +17,8 @@ TEST_F(QualifiedName, LeavesOutTheEmptyNameOfTheRootPackage)
     EXPECT_EQ(cls(u"Book", {}, inner)->getQualifiedName(), u"outer.inner.Book");
     EXPECT_EQ(cls(u"Book", {}, root)->getQualifiedName(), u"Book");
     EXPECT_EQ(cls(u"Book")->getQualifiedName(), u"Book");
+    StandardTypes::ensureInitialized();
+    EXPECT_EQ(StandardTypes::booleanMeta->getQualifiedName(), u"Boolean");
 }
 
 TEST_F(QualifiedName, FollowsARename)
