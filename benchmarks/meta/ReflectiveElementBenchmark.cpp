@@ -40,6 +40,30 @@ Parts makeParts(Model const& model, Described const& described, std::int64_t cou
     return parts;
 }
 
+/// A model full of parts.
+struct Populated
+{
+    explicit Populated(benchmark::State const& state)
+        : parts(makeParts(model, described, state.range(0)))
+    {}
+
+    void readEach(meta::Property const& property) const
+    {
+        for (ModelElement const& part : parts)
+            benchmark::DoNotOptimize(
+                part->getPropertyValue(property, ModelElement::Impl::PUBLIC_ACCESS));
+    }
+    void setEach(meta::Property const& property, Value const& value) const
+    {
+        for (ModelElement const& part : parts)
+            part->setPropertyValue(property, value, ModelElement::Impl::PUBLIC_ACCESS);
+    }
+
+    Described const described;
+    Model const model = Model::create(ModelConstellation());
+    Parts const parts;
+};
+
 void perElement(benchmark::State& state)
 {
     state.SetItemsProcessed(state.iterations() * state.range(0));
@@ -101,67 +125,46 @@ BENCHMARK(BM_Create_TablePerElement)->Apply(sizes);
 
 void BM_Read_Number(benchmark::State& state)
 {
-    Described const described;
-    Model const model = Model::create(ModelConstellation());
-    Parts const parts = makeParts(model, described, state.range(0));
+    Populated const populated(state);
     for (auto _ : state)
-    {
-        for (ModelElement const& part : parts)
-            benchmark::DoNotOptimize(
-                part->getPropertyValue(described.width, ModelElement::Impl::PUBLIC_ACCESS));
-    }
+        populated.readEach(populated.described.width);
     perElement(state);
 }
 BENCHMARK(BM_Read_Number)->Apply(sizes);
 
 void BM_Read_Reference(benchmark::State& state)
 {
-    Described const described;
-    Model const model = Model::create(ModelConstellation());
-    Parts const parts = makeParts(model, described, state.range(0));
-    for (ModelElement const& part : parts)
-        set(part, described.left, parts.front());
+    Populated const populated(state);
+    meta::Property const& left = populated.described.left;
+    populated.setEach(left, Value::createElementValue(left, populated.parts.front()));
     for (auto _ : state)
-    {
-        for (ModelElement const& part : parts)
-            benchmark::DoNotOptimize(
-                part->getPropertyValue(described.left, ModelElement::Impl::PUBLIC_ACCESS));
-    }
+        populated.readEach(left);
     perElement(state);
 }
 BENCHMARK(BM_Read_Reference)->Apply(sizes);
 
 void BM_Set_Number(benchmark::State& state)
 {
-    Described const described;
-    Model const model = Model::create(ModelConstellation());
-    Parts const parts = makeParts(model, described, state.range(0));
+    Populated const populated(state);
     int number = 0;
     for (auto _ : state)
-    {
-        Value const value(StandardTypes::integerMeta, ++number);
-        for (ModelElement const& part : parts)
-            part->setPropertyValue(described.width, value, ModelElement::Impl::PUBLIC_ACCESS);
-    }
+        populated.setEach(populated.described.width, Value(StandardTypes::integerMeta, ++number));
     perElement(state);
 }
 BENCHMARK(BM_Set_Number)->Apply(sizes);
 
 void BM_Set_NumberAndRollBack(benchmark::State& state)
 {
-    Described const described;
-    Model const model = Model::create(ModelConstellation());
-    Parts const parts = makeParts(model, described, state.range(0));
+    Populated const populated(state);
     Value const value(StandardTypes::integerMeta, 1);
     for (auto _ : state)
     {
-        Transaction const transaction = model->beginTransaction(/*revertible=*/true);
-        for (ModelElement const& part : parts)
-            part->setPropertyValue(described.width, value, ModelElement::Impl::PUBLIC_ACCESS);
+        Transaction const transaction = populated.model->beginTransaction(/*revertible=*/true);
+        populated.setEach(populated.described.width, value);
         if (transaction.rollBack() != TransactionResult::RolledBack)
             state.SkipWithError("the transaction was not rolled back");
     }
-    if (get<int>(parts.front(), described.width) != 0)
+    if (get<int>(populated.parts.front(), populated.described.width) != 0)
         state.SkipWithError("the number is not what it was");
     perElement(state);
 }

@@ -26,16 +26,40 @@ ProxyId remoteId(ModelElement const& element, ustring const& uri)
 class Constellation : public ::testing::Test
 {
 protected:
+    /// A new member.
+    Model modelAt(ustring const& uri) const
+    {
+        Model const model = Model::create(home);
+        model->setModelURI(uri);
+        return model;
+    }
+
     ModelConstellation const home = ModelConstellation::create();
+};
+
+/// With two members.
+class AReferenceAcrossModels : public Constellation
+{
+protected:
+    Plain proxyOf(ProxyId const& id) const { return Plain::createProxy(here, id); }
+
+    Model const here = Model::create(home);
+    Model const there = modelAt(u"file://a");
+    InstalledNormalizer const normalizer;
+};
+
+/// With a service that loads and saves models.
+class AFetchedModel : public Constellation
+{
+protected:
+    InstalledNormalizer const normalizer;
 };
 
 using AConstellation = Constellation;
 using AJoiningModel = Constellation;
 using AGroup = Constellation;
 using TheHistoryOfUris = Constellation;
-using AReferenceAcrossModels = Constellation;
-using AFetchedModel = Constellation;
-using SavingAllModels = Constellation;
+using SavingAllModels = AFetchedModel;
 using ADestroyedConstellation = Constellation;
 
 // ---------------------------------------------------------------------------- members
@@ -103,8 +127,7 @@ TEST_F(AConstellation, FindsAModelByAnIdThatANormalizerTurnsIntoItsLocation)
     normalizer->toLocation = [](ustring const& id) {
         return id == u"alias" ? boost::optional<ustring>(u"file://a") : boost::none;
     };
-    Model const model = Model::create(home);
-    model->setModelURI(u"alias");
+    Model const model = modelAt(u"alias");
 
     EXPECT_EQ(model->getLocationModelId(), u"file://a");
     EXPECT_EQ(home->peekModel(u"alias"), model);
@@ -155,8 +178,7 @@ TEST(TheUriOfAModel, IsFoundAtItsNewLocationEvenIfItsExternalFormFails)
 
 TEST_F(AJoiningModel, MayNotTakeATakenLocation)
 {
-    Model const first = Model::create(home);
-    first->setModelURI(u"file://a");
+    Model const first = modelAt(u"file://a");
     Model const second = Model::create(ModelConstellation());
     second->setModelURI(u"file://a");
     ModelConstellation const elsewhere = second->getModelConstellation();
@@ -345,10 +367,8 @@ TEST_F(AGroup, TellsModelsInTheOrderOfTheirLocations)
     Trace trace;
     ScriptedListener listenerOfB("b", &trace);
     ScriptedListener listenerOfA("a", &trace);
-    Model const b = Model::create(home);
-    b->setModelURI(u"file://b");
-    Model const a = Model::create(home);
-    a->setModelURI(u"file://a");
+    Model const b = modelAt(u"file://b");
+    Model const a = modelAt(u"file://a");
     listen(b, listenerOfB, {.prepare = false, .validate = false});
     listen(a, listenerOfA, {.prepare = false, .validate = false});
     Transaction const transaction = b->beginTransaction(/*revertible=*/true);
@@ -407,8 +427,7 @@ TEST_F(TheHistoryOfUris, ForgetsAModelThatLastLayInMemoryOnly)
 
 TEST_F(TheHistoryOfUris, TakesMemoryForThatAtTheBeginningOnly)
 {
-    Model const model = Model::create(home);
-    model->setModelURI(u"file://a");
+    Model const model = modelAt(u"file://a");
     model->setModelURI(u"x@memory://z");
 
     model->destroy();
@@ -418,8 +437,7 @@ TEST_F(TheHistoryOfUris, TakesMemoryForThatAtTheBeginningOnly)
 
 TEST_F(TheHistoryOfUris, PointsToTheModelThatHasTheUriNow)
 {
-    Model const old = Model::create(home);
-    old->setModelURI(u"file://a");
+    Model const old = modelAt(u"file://a");
     old->setModelURI(u"file://b");
     EXPECT_EQ(home->getLatestModelURI(u"file://a"), u"file://b");
     Model const joining = Model::create(ModelConstellation());
@@ -435,12 +453,9 @@ TEST_F(TheHistoryOfUris, PointsToTheModelThatHasTheUriNow)
 
 TEST_F(AReferenceAcrossModels, SurvivesARename)
 {
-    Model const here = Model::create(home);
-    Model const there = Model::create(home);
-    there->setModelURI(u"file://a");
     Transaction const transaction = here->beginTransaction(/*revertible=*/false);
     Plain const target = Plain::create(there, uuidOf(1));
-    Plain const proxy = Plain::createProxy(here, remoteId(target, u"file://a"));
+    Plain const proxy = proxyOf(remoteId(target, u"file://a"));
 
     there->setModelURI(u"file://b");
 
@@ -450,13 +465,8 @@ TEST_F(AReferenceAcrossModels, SurvivesARename)
 
 TEST_F(AReferenceAcrossModels, SurvivesTheDestructionAndReloadOfItsTarget)
 {
-    InstalledNormalizer const normalizer;
-    Model const here = Model::create(home);
-    Model const there = Model::create(home);
-    there->setModelURI(u"file://a");
-    Plain const proxy = Plain::createProxy(here, ProxyId(ElementId::UUID_TYPE,
-                                                         u"00000001-0000-0000-0000-000000000001",
-                                                         ustring(u"file://a")));
+    Plain const proxy = proxyOf(ProxyId(
+        ElementId::UUID_TYPE, u"00000001-0000-0000-0000-000000000001", ustring(u"file://a")));
     there->destroy();
     Plain reloaded;
     normalizer->load = [&](ustring const&) {
@@ -476,14 +486,9 @@ TEST_F(AReferenceAcrossModels, SurvivesTheDestructionAndReloadOfItsTarget)
 
 TEST_F(AReferenceAcrossModels, IsLoadedByTheUriItNamesAndNotByTheLatest)
 {
-    InstalledNormalizer const normalizer;
-    Model const here = Model::create(home);
-    Model const there = Model::create(home);
-    there->setModelURI(u"file://a");
     there->setModelURI(u"file://b");
     there->destroy();
-    Plain const proxy =
-        Plain::createProxy(here, ProxyId(ElementId::UUID_TYPE, u"x", ustring(u"file://a")));
+    Plain const proxy = proxyOf(ProxyId(ElementId::UUID_TYPE, u"x", ustring(u"file://a")));
 
     EXPECT_EQ(home->resolveProxy(proxy), proxy);
 
@@ -492,28 +497,23 @@ TEST_F(AReferenceAcrossModels, IsLoadedByTheUriItNamesAndNotByTheLatest)
 
 TEST_F(AReferenceAcrossModels, IsSoughtAtTheLocationOfItsUriToo)
 {
-    InstalledNormalizer const normalizer;
     normalizer->toLocation = [](ustring const& id) {
         return id == u"alias" ? boost::optional<ustring>(u"file://a") : boost::none;
     };
-    Model const here = Model::create(home);
-    Model const there = Model::create(home);
-    there->setModelURI(u"file://a");
     Transaction const transaction = here->beginTransaction(/*revertible=*/false);
     Plain const target = Plain::create(there, uuidOf(1));
 
-    EXPECT_EQ(home->resolveProxy(Plain::createProxy(here, remoteId(target, u"alias"))), target);
+    EXPECT_EQ(home->resolveProxy(proxyOf(remoteId(target, u"alias"))), target);
     EXPECT_THAT(normalizer->loads, IsEmpty());
 }
 
 TEST_F(AReferenceAcrossModels, StaysUnresolvedIntoALostModelOfMemory)
 {
-    Model const here = Model::create(home);
-    Model const there = Model::create(home);
+    Model const lost = Model::create(home);
     ProxyId const id(ElementId::UUID_TYPE, u"00000001-0000-0000-0000-000000000001",
-                     there->getModelURI());
-    Plain const proxy = Plain::createProxy(here, id);
-    there->destroy();
+                     lost->getModelURI());
+    Plain const proxy = proxyOf(id);
+    lost->destroy();
 
     EXPECT_EQ(here->resolveProxy(nullptr, proxy), proxy);
     EXPECT_EQ(here->peekResolveProxy(nullptr, proxy), proxy);
@@ -521,10 +521,7 @@ TEST_F(AReferenceAcrossModels, StaysUnresolvedIntoALostModelOfMemory)
 
 TEST_F(AReferenceAcrossModels, LoadsNothingWhenItIsOnlyPeekedAt)
 {
-    InstalledNormalizer const normalizer;
-    Model const here = Model::create(home);
-    Plain const proxy =
-        Plain::createProxy(here, ProxyId(ElementId::UUID_TYPE, u"x", ustring(u"file://a")));
+    Plain const proxy = proxyOf(ProxyId(ElementId::UUID_TYPE, u"x", ustring(u"file://a")));
 
     EXPECT_EQ(here->peekResolveProxy(nullptr, proxy), proxy);
 
@@ -535,7 +532,6 @@ TEST_F(AReferenceAcrossModels, LoadsNothingWhenItIsOnlyPeekedAt)
 
 TEST_F(AFetchedModel, IsAdoptedUnderTheUriThatWasAskedFor)
 {
-    InstalledNormalizer const normalizer;
     Model const loaded = Model::create(ModelConstellation());
     normalizer->load = [&](ustring const&) { return loaded; };
 
@@ -547,8 +543,6 @@ TEST_F(AFetchedModel, IsAdoptedUnderTheUriThatWasAskedFor)
 
 TEST_F(AFetchedModel, IsNoneIfThereIsNone)
 {
-    InstalledNormalizer const normalizer;
-
     EXPECT_FALSE(home->fetchModel(u"file://a"));
     EXPECT_THAT(normalizer->loads, ElementsAre(u"file://a"));
     EXPECT_THAT(home->getModels(), IsEmpty());
@@ -556,7 +550,6 @@ TEST_F(AFetchedModel, IsNoneIfThereIsNone)
 
 TEST_F(AFetchedModel, IsNotATransientOne)
 {
-    InstalledNormalizer const normalizer;
     normalizer->load = [](ustring const&) { return Model::createTransientModel(); };
 
     EXPECT_EQ(home->fetchModel(u"file://a").getImpl(), nullptr);
@@ -565,7 +558,6 @@ TEST_F(AFetchedModel, IsNotATransientOne)
 
 TEST_F(AFetchedModel, MayBeARegistryModelThatIsNotAdopted)
 {
-    InstalledNormalizer const normalizer;
     Model const registry = Model::createRegistryModel(u"registry://r");
     normalizer->load = [&](ustring const&) { return registry; };
 
@@ -577,7 +569,6 @@ TEST_F(AFetchedModel, MayBeARegistryModelThatIsNotAdopted)
 
 TEST_F(AFetchedModel, FailsAsItsNormalizerFails)
 {
-    InstalledNormalizer const normalizer;
     normalizer->load = [](ustring const&) -> Model { throw std::runtime_error("no"); };
     normalizer->save = [](Model const&, ustring const&) -> bool { throw std::range_error("no"); };
     Model const model = Model::create(home);
@@ -588,11 +579,8 @@ TEST_F(AFetchedModel, FailsAsItsNormalizerFails)
 
 TEST_F(SavingAllModels, NamesEachByItsLocationInOrder)
 {
-    InstalledNormalizer const normalizer;
-    Model const b = Model::create(home);
-    Model const a = Model::create(home);
-    b->setModelURI(u"file://b");
-    a->setModelURI(u"file://a");
+    Model const b = modelAt(u"file://b");
+    Model const a = modelAt(u"file://a");
 
     home->saveModels();
 
@@ -601,11 +589,8 @@ TEST_F(SavingAllModels, NamesEachByItsLocationInOrder)
 
 TEST_F(SavingAllModels, AllowsAModelToBeRenamedByItsSaving)
 {
-    InstalledNormalizer const normalizer;
-    Model const a = Model::create(home);
-    Model const b = Model::create(home);
-    a->setModelURI(u"file://a");
-    b->setModelURI(u"file://b");
+    Model const a = modelAt(u"file://a");
+    Model const b = modelAt(u"file://b");
     normalizer->save = [](Model const& model, ustring const& location) {
         model->setModelURI(u"file://saved/" + location);
         return true;
@@ -623,10 +608,8 @@ TEST_F(ADestroyedConstellation, DestroysItsModelsInOrderAndThenItself)
 {
     Trace trace;
     TracingListener listener(trace);
-    Model const b = Model::create(home);
-    Model const a = Model::create(home);
-    b->setModelURI(u"file://b");
-    a->setModelURI(u"file://a");
+    Model const b = modelAt(u"file://b");
+    Model const a = modelAt(u"file://a");
     std::vector<ElementImpl*> told;
     listener.onDestroyed = [&](ModelConstellation const& constellation, Model const& model) {
         told.push_back(model.getImpl());
