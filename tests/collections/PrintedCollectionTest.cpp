@@ -1,7 +1,7 @@
 // How collections look in streams and in the messages of GoogleTest, and that all can be walked.
 #include "tarnkiln/collections/StringToStringMap.h"
 #include "tarnkiln/kernel/ModelConstellation.h"
-#include "tarnkiln/kernel/Printing.h"
+#include "tarnkiln/kernel/PrintTo.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
@@ -143,11 +143,13 @@ TEST_F(AWalkedCollection, FillsHashedContainersOfHandlesAndUuids)
 
     std::unordered_set<Node> const nodes(holder->getChildren().begin(),
                                          holder->getChildren().end());
+    std::unordered_set<Model> const models{alpha->getModel(), beta->getModel()};
     std::unordered_map<UUID, Node> byUuid;
     for (Node const& node : nodes)
         byUuid.emplace(node->getUuid(), node);
 
     EXPECT_EQ(nodes, (std::unordered_set<Node>{beta, alpha}));
+    EXPECT_EQ(models.size(), 1u);
     EXPECT_EQ(byUuid.at(uuidOf(2)), beta);
 }
 }  // namespace testkit

@@ -116,6 +116,18 @@ TYPED_TEST(EveryHandleClass, EqualsHandlesOfTheSameObjectOnly)
     EXPECT_NE(first, TypeParam());
 }
 
+TYPED_TEST(EveryHandleClass, CanBeLookedUpInHashedContainers)
+{
+    TypeParam const first = this->maker.make();
+    TypeParam const second = this->maker.make();
+    std::unordered_set<TypeParam> const set{first, first, TypeParam()};
+
+    EXPECT_EQ(set.size(), 2u);
+    EXPECT_EQ(set.count(first), 1u);
+    EXPECT_EQ(set.count(second), 0u);
+    EXPECT_EQ(set.count(TypeParam()), 1u);
+}
+
 TEST(HandlesOfElements, HashByTheirElementWhateverTheirClass)
 {
     Model const model = Model::createTransientModel();

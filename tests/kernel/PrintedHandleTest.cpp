@@ -2,7 +2,7 @@
 #include "tarnkiln/kernel/ModelConstellationImpl.h"
 #include "tarnkiln/kernel/ModelId.h"
 #include "tarnkiln/kernel/ModelImpl.h"
-#include "tarnkiln/kernel/Printing.h"
+#include "tarnkiln/kernel/PrintTo.h"
 #include "tarnkiln/kernel/Transaction.h"
 #include "tarnkiln/meta/Operation.h"
 #include "tests/support/NodeImpl.h"
@@ -10,7 +10,11 @@
 #include "tests/support/RuntimeMetamodel.h"
 #include "tests/support/Uuids.h"
 
+#include <gtest/gtest-spi.h>
+
 namespace testkit {
+
+using ::testing::PrintToString;
 
 constexpr char const* ID = "00000007-0000-0000-0000-000000000001";
 
@@ -43,6 +47,23 @@ protected:
 TEST_F(APrintedHandle, ShowsClassNameAndUuid)
 {
     EXPECT_EQ(streamed(node(u"alpha")), string("Node \"alpha\" ") + ID);
+}
+
+TEST_F(APrintedHandle, IsTheSameInMessagesOfGoogleTest)
+{
+    Node const made = node(u"alpha");
+
+    EXPECT_EQ(PrintToString(made), streamed(made));
+    EXPECT_EQ(PrintToString(ModelElement(made)), streamed(made));
+}
+
+TEST_F(APrintedHandle, LetsAFailureTellItsElements)
+{
+    Node const made = node(u"alpha");
+    string const expected = streamed(made);
+
+    EXPECT_NONFATAL_FAILURE(EXPECT_EQ(made, Node()), expected);
+    EXPECT_NONFATAL_FAILURE(EXPECT_EQ(made, Node()), "empty handle");
 }
 
 TEST_F(APrintedHandle, SaysThatItIsEmpty)
@@ -150,6 +171,16 @@ TEST(APrintedIdentifier, ShowsItsParts)
     EXPECT_EQ(streamed(ProxyId(u"uuid", u"12", ustring(u"file:a"))), "uuid:12 in file:a");
     EXPECT_EQ(streamed(ModelId::parse(u"me@file:books")), "me@file:books");
     EXPECT_EQ(streamed(ModelId::parse(u"file:books")), "file:books");
+}
+
+TEST(APrintedIdentifier, IsTheSameInMessagesOfGoogleTest)
+{
+    EXPECT_EQ(PrintToString(ElementId(u"uuid", u"12")), "uuid:12");
+    EXPECT_EQ(PrintToString(ProxyId(u"uuid", u"12")), "uuid:12");
+    EXPECT_EQ(PrintToString(ModelId::parse(u"file:books")), "file:books");
+    std::ostringstream uuid;
+    PrintTo(uuidOf(7), &uuid);
+    EXPECT_EQ(uuid.str(), ID);
 }
 
 TEST(APrintedResult, IsTheNameOfTheResult)

@@ -1,6 +1,6 @@
 // How values look in streams and in the messages of GoogleTest.
 #include "tarnkiln/kernel/ModelConstellation.h"
-#include "tarnkiln/kernel/Printing.h"
+#include "tarnkiln/kernel/PrintTo.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/meta/ExtensionPrototype.h"
 #include "tarnkiln/meta/Language.h"
@@ -11,10 +11,13 @@
 #include "tests/support/Uuids.h"
 
 #include <boost/date_time/posix_time/posix_time_types.hpp>
+#include <gtest/gtest-spi.h>
 
 namespace testkit {
 
-template <class T> string streamed(T const& value)
+using ::testing::PrintToString;
+
+string streamed(Value const& value)
 {
     std::ostringstream out;
     out << value;
@@ -56,6 +59,13 @@ TEST_F(APrintedValue, ShowsTextsInQuotes)
     EXPECT_EQ(streamed(valueOf(string("a \"b\""))), "StdString \"a \\\"b\\\"\"");
 }
 
+TEST_F(APrintedValue, IsTheSameInMessagesOfGoogleTest)
+{
+    EXPECT_EQ(PrintToString(valueOf(42)), "Integer 42");
+    EXPECT_NONFATAL_FAILURE(EXPECT_EQ(valueOf(42), valueOf(ustring(u"b"))), "Integer 42");
+    EXPECT_NONFATAL_FAILURE(EXPECT_EQ(valueOf(42), valueOf(ustring(u"b"))), "String \"b\"");
+}
+
 TEST_F(APrintedValue, ShowsTheShapeOfAnOptionalOne)
 {
     meta::Type const& integer = StandardTypes::integerMeta;
@@ -73,7 +83,7 @@ TEST_F(APrintedValue, ShowsAnElementAsItsHandle)
     EXPECT_EQ(streamed(Value(Node::metaClass(), node)),
               "Node Node \"alpha\" 00000007-0000-0000-0000-000000000001");
     EXPECT_EQ(streamed(Value(Node::metaClass(), Node())), "Node empty handle");
-    EXPECT_EQ(streamed(valueOf(model)), "TarnModel " + streamed(model));
+    EXPECT_EQ(streamed(valueOf(model)), "TarnModel " + PrintToString(model));
 }
 
 TEST_F(APrintedValue, ShowsALiteralByItsName)
@@ -166,12 +176,12 @@ TEST_F(APrintedValue, WasMovedFrom)
 
 TEST(APrintedShape, IsTheNameOfTheShape)
 {
-    EXPECT_EQ(streamed(ValueFlags::OptionalSingle), "OptionalSingle");
-    EXPECT_EQ(streamed(ValueFlags::Single), "Single");
-    EXPECT_EQ(streamed(ValueFlags::Sequence), "Sequence");
-    EXPECT_EQ(streamed(ValueFlags::Set), "Set");
-    EXPECT_EQ(streamed(ValueFlags::Map), "Map");
-    EXPECT_EQ(streamed(ValueFlags::Multimap), "Multimap");
-    EXPECT_EQ(streamed(static_cast<ValueFlags>(4)), "4");
+    EXPECT_EQ(PrintToString(ValueFlags::OptionalSingle), "OptionalSingle");
+    EXPECT_EQ(PrintToString(ValueFlags::Single), "Single");
+    EXPECT_EQ(PrintToString(ValueFlags::Sequence), "Sequence");
+    EXPECT_EQ(PrintToString(ValueFlags::Set), "Set");
+    EXPECT_EQ(PrintToString(ValueFlags::Map), "Map");
+    EXPECT_EQ(PrintToString(ValueFlags::Multimap), "Multimap");
+    EXPECT_EQ(PrintToString(static_cast<ValueFlags>(4)), "4");
 }
 }  // namespace testkit

@@ -1,3 +1,4 @@
+#include "tarnkiln/meta/PrimitiveTypeImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tests/meta/MetamodelSketch.h"
 

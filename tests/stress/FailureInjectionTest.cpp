@@ -215,30 +215,15 @@ TEST_P(OutOfMemory, WhileAChangeIsMadeInATransactionIsTakenBackByIt)
 {
     auto const round = [&](unsigned long number, Failing mode) {
         World world;
-        bool failed = false;
-        bool threw = false;
-        {
-            Transaction const transaction = world.begin();
-            {
-                FailingAllocation const failing(number, mode);
-                try
-                {
-                    operation.run(world);
-                }
-                catch (std::bad_alloc const&)
-                {
-                    threw = true;
-                }
-                failed = failing.hasFailed();
-            }
-            if (threw)
-                transaction.rollBack();
-            else
-                transaction.commit();
-        }
-        EXPECT_EQ(threw ? outcome.before : outcome.after, world.picture());
+        Transaction const transaction = world.begin();
+        Attempt const attempt(number, mode, [&] { operation.run(world); });
+        if (attempt.threw)
+            transaction.rollBack();
+        else
+            transaction.commit();
+        EXPECT_EQ(attempt.threw ? outcome.before : outcome.after, world.picture());
         world.expectUsable();
-        return failed;
+        return attempt.failed;
     };
     forEachFailure(round, {Failing::Once});
 }
@@ -247,27 +232,14 @@ TEST_P(OutOfMemory, WhileAChangeIsMadeOnItsOwnLeavesTheModelAsItWasOrIsTaken)
 {
     forEachFailure([&](unsigned long number, Failing mode) {
         World world;
-        bool failed = false;
-        bool threw = false;
-        {
-            FailingAllocation const failing(number, mode);
-            try
-            {
-                operation.run(world);
-            }
-            catch (std::bad_alloc const&)
-            {
-                threw = true;
-            }
-            failed = failing.hasFailed();
-        }
+        Attempt const attempt(number, mode, [&] { operation.run(world); });
         Picture const result = world.picture();
-        if (threw)
+        if (attempt.threw)
             EXPECT_EQ(outcome.before, result);
         else
             EXPECT_THAT(result, testing::AnyOf(outcome.before, outcome.after));
         world.expectUsable();
-        return failed;
+        return attempt.failed;
     });
 }
 
@@ -278,18 +250,14 @@ TEST_P(OutOfMemory, WhileATransactionCommitsLeavesTheModelAsItWasOrCommitted)
         Transaction const transaction = world.begin();
         operation.run(world);
         TransactionResult result = TransactionResult::NotCompleted;
-        bool failed = false;
-        {
-            FailingAllocation const failing(number, mode);
-            result = transaction.commit();
-            failed = failing.hasFailed();
-        }
+        Attempt const attempt(number, mode, [&] { result = transaction.commit(); });
+        EXPECT_FALSE(attempt.threw);
         EXPECT_THAT(result,
                     testing::AnyOf(TransactionResult::Committed, TransactionResult::RolledBack));
         EXPECT_EQ(result == TransactionResult::Committed ? outcome.after : outcome.before,
                   world.picture());
         world.expectUsable();
-        return failed;
+        return attempt.failed;
     });
 }
 
@@ -300,16 +268,12 @@ TEST_P(OutOfMemory, WhileATransactionIsRolledBackLeavesTheModelAsItWas)
         Transaction const transaction = world.begin();
         operation.run(world);
         TransactionResult result = TransactionResult::NotCompleted;
-        bool failed = false;
-        {
-            FailingAllocation const failing(number, mode);
-            result = transaction.rollBack();
-            failed = failing.hasFailed();
-        }
+        Attempt const attempt(number, mode, [&] { result = transaction.rollBack(); });
+        EXPECT_FALSE(attempt.threw);
         EXPECT_EQ(TransactionResult::RolledBack, result);
         EXPECT_EQ(outcome.before, world.picture());
         world.expectUsable();
-        return failed;
+        return attempt.failed;
     });
 }
 
@@ -318,20 +282,10 @@ TEST(OutOfMemoryWhileATransactionBegins, LeavesNoneOpen)
     forEachFailure([&](unsigned long number, Failing mode) {
         World world;
         Picture const before = world.picture();
-        bool failed = false;
-        {
-            FailingAllocation const failing(number, mode);
-            try
-            {
-                world.begin();
-            }
-            catch (std::bad_alloc const&)
-            {}
-            failed = failing.hasFailed();
-        }
+        Attempt const attempt(number, mode, [&] { world.begin(); });
         EXPECT_EQ(before, world.picture());
         world.expectUsable();
-        return failed;
+        return attempt.failed;
     });
 }
 
@@ -339,23 +293,13 @@ TEST(OutOfMemoryWhileATransactionBegins, LeavesTheOuterOneUsable)
 {
     forEachFailure([&](unsigned long number, Failing mode) {
         World world;
-        bool failed = false;
         Transaction const outer = world.begin();
-        {
-            FailingAllocation const failing(number, mode);
-            try
-            {
-                world.begin().commit();
-            }
-            catch (std::bad_alloc const&)
-            {}
-            failed = failing.hasFailed();
-        }
+        Attempt const attempt(number, mode, [&] { world.begin().commit(); });
         world.a->setCount(3);
         EXPECT_EQ(TransactionResult::Committed, outer.commit());
         EXPECT_EQ(3, world.a->getCount());
         world.expectUsable();
-        return failed;
+        return attempt.failed;
     });
 }
 

@@ -1,5 +1,5 @@
 /// \file
-/// One round of a test for each allocation that can fail in it.
+/// Calls that run out of memory, and one round of a test for each allocation that can fail in it.
 #pragma once
 #include "tests/support/FailingAllocation.h"
 #include "tests/support/Node.h"
@@ -8,9 +8,31 @@
 #include <gtest/gtest.h>
 
 #include <initializer_list>
+#include <new>
 #include <string>
 
 namespace testkit {
+
+/// A call during which the allocation with that number fails, and perhaps all later ones.
+struct Attempt
+{
+    template <class Call> Attempt(unsigned long number, Failing mode, Call const& call)
+    {
+        FailingAllocation const failing(number, mode);
+        try
+        {
+            call();
+        }
+        catch (std::bad_alloc const&)
+        {
+            threw = true;
+        }
+        failed = failing.hasFailed();
+    }
+
+    bool failed = false;  ///< Whether there was such an allocation.
+    bool threw = false;
+};
 
 /// Calls `round(number, mode)` for each allocation that can fail, until it says that none has.
 /// No round may leave anything behind.

@@ -82,6 +82,11 @@ private:
     meta::Property m_property;  ///< Empty if the property is given by a slot.
 };
 
+/// Shows the entries to people, `{Book "Emma" 8d5a0ea6-..., Book "Persuasion" 09b1fcdb-...}`;
+/// proxies as they stand. A long collection is cut.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out,
+                                         AbstractOwnedCollection const& collection);
+
 /// The bracket around one change of a collection: a transaction if none is open, else nothing.
 ///
 /// An `Operation` that is not committed takes the change back if its own transaction is deep.

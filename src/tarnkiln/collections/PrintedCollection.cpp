@@ -2,7 +2,7 @@
 #include "tarnkiln/collections/AbstractPrimitiveCollection.h"
 #include "tarnkiln/collections/ReferenceCollection.h"
 #include "tarnkiln/collections/StringToStringMap.h"
-#include "tarnkiln/kernel/Printing.h"
+#include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/streamText.h"
 
 #include <map>

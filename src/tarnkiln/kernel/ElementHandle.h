@@ -2,8 +2,12 @@
 /// What all handles have in common.
 #pragma once
 #include "tarnkiln/kernel/ElementImpl.h"
+#include "tarnkiln/kernel/UUIDHasher.h"
 
+#include <concepts>
+#include <cstddef>
 #include <functional>
+#include <iosfwd>
 #include <utility>
 
 namespace tarn::kiln {
@@ -76,4 +80,29 @@ protected:
 
     ElementImpl* m_impl = nullptr;
 };
-} // namespace tarn::kiln
+
+/// Shows the object behind a handle of any class to people: its class, its name or the URI of a
+/// model if it has one, its UUID, and whether it is destroyed or stands in for another element.
+///
+///     Book "Emma" 8d5a0ea6-2f6b-4c1e-9f2c-0f8f3c1d7a52
+///
+/// The name is the property `name`, if the class has one that holds a single text. Resolves and
+/// loads nothing, and may change with versions.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ElementHandle const& handle);
+}  // namespace tarn::kiln
+
+/// By UUID; 0 for the empty handle.
+template <> struct std::hash<tarn::kiln::ElementHandle>
+{
+    std::size_t operator()(tarn::kiln::ElementHandle const& handle) const noexcept
+    {
+        tarn::kiln::ElementImpl const* const impl = handle.getElementImpl();
+        return impl ? tarn::kiln::internal::UUIDHasher()(impl->getUuid()) : 0;
+    }
+};
+
+/// Handles of all classes hash as the object does.
+template <std::derived_from<tarn::kiln::ElementHandle> Handle>
+requires(!std::same_as<Handle, tarn::kiln::ElementHandle>) struct std::hash<Handle>
+    : std::hash<tarn::kiln::ElementHandle>
+{};

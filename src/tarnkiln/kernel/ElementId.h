@@ -4,6 +4,8 @@
 #include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/Types.h"
 
+#include <iosfwd>
+
 namespace tarn::kiln {
 
 /// An identifier of some type, by which a resolver finds an element; ordered by type, then value.
@@ -27,4 +29,7 @@ private:
     ustring m_type;
     ustring m_id;
 };
+
+/// Shows type and identifier to people, as `uuid:8d5a0ea6-...`.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ElementId const& id);
 } // namespace tarn::kiln

@@ -2,9 +2,6 @@
 /// The handle of an element of a model.
 #pragma once
 #include "tarnkiln/kernel/ElementHandle.h"
-#include "tarnkiln/kernel/UUIDHasher.h"
-
-#include <concepts>
 
 namespace tarn::kiln {
 
@@ -54,18 +51,3 @@ public:
     Impl* operator->() const;  ///< All operations of the element; the handle must not be empty.
 };
 }  // namespace tarn::kiln
-
-template <> struct std::hash<tarn::kiln::ModelElement>
-{
-    std::size_t operator()(tarn::kiln::ModelElement const& element) const noexcept
-    {
-        tarn::kiln::ElementImpl const* const impl = element.getElementImpl();
-        return impl ? tarn::kiln::internal::UUIDHasher()(impl->getUuid()) : 0;
-    }
-};
-
-/// Handles of all classes hash as the element does.
-template <std::derived_from<tarn::kiln::ModelElement> Handle>
-requires(!std::same_as<Handle, tarn::kiln::ModelElement>) struct std::hash<Handle>
-    : std::hash<tarn::kiln::ModelElement>
-{};

@@ -4,6 +4,8 @@
 #include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/Types.h"
 
+#include <iosfwd>
+
 namespace tarn::kiln {
 
 /// The parts of a model id of the form "prefix@scheme:path", where "prefix@" may be missing.
@@ -20,4 +22,7 @@ struct TARNKILN_EXPORT ModelId
     /// \throws tarnkiln::messages::InvalidValue  if there is no such ':'.
     static ModelId parse(ustring const& text);
 };
+
+/// Shows the whole id to people.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ModelId const& id);
 } // namespace tarn::kiln

@@ -1,6 +1,9 @@
 // How handles and identifiers are shown to people.
+#include "tarnkiln/kernel/ElementHandle.h"
+#include "tarnkiln/kernel/ModelId.h"
 #include "tarnkiln/kernel/ModelImpl.h"
-#include "tarnkiln/kernel/Printing.h"
+#include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/streamText.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/NamedElementImpl.h"

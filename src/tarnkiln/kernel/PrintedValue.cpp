@@ -1,7 +1,8 @@
 // How values are shown to people.
+#include "tarnkiln/collections/AbstractOwnedCollection.h"
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/Model.h"
-#include "tarnkiln/kernel/Printing.h"
+#include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/streamText.h"
 #include "tarnkiln/meta/DataTypeImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"

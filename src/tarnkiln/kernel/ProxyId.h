@@ -27,4 +27,7 @@ private:
 
     boost::optional<ustring> m_model;
 };
+
+/// Shows the parts to people, as `uuid:8d5a0ea6-... in file:books`.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ProxyId const& id);
 } // namespace tarn::kiln

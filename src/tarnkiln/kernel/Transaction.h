@@ -9,6 +9,7 @@
 #include <boost/optional.hpp>
 
 #include <functional>
+#include <iosfwd>
 #include <memory>
 
 namespace tarn::kiln {
@@ -21,6 +22,9 @@ enum class TransactionResult : int
     RolledBack = 2,   ///< The changes were undone.
     NotRevertible = 3 ///< The transaction ended, but it is shallow and its changes stay.
 };
+
+/// Shows the name of a result.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, TransactionResult result);
 
 /// A bracket around changes of a model; `model->beginTransaction(revertible)` opens one.
 ///

@@ -279,21 +279,10 @@ void Value::storeElement(ModelElement const& element)
     setPayload(new ModelElement(element));
 }
 
-void Value::checkElement(meta::Class const& required, IsInstance isInstance) const
+void Value::checkElement(meta::Class const& required) const
 {
     auto const* const own = internal::classImpl(m_type);
-    if (m_flags > ValueFlags::Single || !own || !own->isLive())
-        failCast();
-
-    if (required)
-    {
-        if (!own->isA(required))
-            failCast();
-        return;
-    }
-    // No metaclass, no inheritance to ask about: the object has to tell.
-    ModelElement const* const held = element();
-    if (held && held->getElementImpl() && !isInstance(*held))
+    if (m_flags > ValueFlags::Single || !own || !own->isLive() || !own->isA(required))
         failCast();
 }
 

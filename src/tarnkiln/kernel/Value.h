@@ -16,6 +16,7 @@
 #include <boost/optional.hpp>
 
 #include <cstddef>
+#include <iosfwd>
 #include <vector>
 
 namespace tarn::kiln::support {
@@ -136,7 +137,6 @@ public:
     /// | `AbstractPrimitiveCollection&` | a managed collection | not a class |
     /// | `StringToStringMap&` | `Single` | `StringToStringMap` |
     ///
-    /// A handle class whose metaclass is not there yet is told by the element that is held.
     /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  (qualified name of the value's
     ///     type)
     template <class T>
@@ -192,7 +192,6 @@ private:
     using Cloner = void* (*)(void*);
     using Comparator = bool (*)(void*, void*);
     using Extractor = std::vector<Value> (*)(Value const&);
-    using IsInstance = bool (*)(ModelElement const&);
 
     /// Without payload and functions.
     Value(ValueMeta const& meta, std::nullptr_t);
@@ -203,7 +202,7 @@ private:
 
     [[noreturn]] void failCast() const;
     void storeElement(ModelElement const& element);
-    void checkElement(meta::Class const& required, IsInstance isInstance) const;
+    void checkElement(meta::Class const& required) const;
     /// Null if there is no payload.
     ModelElement const* element() const;
     /// The payload as a `T`; null if there is none. Fails if it is something else.
@@ -216,6 +215,17 @@ private:
     Comparator m_comparator = nullptr;  ///< Null: payloads are compared by address.
     Extractor m_extractor = nullptr;    ///< Not null only for an unmanaged collection.
 };
+
+/// Shows type, shape unless it is `Single`, and contents to people, texts in quotes and all else in
+/// its text form.
+///
+///     String "Emma"
+///     OptionalSingle of Integer, absent
+///     Sequence of Integer {3, 5}
+///
+/// Long collections are cut. Resolves and loads nothing, and may change with versions. What the
+/// serializer of a client's type raises passes.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, Value const& value);
 
 template <support::Payload T>
 Value::Value(meta::Type const& type, T const& payload) : Value(ValueMeta(started(type)), nullptr)
@@ -244,9 +254,7 @@ requires support::Payload<T> || support::CollectionReference<T>
 void Value::checkCompatible() const
 {
     if constexpr (support::ElementReference<T>)
-        checkElement(T::metaClass(), [](ModelElement const& element) {
-            return T::cast(element).getElementImpl() != nullptr;
-        });
+        checkElement(T::metaClass());
     else
         support::ValueAccess<T>::check(*this);
 }

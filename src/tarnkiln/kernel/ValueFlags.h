@@ -1,6 +1,9 @@
 /// \file
 /// The shapes of values.
 #pragma once
+#include "tarnkiln/Export.h"
+
+#include <iosfwd>
 
 namespace tarn::kiln {
 
@@ -24,4 +27,7 @@ enum class ValueFlags : unsigned int
     Map = 5,      ///< One entry under a key.
     Multimap = 7  ///< Any number of entries under a key.
 };
+
+/// Shows the name of a shape; the number of one that has none.
+TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ValueFlags flags);
 }  // namespace tarn::kiln
