@@ -203,6 +203,19 @@ TEST_F(KeyedReference, AdmitsOneKeySeveralTimesWhereThatIsSaid)
     EXPECT_EQ(group->getGrouped().size(), 2u);
 }
 
+TEST_F(ReferenceProperty, IsNotMadeToTellThatItHasNoMembers)
+{
+    Node const parent = Node::create(m_model);
+    Node const child = Node::create(m_model);
+    meta::Property const children = property(Node::metaClass(), u"children");
+
+    EXPECT_FALSE(parent->hasPropertyValue(children, ModelElement::Impl::PUBLIC_ACCESS));
+    EXPECT_FALSE(parent->hasChildren()) << "no collection yet";
+
+    child->setParent(parent);
+    EXPECT_TRUE(parent->hasPropertyValue(children, ModelElement::Impl::PUBLIC_ACCESS));
+}
+
 TEST_F(KeyedReference, RefusesAnOwnerThatHasTheKeyAlready)
 {
     Node const scope = node(u"scope");

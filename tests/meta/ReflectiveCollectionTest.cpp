@@ -5,6 +5,7 @@
 #include "tarnkiln/collections/ReflectiveUnorderedElementSet.h"
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 #include "tests/meta/ReflectiveFixture.h"
+#include "tests/support/InvalidationLog.h"
 
 #include <typeinfo>
 
@@ -75,6 +76,27 @@ TEST_F(ReflectiveCollection, HasAValueOnceItHasEntries)
     genericOf(made, ordered).genericAdd(made);
 
     EXPECT_TRUE(has(made, ordered));
+}
+
+TEST_F(ReflectiveCollection, IsNotMadeToTellThatItHasNoEntries)
+{
+    meta::Property const asked = members(u"asked").ordered();
+    meta::Property const read = members(u"read");
+    ModelElement const made = make(a);
+    InvalidationLog const log;
+
+    EXPECT_FALSE(has(made, asked));
+    EXPECT_FALSE(has(made, read));
+    AbstractOwnedCollection* const collection = &referencesOf(made, read);
+    made->destroy();
+
+    std::vector<AbstractOwnedCollection*> ended;
+    for (auto const& [element, dying] : log.calls())
+    {
+        if (dying)
+            ended.push_back(dying);
+    }
+    EXPECT_THAT(ended, ElementsAre(collection));
 }
 
 TEST_F(ReflectiveCollection, RefusesAnUnrelatedClassAndAcceptsASubclass)

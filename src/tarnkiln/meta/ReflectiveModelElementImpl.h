@@ -154,6 +154,8 @@ private:
     ModelElement::Impl* target(ReflectiveSlot const& slot, ReflectionPrivateTag const& tag) const;
     /// Whether the reference is to `element`, be it by a proxy.
     bool refersTo(ReflectiveSlot const& slot, ModelElement const& element) const;
+    /// Whether there is a collection, or a data source that might fill one. Makes none.
+    bool mayHaveMembers(ReflectiveSlot const& slot) const;
     /// Made at the first call, and never null, unless plain values of that type have none.
     AbstractOwnedCollection* made(ReflectiveSlot const& slot) const;
     /// The same, filled by the data source.

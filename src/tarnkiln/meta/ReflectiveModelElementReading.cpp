@@ -14,6 +14,7 @@
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
+#include "tarnkiln/support/Field.h"
 
 namespace tarn::kiln {
 
@@ -39,7 +40,7 @@ bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property
     case SlotKind::Reference:
         return basicTarget(*slot) && basicTarget(*slot)->isLive();
     case SlotKind::References:
-        return shown(*slot, tag).getGenericInterface()->genericSize() > 0;
+        return mayHaveMembers(*slot) && shown(*slot, tag).getGenericInterface()->genericSize() > 0;
     case SlotKind::Values: {
         auto const* const values =
             static_cast<AbstractPrimitiveCollection*>(m_cells->getCollection(*slot));
@@ -183,6 +184,11 @@ AbstractOwnedCollection* ReflectiveModelElementImpl::made(ReflectiveSlot const& 
         return present;
     auto* const self = const_cast<ReflectiveModelElementImpl*>(this);
     return m_cells->publish(slot, slot.makeCollection(self));
+}
+
+bool ReflectiveModelElementImpl::mayHaveMembers(ReflectiveSlot const& slot) const
+{
+    return m_cells->getCollection(slot) || support::hasDataSource(*this);
 }
 
 ReferenceCollection& ReflectiveModelElementImpl::loaded(ReflectiveSlot const& slot) const

@@ -34,9 +34,8 @@ void refuseSecondValue(ModelElement::Impl const& element, T const& present,
 }
 
 /// The same for a reference; the target that it has may be given again.
-inline void refuseSecondTarget(ModelElement::Impl const& element,
-                               ModelElement::Impl const* present, ModelElement::Impl const* target,
-                               ustring const& propertyName)
+inline void refuseSecondTarget(ModelElement::Impl const& element, ModelElement::Impl const* present,
+                               ModelElement::Impl const* target, ustring const& propertyName)
 {
     refuseProxy(element);
     bool const isSet = present && present != target && present->isLive();
@@ -171,6 +170,13 @@ template <class Target>
 void setContainer(ModelElement::Impl& element, Slot const& slot, Target* container)
 {
     setContainer(element, slot, container, [] {});
+}
+
+/// Whether a collection of `element` that was not made yet might be filled when it is.
+inline bool hasDataSource(ModelElement::Impl const& element)
+{
+    Model::Impl* const model = element.getModelImpl();
+    return model && model->getDataSource();
 }
 
 /// The collection in `field`, which `make(owner)` makes on its first use and the data source fills.

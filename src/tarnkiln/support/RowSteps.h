@@ -440,7 +440,8 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
     }
     static bool has(Owner const& element)
     {
-        return made(element).getGenericInterface()->genericSize() > 0;
+        bool const mayHaveMembers = (element.*FIELD).get() || hasDataSource(element);
+        return mayHaveMembers && made(element).getGenericInterface()->genericSize() > 0;
     }
     static Value get(Owner const& element, meta::Property const& property,
                      internal::ReflectionPrivateTag const& tag)
