@@ -74,7 +74,7 @@ inline std::vector<ModelElement> contentsOf(ReferenceCollection const& collectio
     return result;
 }
 template <class C>
-    requires std::is_base_of_v<AbstractPrimitiveCollection, C>
+requires std::is_base_of_v<AbstractPrimitiveCollection, C>
 auto contentsOf(C const& collection)
 {
     return std::vector<typename C::value_type>(collection.begin(), collection.end());

@@ -138,6 +138,20 @@ TYPED_TEST_P(SequenceOfElements, LosesTheEntryAtAPosition)
     this->expectSound();
 }
 
+TYPED_TEST_P(SequenceOfElements, IgnoresChangesAtPositionsOnceItsElementIsDestroyed)
+{
+    this->owner->destroy();
+    auto const before = this->contents();
+
+    this->sequence.genericInsert(this->third, 0);
+    this->sequence.genericEnsureAt(this->third, 0);
+    this->sequence.genericReplace(this->third, 0);
+    this->sequence.genericRemoveAt(0);
+
+    EXPECT_EQ(this->contents(), before);
+    EXPECT_TRUE(this->third->isTopLevel());
+}
+
 TYPED_TEST_P(SequenceOfElements, GetsItsOrderBackByARollback)
 {
     Transaction const transaction = this->model->beginTransaction(/*revertible=*/true);
@@ -159,5 +173,6 @@ REGISTER_TYPED_TEST_SUITE_P(SequenceOfElements, IsSeenAsASequence,
                             MovesAnElementToThePositionWhereItIsToBe,
                             PutsAnElementInThePlaceOfAnother,
                             RefusesAReplacementThatIsNoneOrInHereAlready, LosesTheEntryAtAPosition,
+                            IgnoresChangesAtPositionsOnceItsElementIsDestroyed,
                             GetsItsOrderBackByARollback);
 }  // namespace testkit

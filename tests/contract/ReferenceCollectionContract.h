@@ -347,6 +347,36 @@ TYPED_TEST_P(CollectionOfElements, GetsAProxyBackByARollback)
     this->expectSound();
 }
 
+TYPED_TEST_P(CollectionOfElements, GetsAProxyBackWithItsOwnElementByARollback)
+{
+    auto const proxy = this->danglingEntry();
+    this->add(proxy);
+    auto const before = this->contents();
+    Transaction const transaction = this->model->beginTransaction(/*revertible=*/true);
+
+    this->owner->destroy();
+    EXPECT_EQ(static_cast<bool>(proxy), !this->collection.isComposite());
+    EXPECT_EQ(transaction.rollBack(), TransactionResult::RolledBack);
+
+    EXPECT_TRUE(proxy);
+    EXPECT_TRUE(proxy->isProxy());
+    EXPECT_EQ(this->contents(), before);
+    this->expectSound();
+}
+
+TYPED_TEST_P(CollectionOfElements, IgnoresProxiesOnceItsElementIsDestroyed)
+{
+    this->owner->destroy();
+    auto const before = this->contents();
+
+    this->add(this->danglingEntry());
+    this->remove(this->danglingEntry());
+    this->collection.destroyAllContents();
+
+    EXPECT_EQ(this->contents(), before);
+    EXPECT_EQ(static_cast<bool>(this->first), !this->collection.isComposite());
+}
+
 TYPED_TEST_P(CollectionOfElements, PutsAnElementInThePlaceOfItsProxy)
 {
     auto const proxy =
@@ -394,6 +424,7 @@ REGISTER_TYPED_TEST_SUITE_P(
     TakesAnElementOfAnotherOwnerAndGivesItBackByARollback,
     EmptiedWithoutUpkeepIsAsItWasAfterARollback, MayHoldItsOwnerUnlessItContains,
     KeepsAProxyThatCanNotBeResolvedUntilItIsTakenOut, LosesAProxyThatWasAddedByARollback,
-    GetsAProxyBackByARollback, PutsAnElementInThePlaceOfItsProxy,
+    GetsAProxyBackByARollback, GetsAProxyBackWithItsOwnElementByARollback,
+    IgnoresProxiesOnceItsElementIsDestroyed, PutsAnElementInThePlaceOfItsProxy,
     RefusesAProxyIntoAnotherModelIfItContains);
 }  // namespace testkit

@@ -182,6 +182,42 @@ TEST_F(TransactionRollback, IgnoresWhatWasWrittenToADeadElement)
     EXPECT_THAT(membersOf(node->getLinks()), IsEmpty());
 }
 
+TEST_F(TransactionRollback, BringsBackStandInsThatDiedWithTheirContainer)
+{
+    Node const container = make(u"container");
+    Node const child = Node::createProxy(model, ProxyId(ElementId::UUID_TYPE, u"child"));
+    Node const core = Node::createProxy(model, ProxyId(ElementId::UUID_TYPE, u"core"));
+    container->getChildren().push_back(child);
+    container->setCore(core);
+
+    Transaction const transaction = begin();
+    container->destroy();
+    EXPECT_FALSE(child);
+    EXPECT_FALSE(core);
+    rollBack(transaction);
+
+    EXPECT_TRUE(child);
+    EXPECT_TRUE(core);
+    EXPECT_TRUE(child->isProxy());
+    EXPECT_THAT(container->getChildren().getAllValuesAndProxies(), ElementsAre(child));
+    EXPECT_EQ(container->getCoreImpl(), core.getImpl());
+}
+
+TEST_F(TransactionRollback, BringsBackAStandInThatWasDestroyedAlone)
+{
+    Node const node = make(u"a");
+    Node const proxy = Node::createProxy(model, ProxyId(ElementId::UUID_TYPE, u"child"));
+    node->setBuddy(proxy);
+
+    Transaction const transaction = begin();
+    proxy->destroy();
+    node->setName(u"b");
+    rollBack(transaction);
+
+    EXPECT_TRUE(proxy);
+    EXPECT_EQ(node->getBuddyImpl(), proxy.getImpl());
+}
+
 // ---------------------------------------------------------------------------- containers
 
 TEST_F(TransactionRollback, RestoresTheContainerOfAnElementThatMoved)

@@ -1,5 +1,7 @@
 #include "tests/stress/NodeMirror.h"
 
+#include <boost/uuid/uuid_io.hpp>
+
 #include <algorithm>
 
 namespace testkit {
@@ -35,6 +37,8 @@ std::vector<std::string> NodeMirror::picture() const
     {
         std::string line = "n" + std::to_string(node);
         auto const tag = [&](int target) {
+            if (target >= PROXY_OF_NODE)
+                return "proxy " + boost::uuids::to_string(uuidOfNode(target - PROXY_OF_NODE));
             if (target >= PROXY)
                 return "proxy p" + std::to_string(target - PROXY);
             return (isAlive(target) ? "n" : "dead n") + std::to_string(target);
@@ -102,7 +106,7 @@ bool NodeMirror::isInside(int node, int outer) const
 bool NodeMirror::isKeyTaken(int scope, std::string const& key) const
 {
     return std::any_of(at(scope).byName.begin(), at(scope).byName.end(),
-                       [&](int member) { return at(member).name == key; });
+                       [&](int member) { return member < PROXY && at(member).name == key; });
 }
 
 bool NodeMirror::isAt(int node, int container, Place place) const
@@ -138,6 +142,14 @@ void NodeMirror::leave(int node)
     }
     at(node).container = NONE;
     at(node).place = TOP;
+}
+
+/// Empties a single content, a node or a proxy or none.
+void NodeMirror::release(int owner, int content, int State::*slot)
+{
+    if (content != NONE && content < PROXY)
+        leave(content);
+    at(owner).*slot = NONE;
 }
 
 void NodeMirror::enter(int node, int container, Place place)
@@ -189,8 +201,7 @@ NodeMirror::Failure NodeMirror::setCore(int owner, int node)
         return Failure::None;
     if (node != NONE && isInside(owner, node))
         return Failure::Circular;
-    if (old != NONE)
-        leave(old);
+    release(owner, old, &State::core);
     if (node != NONE)
     {
         enter(node, owner, CORE);
@@ -206,8 +217,7 @@ NodeMirror::Failure NodeMirror::setBody(int host, int node)
         return Failure::None;
     if (node != NONE && isInside(host, node))
         return Failure::Circular;
-    if (old != NONE)
-        leave(old);
+    release(host, old, &State::body);
     if (node != NONE)
     {
         enter(node, host, BODY);
@@ -372,19 +382,93 @@ void NodeMirror::eraseMark(int node, int target)
     at(target).markedBy.erase(node);
 }
 
+void NodeMirror::readBuddy(int node)
+{
+    int const target = at(node).buddy - PROXY_OF_NODE;
+    if (isAlive(target))
+        at(node).buddy = target;
+}
+
+// ---------------------------------------------------------------------------- contained proxies
+
+void NodeMirror::addContentProxy(int node, Place place, int proxy)
+{
+    State& state = at(node);
+    switch (place)
+    {
+    case CHILDREN:
+        state.children.push_back(proxy);
+        break;
+    case PARTS:
+        state.parts.push_back(proxy);
+        break;
+    case CORE:
+        release(node, state.core, &State::core);
+        state.core = proxy;
+        break;
+    case BODY:
+        release(node, state.body, &State::body);
+        state.body = proxy;
+        break;
+    case BY_NAME:
+        state.byName.insert(proxy);
+        break;
+    case TOP:
+        break;
+    }
+}
+
+int NodeMirror::removeContentProxy(int node, Place place)
+{
+    auto const removeFirst = [](auto& contents) {
+        auto const found = std::find_if(contents.begin(), contents.end(),
+                                        [](int content) { return content >= PROXY; });
+        if (found == contents.end())
+            return NONE;
+        int const proxy = *found;
+        contents.erase(found);
+        return proxy;
+    };
+    State& state = at(node);
+    return place == CHILDREN ? removeFirst(state.children)
+           : place == PARTS  ? removeFirst(state.parts)
+                             : removeFirst(state.byName);
+}
+
+std::vector<int> NodeMirror::contentProxies() const
+{
+    std::vector<int> result;
+    auto const add = [&result](int content) {
+        if (content >= PROXY)
+            result.push_back(content);
+    };
+    for (auto const& [node, state] : m_nodes)
+    {
+        std::for_each(state.children.begin(), state.children.end(), add);
+        std::for_each(state.parts.begin(), state.parts.end(), add);
+        std::for_each(state.byName.begin(), state.byName.end(), add);
+        add(state.core);
+        add(state.body);
+    }
+    return result;
+}
+
 // ---------------------------------------------------------------------------- destruction
 
 void NodeMirror::forget(int node)
 {
     State const state = at(node);
+    auto const forgetNode = [this](int content) {
+        if (content != NONE && content < PROXY)
+            forget(content);
+    };
     for (std::vector<int> const& contained : {state.children, state.parts})
         for (int const each : contained)
-            forget(each);
+            forgetNode(each);
     for (int const each : state.byName)
-        forget(each);
+        forgetNode(each);
     for (int const each : {state.core, state.body})
-        if (each != NONE)
-            forget(each);
+        forgetNode(each);
     setLeft(node, NONE);
     setRight(node, NONE);
     setOwner(node, NONE);

@@ -1,6 +1,8 @@
 /// \file
 /// What operations on nodes ought to do, on plain numbers.
 #pragma once
+#include "tests/support/Uuids.h"
+
 #include <cstddef>
 #include <map>
 #include <set>
@@ -18,8 +20,11 @@ class NodeMirror
 public:
     static constexpr int NONE = -1;
     /// From here on numbers stand for proxies of targets that are nowhere. They are no nodes, only
-    /// targets of `buddy`, `links`, `grouped` and `marks`.
+    /// targets of `buddy`, `links`, `grouped` and `marks`, and contents.
     static constexpr int PROXY = 1000;
+    /// A number from here on stands for a proxy of the node whose number is the rest. It is a
+    /// target of `buddy` only.
+    static constexpr int PROXY_OF_NODE = 1'000'000;
 
     enum class Failure
     {
@@ -50,6 +55,11 @@ public:
         std::vector<int> owned, links, backlinks, children, parts, numbers;
         std::set<int> byName, grouped, marks, markedBy;
     };
+
+    static tarn::kiln::UUID uuidOfNode(int node)
+    {
+        return uuidOf(static_cast<std::uint32_t>(node) + 1);
+    }
 
     /// The live nodes, by number.
     std::map<int, State> const& nodes() const { return m_nodes; }
@@ -83,6 +93,14 @@ public:
     void eraseGroupedProxy(int node, int proxy) { at(node).grouped.erase(proxy); }
     void addMarkOfProxy(int node, int proxy) { at(node).marks.insert(proxy); }
     void eraseMarkOfProxy(int node, int proxy) { at(node).marks.erase(proxy); }
+    /// A read of `buddy` puts a live node in the place of its proxy.
+    void readBuddy(int node);
+
+    void addContentProxy(int node, Place place, int proxy);
+    /// Takes out the first proxy in `children`, `parts` or `byName`; `NONE` if there is none.
+    int removeContentProxy(int node, Place place);
+    /// Of all contents.
+    std::vector<int> contentProxies() const;
 
     Failure addChild(int parent, int node);
     Failure setParent(int node, int parent);
@@ -101,6 +119,7 @@ private:
     bool isKeyTaken(int scope, std::string const& key) const;
     bool isAt(int node, int container, Place place) const;
     void leave(int node);
+    void release(int owner, int content, int State::*slot);
     void enter(int node, int container, Place place);
     void forget(int node);
 

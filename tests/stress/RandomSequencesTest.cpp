@@ -8,6 +8,7 @@
 
 #include <rapidcheck.h>
 
+#include <set>
 #include <tuple>
 
 namespace {
@@ -52,6 +53,8 @@ public:
         noticeEnd();
         RC_ASSERT(model->checkInvariants() == std::vector<std::string>());
         RC_ASSERT(pictureOf(model) == mirror.picture());
+        for (int const proxy : mirror.contentProxies())
+            RC_ASSERT(static_cast<bool>(contentProxy(proxy)));
     }
     void endAll()
     {
@@ -60,7 +63,7 @@ public:
         RC_ASSERT(pictureOf(model) == mirror.picture());
     }
 
-    static constexpr int KINDS = 43;
+    static constexpr int KINDS = 54;
 
 private:
     enum TransactionStep
@@ -105,6 +108,7 @@ private:
             if (open.empty())
             {
                 before = mirror;
+                changedBuddies.clear();
                 doomed = false;
             }
             if (open.size() < 4)
@@ -157,7 +161,7 @@ private:
             int const created = static_cast<int>(nodes.size());
             // created with its tag, in one transaction
             Transaction const transaction = model->beginTransaction(/*revertible=*/false);
-            Node const made = Node::create(model);
+            Node const made = Node::create(model, NodeMirror::uuidOfNode(created));
             nodes.push_back(made);
             made->setTag("n" + std::to_string(created));
             transaction.commit();
@@ -186,6 +190,7 @@ private:
         case 6:
             x->setBuddy(y);
             mirror.setBuddy(a, b);
+            changedBuddies.insert(a);
             break;
         case 7:
             x->setLeft(y);
@@ -223,7 +228,9 @@ private:
             mirror.destroy(a);
             break;
         default:
-            if (kind > LAST_PAIR_STEP)
+            if (kind > LAST_PROXY_STEP)
+                takeContentProxyStep(kind, a, x);
+            else if (kind > LAST_PAIR_STEP)
                 takeProxyStep(kind, a, number % PROXIES, x);
             else if (two)
                 takePairStep(kind, a, b, x, y);
@@ -280,6 +287,15 @@ private:
         case 30:
             expect(mirror.addByName(a, b), [&] { x->getByName().insert(y); });
             break;
+        case 31:
+        case 32:
+            x->setBuddy(Node::createProxy(model, y->getPersistentProxyId(/*omitModel=*/true)));
+            mirror.setBuddy(a, NodeMirror::PROXY_OF_NODE + b);
+            changedBuddies.insert(a);
+            break;
+        case LAST_PAIR_STEP:
+            readBuddy(a, x);
+            break;
         default:
             break;
         }
@@ -293,6 +309,7 @@ private:
         case LAST_PAIR_STEP + 1:
             x->setBuddy(proxy);
             mirror.setBuddy(a, p);
+            changedBuddies.insert(a);
             break;
         case LAST_PAIR_STEP + 2:
             x->getLinks().push_back(proxy);
@@ -320,6 +337,65 @@ private:
             break;
         }
     }
+    /// What a proxy turns into when it is read is no change, and stays after a rollback unless the
+    /// property has changed too.
+    void readBuddy(int a, Node const& x)
+    {
+        int const proxy = mirror.nodes().at(a).buddy;
+        static_cast<void>(x->getBuddy());
+        mirror.readBuddy(a);
+        auto const old = before.nodes().find(a);
+        if (!open.empty() && changedBuddies.count(a) == 0 && old != before.nodes().end() &&
+            old->second.buddy == proxy)
+            before.setBuddy(a, mirror.nodes().at(a).buddy);
+    }
+    void takeContentProxyStep(int kind, int a, Node const& x)
+    {
+        using Place = NodeMirror::Place;
+        switch (kind)
+        {
+        case LAST_PROXY_STEP + 1:
+            x->getChildren().push_back(addContentProxy(a, Place::CHILDREN));
+            break;
+        case LAST_PROXY_STEP + 2:
+            x->getParts().push_back(addContentProxy(a, Place::PARTS));
+            break;
+        case LAST_PROXY_STEP + 3:
+            x->getByName().insert(addContentProxy(a, Place::BY_NAME));
+            break;
+        case LAST_PROXY_STEP + 4:
+            x->setCore(addContentProxy(a, Place::CORE));
+            break;
+        case LAST_PROXY_STEP + 5:
+            x->setBody(addContentProxy(a, Place::BODY));
+            break;
+        case LAST_PROXY_STEP + 6:
+            x->getChildren().remove(contentProxy(mirror.removeContentProxy(a, Place::CHILDREN)));
+            break;
+        case LAST_PROXY_STEP + 7:
+            x->getParts().remove(contentProxy(mirror.removeContentProxy(a, Place::PARTS)));
+            break;
+        default:
+            x->getByName().erase(contentProxy(mirror.removeContentProxy(a, Place::BY_NAME)));
+            break;
+        }
+    }
+    /// A new one, which the mirror puts in its place at once.
+    Node addContentProxy(int a, NodeMirror::Place place)
+    {
+        int const number = PROXIES + static_cast<int>(contentProxies.size());
+        string const name = "p" + std::to_string(number);
+        contentProxies.push_back(Node::createProxy(
+            model, ProxyId(ElementId::UUID_TYPE, ustring(name.begin(), name.end()))));
+        mirror.addContentProxy(a, place, NodeMirror::PROXY + number);
+        return contentProxies.back();
+    }
+    Node contentProxy(int number) const
+    {
+        return number == NodeMirror::NONE ? Node()
+                                          : contentProxies.at(static_cast<std::size_t>(
+                                                number - NodeMirror::PROXY - PROXIES));
+    }
     static void expect(Failure failure, std::function<void()> const& call)
     {
         switch (failure)
@@ -342,10 +418,13 @@ private:
     ScriptedListener listener;
     NodeMirror mirror;
     NodeMirror before;
-    static constexpr int LAST_PAIR_STEP = 30;
+    static constexpr int LAST_PAIR_STEP = 33;
+    static constexpr int LAST_PROXY_STEP = LAST_PAIR_STEP + 7;
     static constexpr int PROXIES = 3;
     std::vector<Node> proxies;
-    std::vector<Node> nodes;  ///< All that were ever created, by number.
+    std::vector<Node> contentProxies;  ///< Each in one place only; live as long as that has it.
+    std::set<int> changedBuddies;      ///< Nodes whose `buddy` has changed in the transaction.
+    std::vector<Node> nodes;           ///< All that were ever created, by number.
     std::vector<Transaction> open;
     bool doomed = false;
 };

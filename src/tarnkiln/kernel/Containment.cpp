@@ -268,6 +268,9 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
         recordEndingExtensions();
         level.finish();
     }
+    else if (m_model && m_model->isRecording()) {
+        m_model->m_currentTransaction->proxyDestroying(this);
+    }
     invalidate();
 }
 } // namespace tarn::kiln

@@ -189,6 +189,10 @@ void Model::Impl::remove(ModelElement::Impl* element)
 
 void Model::Impl::resurrectElement(ModelElement::Impl* element)
 {
+    if (element->isProxy()) {
+        element->m_validity = ElementValidity::BuilderProxy;
+        return;
+    }
     if (m_elements.contains(element))
         return; // its destruction failed before it began
     element->m_validity = ElementValidity::Valid;

@@ -199,6 +199,12 @@ bool TransactionImpl::isSettled(ModelElement::Impl::Changes const& record) const
     return record.isCreated() || (!has(DEEP) && record.isDestroyed());
 }
 
+void TransactionImpl::proxyDestroying(ModelElement::Impl* proxy)
+{
+    if (has(DEEP) && !has(ROLLED_BACK))
+        m_destroyedProxies.emplace_back(proxy);
+}
+
 void TransactionImpl::containerChanging(ModelElement::Impl* element)
 {
     if (!has(DEEP) || !startRecording())
@@ -496,6 +502,8 @@ void TransactionImpl::unpinElements()
 
 TransactionResult TransactionImpl::undo()
 {
+    for (ModelElement const& proxy : m_destroyedProxies)
+        m_model->resurrectElement(proxy.getImpl());
     if (!has(HAS_CHANGES))
         return TransactionResult::NotCompleted;
     if (!has(DEEP))

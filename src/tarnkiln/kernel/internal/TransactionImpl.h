@@ -46,6 +46,9 @@ public:
     virtual void allElementsDestroying();
     virtual void elementModifying(ModelElement::Impl* element, unsigned long index);
     virtual void elementModifying(ModelElement::Impl* element, meta::Extension const& extension);
+    /// Keeps a stand-in, of which nothing else is recorded, in a deep transaction: it may have to come
+    /// back into a container that does.
+    void proxyDestroying(ModelElement::Impl* proxy);
     /// Keeps the present link to the container, in a deep transaction.
     void containerChanging(ModelElement::Impl* element);
     /// Takes back what `elementCreated` recorded, when the creation has failed after all.
@@ -141,6 +144,7 @@ private:
     bool m_inFirstChangeCallback = false;
     std::shared_ptr<ChangeRecords> m_changes; ///< Those of destroyed elements keep them, until the
                                               ///< transaction is gone.
+    std::vector<ModelElement> m_destroyedProxies;
     std::vector<ListenerHolderBase*> m_listeners; ///< As at the beginning; null once removed.
     std::shared_ptr<ReportData::DeferredInvocations> m_deferredInvocations;
     std::shared_ptr<ReportData> m_rollBackReport;
