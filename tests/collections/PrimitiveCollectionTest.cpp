@@ -153,5 +153,26 @@ TEST_F(PrimitiveCollections, AnnotationsAnnounceTheirChanges)
     EXPECT_EQ(counter.commits, 6);
     EXPECT_EQ(map.getCollectionType(), meta::StandardTypes::stringMeta);
 }
+
+TEST_F(PrimitiveCollections, AnnotationsOfADestroyedElementStayAsTheyAre)
+{
+    StringToStringMap map(owner.getImpl(), Node::Impl::NOTE);
+    StringToStringMap more(nullptr, Feature());
+    map.insert(u"key", u"a", StringToStringMap::Fail);
+    more.insert(u"other", u"b", StringToStringMap::Fail);
+    owner->destroy();
+    int const commits = counter.commits;
+
+    map.insert(u"other", u"b", StringToStringMap::Fail);
+    map.merge(more);
+    EXPECT_EQ(map.erase(map.begin()), map.begin());
+    map.erase(map.begin(), map.end());
+    EXPECT_EQ(map.erase(u"key"), 0u);
+    map.clear();
+
+    ASSERT_EQ(map.size(), 1u);
+    EXPECT_EQ(map.begin()->second, u"a");
+    EXPECT_EQ(counter.commits, commits);
+}
 }  // namespace
 }  // namespace testkit

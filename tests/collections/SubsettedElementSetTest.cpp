@@ -44,6 +44,32 @@ TEST_F(Subset, CanBeReadWithoutItsElementClass)
     EXPECT_EQ(generic.genericIndexOf({}), -1);
 }
 
+TEST_F(Subset, HoldsNothingThatARollbackCouldTake)
+{
+    owner->getLinks().push_back(first);
+    SubsettedElementSet<SpecialNode> other(plain->getLinks(), Node::Impl::LINKS);
+
+    subset.basicSwapContents(other);
+    EXPECT_EQ(subset.size(), 1u);
+    subset.basicDropContents();
+    EXPECT_EQ(subset.size(), 1u);
+    EXPECT_EQ(other.size(), 0u);
+}
+
+TEST_F(Subset, RefusesChangesWithoutUpkeepToo)
+{
+    using messages::CannotAddIncompatibleObjectSubset;
+    Opened<SubsettedElementSet<SpecialNode>> opened(owner->getLinks(), Node::Impl::LINKS);
+    owner->getLinks().push_back(first);
+
+    EXPECT_RAISES(CannotAddIncompatibleObjectSubset, opened.basicRemove(first));
+    EXPECT_RAISES(CannotAddIncompatibleObjectSubset, opened.basicClear());
+    EXPECT_RAISES(CannotAddIncompatibleObjectSubset, opened.basicCopyValues(subset));
+    EXPECT_FALSE(opened.basicContainsProxyTo(first));
+
+    EXPECT_EQ(opened.size(), 1u);
+}
+
 TEST_F(Subset, RefusesAllChanges)
 {
     using messages::CannotAddIncompatibleObjectSubset;
