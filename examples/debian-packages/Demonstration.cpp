@@ -5,6 +5,7 @@
 #include "ChangeReport.h"
 #include "ElementText.h"
 #include "EssentialGuard.h"
+#include "Interview.h"
 #include "ModelSnapshot.h"
 #include "PackageGraph.h"
 #include "ProgressBar.h"
@@ -59,10 +60,22 @@ template <ElementForm Form> bool Demonstration<Form>::run(CommandLine const& com
 {
     PackageIndex<Form>::metaClass();  // the metamodel is no part of what is measured
     m_model = Model::create(ModelConstellation());
-    m_index = load(m_model, commandLine.file, "").index;
+    auto const loaded = load(m_model, commandLine.file, "");
+    m_index = loaded.index;
     if (commandLine.available)
         resolve(*commandLine.available);
 
+    bool const asksItself = commandLine.questions.empty();
+    bool equal = !asksItself || changeAndTakeBack();
+    Interview<Form> interview(m_output, m_figures, m_index, MissingNames(loaded.missing),
+                              commandLine.maxRows);
+    for (Question const& question : asksItself ? interview.usualQuestions() : commandLine.questions)
+        equal = interview.ask(question) && equal;
+    return equal;
+}
+
+template <ElementForm Form> bool Demonstration<Form>::changeAndTakeBack()
+{
     EssentialGuard<Form> guard(m_index);
     ChangeRecorder recorder;
     m_model->addListener(&guard);

@@ -15,7 +15,8 @@ class ChangeRecorder;
 template <ElementForm Form> class EssentialGuard;
 class ModelSnapshot;
 
-/// Loads, has a removal refused, removes and takes the removal back, and says so.
+/// Loads, has a removal refused, removes and takes the removal back, asks questions, and says so.
+/// With questions of the user's own, it asks these and changes nothing.
 template <ElementForm Form> class Demonstration
 {
 public:
@@ -24,6 +25,7 @@ public:
     Demonstration(std::ostream& output, std::ostream& progress, bool progressIsTerminal);
 
     /// \throws ReadError  as `Loader::load`.
+    /// \throws std::runtime_error  as `Interview::ask`.
     /// \returns whether each state that had to equal an earlier one did.
     bool run(CommandLine const& commandLine);
     /// What `run` measured.
@@ -33,6 +35,7 @@ private:
     LoadResult<Form> load(tarn::kiln::Model const& model, std::string const& file,
                           std::string const& prefix);
     void resolve(std::string const& file);
+    bool changeAndTakeBack();
     bool removeNeeded(EssentialGuard<Form> const& guard);
     bool removeLeaf(ChangeRecorder const& recorder);
     bool checkEqual(ModelSnapshot const& before, std::string const& occasion);

@@ -28,6 +28,8 @@ VersionRelation relationOf(ustring const& text)
     throw std::invalid_argument("no relation of versions: " + to_string(text));
 }
 
+}  // namespace
+
 template <ElementForm Form>
 bool fits(Release<Form> const& release, Alternative<Form> const& alternative)
 {
@@ -37,8 +39,6 @@ bool fits(Release<Form> const& release, Alternative<Form> const& alternative)
     Version const bound(to_string(alternative->getBound()));
     return version.satisfies(relationOf(alternative->getRelation()), bound);
 }
-
-}  // namespace
 
 template <ElementForm Form>
 std::vector<DependencyGroup<Form>> strictGroupsOf(Release<Form> const& release)
@@ -70,6 +70,7 @@ std::vector<Release<Form>> satisfiersOf(DependencyGroup<Form> const& group)
 }
 
 #define DEBIAN_INSTANTIATE(Form)                                                                   \
+    template bool fits<Form>(Release<Form> const&, Alternative<Form> const&);                      \
     template std::vector<DependencyGroup<Form>> strictGroupsOf<Form>(Release<Form> const&);        \
     template std::vector<Release<Form>> satisfiersOf<Form>(DependencyGroup<Form> const&);
 DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)

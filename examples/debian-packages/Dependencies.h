@@ -18,6 +18,10 @@ template <ElementForm Form> bool isSuggestion(DependencyGroup<Form> const& group
     return group->getKind() == u"Suggests";
 }
 
+/// Whether the version of `release` is one that `alternative` asks for.
+template <ElementForm Form>
+bool fits(Release<Form> const& release, Alternative<Form> const& alternative);
+
 /// The live target of `alternative` in its own model; empty if that is a proxy, destroyed, or in
 /// another model. Resolves nothing.
 template <ElementForm Form> Package<Form> installedTarget(Alternative<Form> const& alternative)

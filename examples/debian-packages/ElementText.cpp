@@ -1,6 +1,7 @@
 #include "ElementText.h"
 
 #include "Dependencies.h"
+#include "MissingNames.h"
 #include "OldValues.h"
 #include "tarnkiln/meta/ClassImpl.h"
 
@@ -50,11 +51,13 @@ std::vector<Alternative<Form>> alternativesOf(DependencyGroup<Form> const& group
 
 }  // namespace
 
-template <ElementForm Form> std::string textOf(Package<Form> const& package, Before /*before*/)
+template <ElementForm Form>
+std::string textOf(Package<Form> const& package, Before /*before*/, Missing missing)
 {
-    if (package->isProxy())
-        return "a package that is not in the file";
-    return to_string(package->getName());
+    if (!package->isProxy())
+        return to_string(package->getName());
+    ModelElement const& proxy = package;
+    return missing ? missing->nameOf(*proxy->getProxyId()) : "a package that is not in the file";
 }
 
 template <ElementForm Form> std::string textOf(Release<Form> const& release, Before /*before*/)
@@ -64,23 +67,25 @@ template <ElementForm Form> std::string textOf(Release<Form> const& release, Bef
     return name + to_string(release->getLabel());
 }
 
-template <ElementForm Form> std::string textOf(Alternative<Form> const& alternative, Before before)
+template <ElementForm Form>
+std::string textOf(Alternative<Form> const& alternative, Before before, Missing missing)
 {
     auto const target = Package<Form>::cast(targetOf<Form>(alternative, before));
-    std::string const name = target.getImpl() ? textOf<Form>(target) : "nothing";
+    std::string const name = target.getImpl() ? textOf<Form>(target, before, missing) : "nothing";
     if (alternative->getRelation().empty())
         return name;
     return name + " (" + to_string(alternative->getRelation()) + ' ' +
            to_string(alternative->getBound()) + ')';
 }
 
-template <ElementForm Form> std::string textOf(DependencyGroup<Form> const& group, Before before)
+template <ElementForm Form>
+std::string textOf(DependencyGroup<Form> const& group, Before before, Missing missing)
 {
     std::string text = to_string(group->getKind()) + ':';
     char const* separator = " ";
     for (Alternative<Form> const& alternative : alternativesOf<Form>(group, before))
     {
-        text += separator + textOf<Form>(alternative, before);
+        text += separator + textOf<Form>(alternative, before, missing);
         separator = " | ";
     }
     return text;
@@ -93,10 +98,10 @@ template <ElementForm Form> std::string textOf(ModelElement const& element, Befo
 }
 
 #define DEBIAN_INSTANTIATE(Form)                                                                   \
-    template std::string textOf<Form>(Package<Form> const&, Before);                               \
+    template std::string textOf<Form>(Package<Form> const&, Before, Missing);                      \
     template std::string textOf<Form>(Release<Form> const&, Before);                               \
-    template std::string textOf<Form>(Alternative<Form> const&, Before);                           \
-    template std::string textOf<Form>(DependencyGroup<Form> const&, Before);                       \
+    template std::string textOf<Form>(Alternative<Form> const&, Before, Missing);                  \
+    template std::string textOf<Form>(DependencyGroup<Form> const&, Before, Missing);              \
     template std::string textOf<Form>(ModelElement const&, Before);
 DEBIAN_FOR_EACH_FORM(DEBIAN_INSTANTIATE)
 

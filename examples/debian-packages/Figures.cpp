@@ -9,6 +9,13 @@
 
 namespace debian {
 
+std::string inMilliseconds(std::chrono::duration<double> time)
+{
+    std::array<char, 32> text{};
+    std::snprintf(text.data(), text.size(), "%.3f ms", time.count() * 1000);
+    return text.data();
+}
+
 void Figures::addCount(std::string name, std::size_t count)
 {
     m_rows.emplace_back(std::move(name), std::to_string(count));
@@ -16,9 +23,7 @@ void Figures::addCount(std::string name, std::size_t count)
 
 void Figures::addTime(std::string name, std::chrono::duration<double> time)
 {
-    std::array<char, 32> text{};
-    std::snprintf(text.data(), text.size(), "%.3f ms", time.count() * 1000);
-    m_rows.emplace_back(std::move(name), text.data());
+    m_rows.emplace_back(std::move(name), inMilliseconds(time));
 }
 
 void Figures::print(std::ostream& output) const

@@ -21,6 +21,9 @@ private:
     Clock::time_point m_begin = Clock::now();
 };
 
+/// Such as "12.345 ms".
+std::string inMilliseconds(std::chrono::duration<double> time);
+
 /// Rows of a name and a measured value, printed in two columns.
 class Figures
 {

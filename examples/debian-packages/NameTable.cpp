@@ -1,12 +1,8 @@
 #include "NameTable.h"
 
 #include "AvailableModel.h"
-#include "reader/NameBasedUuid.h"
-#include "tarnkiln/kernel/ProxyId.h"
 
 #include "sill/i18n/StringConversion.h"
-
-#include <boost/uuid/uuid_io.hpp>
 
 #include <algorithm>
 
@@ -15,22 +11,13 @@ namespace debian {
 using namespace tarn::kiln;
 using sill::i18n::to_ustring;
 
-namespace {
-
-UUID uuidOf(std::string const& packageName)
-{
-    return nameBasedUuid("package", packageName, "", "");
-}
-
-}  // namespace
-
 template <ElementForm Form> Package<Form> NameTable<Form>::define(std::string const& name)
 {
     Entry& entry = m_entries[name];
     if (entry.package)
         return entry.package;
 
-    entry.package = Package<Form>::create(m_index->getModel(), uuidOf(name));
+    entry.package = Package<Form>::create(m_index->getModel(), uuidOfPackage(name));
     entry.package->setName(to_ustring(name));
     entry.package->setIndex(m_index);
     for (Alternative<Form> const& alternative : entry.waiting)
@@ -56,10 +43,8 @@ template <ElementForm Form> std::vector<std::string> NameTable<Form>::createProx
     {
         if (entry.package)
             continue;
-        ProxyId const id(ElementId::UUID_TYPE, to_ustring(boost::uuids::to_string(uuidOf(name))),
-                         ustring(AVAILABLE_URI));
-        auto const proxy = Package<Form>::cast(
-            ModelElement::createProxy(m_index->getModel(), Package<Form>::metaClass(), id));
+        auto const proxy = Package<Form>::cast(ModelElement::createProxy(
+            m_index->getModel(), Package<Form>::metaClass(), idOfAvailablePackage(name)));
         for (Alternative<Form> const& alternative : entry.waiting)
             alternative->setTarget(proxy);
         entry.waiting = {};

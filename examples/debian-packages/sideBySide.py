@@ -3,10 +3,12 @@
 Usage: sideBySide.py PROGRAM [ARGUMENT...]
 
 The arguments are those of the program. Prints what it prints, once, and a table of the figures of
-both forms. Fails if the forms print different results, and as the program does if that fails.
+both forms. Fails if the forms print different results, times aside, and as the program does if that
+fails.
 """
 import difflib
 import pathlib
+import re
 import subprocess
 import sys
 import tempfile
@@ -29,9 +31,13 @@ def run(program, arguments, standard_input, folder):
     return result.stdout, [row.split("\t") for row in rows]
 
 
+def without_times(text):
+    return re.sub(r" in [0-9.]+ ms$", "", text, flags=re.MULTILINE).splitlines()
+
+
 def expect_equal(outputs):
     (one, left), (other, right) = outputs.items()
-    diff = list(difflib.unified_diff(left.splitlines(), right.splitlines(), one, other,
+    diff = list(difflib.unified_diff(without_times(left), without_times(right), one, other,
                                      lineterm=""))
     if diff:
         sys.exit("\n".join(["debian-packages: the forms have different results", *diff]))

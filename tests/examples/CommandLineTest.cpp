@@ -1,11 +1,29 @@
 #include "CommandLine.h"
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 namespace {
 
 using debian::CommandLine;
 using debian::parseCommandLine;
+using debian::Question;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+std::string errorOf(std::vector<std::string> const& arguments)
+{
+    try
+    {
+        parseCommandLine(arguments);
+    }
+    catch (debian::UsageError const& error)
+    {
+        return error.what();
+    }
+    ADD_FAILURE() << "no UsageError";
+    return {};
+}
 
 TEST(CommandLine, ReadsTheStatusFileByDefault)
 {
@@ -46,12 +64,42 @@ TEST(CommandLine, KnowsTheOptionsForFormAndFigures)
     EXPECT_EQ(commandLine.file, "one");
 }
 
+TEST(CommandLine, KeepsQuestionsInTheirOrder)
+{
+    CommandLine const commandLine = parseCommandLine(
+        {"--tag", "-dev$", "one", "--unmet", "--reverse", "libc6", "--unmet-recommended",
+         "--largest", "^lib", "--same-maintainer", "--reverse", "--unmet"});
+
+    EXPECT_THAT(commandLine.questions, ElementsAre(Question{Question::Kind::Tag, "-dev$"},
+                                                   Question{Question::Kind::Unmet, ""},
+                                                   Question{Question::Kind::Reverse, "libc6"},
+                                                   Question{Question::Kind::UnmetRecommended, ""},
+                                                   Question{Question::Kind::Largest, "^lib"},
+                                                   Question{Question::Kind::SameMaintainer, ""},
+                                                   Question{Question::Kind::Reverse, "--unmet"}));
+    EXPECT_EQ(commandLine.file, "one");
+    EXPECT_THAT(parseCommandLine({}).questions, IsEmpty());
+}
+
+TEST(CommandLine, LimitsTheRowsOfAnswers)
+{
+    EXPECT_EQ(parseCommandLine({}).maxRows, 10u);
+    EXPECT_EQ(parseCommandLine({"--limit", "25"}).maxRows, 25u);
+    EXPECT_EQ(parseCommandLine({"--limit", "0"}).maxRows, 0u);
+}
+
 TEST(CommandLine, RefusesWhatMakesNoSense)
 {
-    EXPECT_THROW(parseCommandLine({"--figures"}), debian::UsageError);
-    EXPECT_THROW(parseCommandLine({"--fast"}), debian::UsageError);
-    EXPECT_THROW(parseCommandLine({"a", "b", "c"}), debian::UsageError);
-    EXPECT_THROW(parseCommandLine({"-", "-"}), debian::UsageError);
+    EXPECT_EQ(errorOf({"--figures"}), "--figures needs the name of a file");
+    EXPECT_EQ(errorOf({"--fast"}), "unknown option: --fast");
+    EXPECT_EQ(errorOf({"a", "b", "c"}), "more than two files: c");
+    EXPECT_EQ(errorOf({"-", "-"}), "standard input can be read only once");
+    EXPECT_EQ(errorOf({"--largest"}), "--largest needs a pattern");
+    EXPECT_EQ(errorOf({"--tag"}), "--tag needs a pattern");
+    EXPECT_EQ(errorOf({"--reverse"}), "--reverse needs the name of a package");
+    EXPECT_EQ(errorOf({"--limit"}), "--limit needs a number of rows");
+    for (std::string const number : {"", "-1", "+1", "ten", "1x", "99999999999999999999"})
+        EXPECT_EQ(errorOf({"--limit", number}), "no number of rows: " + number);
 }
 
 }  // namespace

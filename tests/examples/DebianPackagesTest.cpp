@@ -110,6 +110,67 @@ TEST_P(DebianPackages, EndsWithATableOfFigures)
         EXPECT_THAT(table, HasSubstr(std::string("\n  ") + name + ' ')) << name;
 }
 
+TEST_P(DebianPackages, AsksAllQuestionsIfNoneIsAsked)
+{
+    Outcome const result = run(write("index", INDEX));
+
+    for (char const* title : {"Unmet dependencies", "Unmet recommendations",
+                              "Packages that depend on one of the same maintainer",
+                              "The largest packages that match \"^lib\"", "Dependencies on lib",
+                              "Tagging as obsolete the packages that match \"-dev$\": 0",
+                              "Packages with the tag", "Packages with the tag after the rollback"})
+        EXPECT_THAT(result.output, HasSubstr(std::string("\n\n") + title + '\n')) << title;
+    EXPECT_THAT(result.output, testing::ContainsRegex("  editor   1 all    Depends: gone\n"
+                                                      "  1 row in [0-9.]+ ms\n"));
+    EXPECT_THAT(result.output, testing::ContainsRegex("\n  query: same maintainer +[0-9.]+ ms\n"));
+}
+
+TEST_P(DebianPackages, AnswersTheQuestionsAskedAndNoOthers)
+{
+    Outcome const result = run("--limit 1 --reverse lib --tag ^spell$ " + write("index", INDEX));
+
+    EXPECT_EQ(result.status, 0);
+    EXPECT_THAT(result.output, AllOf(Not(HasSubstr("Removing")), Not(HasSubstr("Unmet"))));
+    EXPECT_THAT(result.output,
+                testing::ContainsRegex("\nDependencies on lib\n"
+                                       "  package  release  dependency\n"
+                                       "  -------  -------  ----------------\n"
+                                       "  base     1 all    Pre-Depends: lib\n"
+                                       "  ... and 1 more\n"
+                                       "  2 rows in [0-9.]+ ms\n"
+                                       "\n"
+                                       "Tagging as obsolete the packages that match .*: 1\n"
+                                       "\n"
+                                       "Packages with the tag\n"
+                                       "  package  releases\n"
+                                       "  -------  --------\n"
+                                       "  spell           1\n"
+                                       "  1 row in [0-9.]+ ms\n"
+                                       "\n"
+                                       "Packages with the tag after the rollback\n"
+                                       "  0 rows in [0-9.]+ ms\n"));
+}
+
+TEST_P(DebianPackages, ReportsAPatternThatIsNone)
+{
+    for (std::string const option : {"--largest", "--tag"})
+    {
+        Outcome const result = run(option + " '(lib' " + write("index", INDEX));
+
+        EXPECT_EQ(result.status, 1);
+        EXPECT_THAT(result.errors, AllOf(testing::StartsWith("debian-packages: "),
+                                         EndsWith(" of the pattern \"(lib\"\n")));
+    }
+}
+
+TEST_P(DebianPackages, ReportsANameThatTheIndexDoesNotHold)
+{
+    Outcome const result = run("--reverse gone " + write("index", INDEX));
+
+    EXPECT_EQ(result.status, 1);
+    EXPECT_EQ(result.errors, "debian-packages: the index has no package \"gone\"\n");
+}
+
 TEST_P(DebianPackages, ReadsStandardInput)
 {
     Outcome const result = run("-", INDEX);
@@ -275,6 +336,17 @@ TEST_F(SideBySide, GivesStandardInputToBoth)
 
     EXPECT_EQ(result.status, 0);
     EXPECT_THAT(result.output, testing::ContainsRegex("\n  elements +19 +19\n"));
+}
+
+TEST_F(SideBySide, AsksBothFormsTheQuestions)
+{
+    Outcome const result = run("--same-maintainer --unmet " + write("index", INDEX));
+
+    EXPECT_EQ(result.status, 0);
+    EXPECT_THAT(result.output,
+                AllOf(testing::ContainsRegex("\n  1 row in [0-9.]+ ms\n"),
+                      testing::ContainsRegex("\n  query: unmet dependencies +[0-9.]+ ms +[0-9.]+ "
+                                             "ms\n")));
 }
 
 TEST_F(SideBySide, FailsAsTheProgramDoes)

@@ -27,6 +27,8 @@ public:
 class Package : public ElementView<Package>
 {
 public:
+    class Constrainables;  // Constrainables.h
+
     using ElementView::ElementView;
     static meta::Class const& metaClass();
 
@@ -43,6 +45,8 @@ public:
 class Release : public ElementView<Release>
 {
 public:
+    class Constrainables;  // Constrainables.h
+
     using ElementView::ElementView;
     static meta::Class const& metaClass();
 
@@ -72,6 +76,8 @@ public:
 class DependencyGroup : public ElementView<DependencyGroup>
 {
 public:
+    class Constrainables;  // Constrainables.h
+
     using ElementView::ElementView;
     static meta::Class const& metaClass();
 
@@ -86,6 +92,8 @@ public:
 class Alternative : public ElementView<Alternative>
 {
 public:
+    class Constrainables;  // Constrainables.h
+
     using ElementView::ElementView;
     static meta::Class const& metaClass();
 
