@@ -136,7 +136,7 @@ std::string const& helpText()
         "questions. FILE is not changed. Dependencies that FILE does not hold are looked up in\n"
         "the index AVAILABLE, such as the output of apt-cache dumpavail.\n"
         "\n"
-        "With questions nothing is changed, and only these are answered, from FILE alone:\n"
+        "With questions only these are answered, from FILE alone:\n"
         "\n"
         "      --unmet              dependencies that no package of FILE satisfies\n"
         "      --unmet-recommended  recommendations that no package of FILE satisfies\n"
@@ -155,8 +155,7 @@ std::string const& helpText()
         "  -h, --help               prints this text\n"
         "\n"
         "Exit status: 0 if all went well; 1 if a file can not be read or is malformed, a PATTERN\n"
-        "is no regular expression, or FILE has no package NAME; 2 if the arguments make no\n"
-        "sense.\n";
+        "is no regular expression, or FILE does not know NAME; 2 if the arguments make no sense.\n";
     return text;
 }
 

@@ -25,8 +25,8 @@ public:
     Interview(std::ostream& output, Figures& figures, PackageIndex<Form> const& index,
               MissingNames missing, std::size_t maxRows);
 
-    /// \throws std::runtime_error  if a pattern is no regular expression, or the index has no
-    ///     package of the name. The model is as it was.
+    /// \throws std::runtime_error  if a pattern is no regular expression, or a name unknown. The
+    ///     model is as it was.
     /// \returns false if a tag was still found after the rollback.
     bool ask(Question const& question);
     /// One question of each kind, for who asks for nothing in particular. The one for dependencies

@@ -1,7 +1,5 @@
 #include "MissingNames.h"
 
-#include "AvailableModel.h"
-
 namespace debian {
 
 MissingNames::MissingNames(std::vector<std::string> const& names)

@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <cstddef>
 #include <map>
+#include <optional>
 #include <set>
 #include <stdexcept>
 #include <tuple>
@@ -80,6 +81,12 @@ void addMetByProvider(ElementSet& met, Model const& model, ustring const& kinds)
 
     for (auto const& [group] : named.query.results(named.groups))
         met.insert(group.getImpl());
+}
+
+template <ElementForm Form>
+std::string targetText(Alternative<Form> const& alternative, MissingNames const& missing)
+{
+    return textOf<Form>(Package<Form>(alternative->getTargetImpl()), nullptr, &missing);
 }
 
 }  // namespace
@@ -163,18 +170,32 @@ template <ElementForm Form> Table Questions<Form>::largestPackages(std::string c
 template <ElementForm Form>
 Table Questions<Form>::reverseDependencies(std::string const& name) const
 {
-    if (m_index->getPackages().count(to_ustring(name)) == 0)
-        throw std::runtime_error("the index has no package \"" + name + '"');
+    bool const isHere = m_index->getPackages().count(to_ustring(name)) != 0;
+    if (!isHere && !m_missing.contains(name))
+        throw std::runtime_error("neither a package nor a dependency is called \"" + name + '"');
 
-    NamedPackages<Form> named(m_model);
-    named.targets.name == to_ustring(name);
-    Releases<Form> users({named.query, EXACT});
-    named.groups.release.refersTo(users);
+    query::AbstractQuery query(m_model);
+    Releases<Form> users({query, EXACT});
+    Groups<Form> groups({query, EXACT});
+    Alternatives<Form> alternatives({query, EXACT});
+    groups.release.refersTo(users);
+    alternatives.group.refersTo(groups);
+    std::optional<Packages<Form>> targets;
+    if (isHere)
+    {
+        targets.emplace(SearchSource(query, EXACT));
+        targets->name == to_ustring(name);
+        alternatives.target.refersTo(*targets);
+    }
 
     std::set<Table::Row> rows;
-    for (auto const& [group, user] : named.query.results(named.groups, users))
-        rows.insert({textOf<Form>(user->getPackage()), to_string(user->getLabel()),
-                     textOf<Form>(group, nullptr, &m_missing)});
+    for (auto const& [user, group, alternative] : query.results(users, groups, alternatives))
+    {
+        // The model holds no element of a missing package to search for.
+        if (isHere || targetText<Form>(alternative, m_missing) == name)
+            rows.insert({textOf<Form>(user->getPackage()), to_string(user->getLabel()),
+                         textOf<Form>(group, nullptr, &m_missing)});
+    }
     return tableOf({{"package"}, {"release"}, {"dependency"}}, rows);
 }
 

@@ -48,9 +48,10 @@ public:
     /// \throws std::runtime_error  if it is no regular expression.
     Table largestPackages(std::string const& pattern) const;
 
-    /// The dependencies of any kind that name a package: package, release, dependency.
+    /// The dependencies of any kind that name a package, which may be a virtual or a missing one:
+    /// package, release, dependency.
     ///
-    /// \throws std::runtime_error  if the index has no package of that name, be it a virtual one.
+    /// \throws std::runtime_error  if no package of the index is called so, and none is missing.
     Table reverseDependencies(std::string const& name) const;
 
     /// The package of the index that most alternatives name, the first one by name if there are

@@ -15,6 +15,9 @@ namespace debian {
 /// All that the program searches: no class of an index extends another.
 inline constexpr auto EXACT = tarn::kiln::query::SearchClassMatchMode::MatchExactClass;
 
+/// The query that a search instance is added to, and which elements suit.
+using reflective::SearchSource;
+
 template <ElementForm Form> using Packages = typename Package<Form>::Constrainables;
 template <ElementForm Form> using Releases = typename Release<Form>::Constrainables;
 template <ElementForm Form> using Groups = typename DependencyGroup<Form>::Constrainables;

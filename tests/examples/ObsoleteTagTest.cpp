@@ -1,7 +1,10 @@
 #include "ObsoleteTag.h"
 
+#include "SearchInstances.h"
 #include "tarnkiln/kernel/Transaction.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/meta/ExtensionImpl.h"
+#include "tarnkiln/meta/StandardTypes.h"
 #include "tests/examples/LoadText.h"
 
 #include <gmock/gmock.h>
@@ -99,6 +102,25 @@ TYPED_TEST(ObsoleteTagTest, IsSetOnNothingByWhatIsNoRegularExpression)
     EXPECT_THROW(tag.setOnMatching("[a"), std::runtime_error);
 
     EXPECT_THAT(tag.packagesWithTag().rows(), IsEmpty());
+}
+
+TYPED_TEST(ObsoleteTagTest, CanBeAskedForByItsDefault)
+{
+    ObsoleteTag<TypeParam> const tag(this->index.model);
+    Transaction const transaction = this->begin();
+    tag.setOnMatching("^a");
+
+    query::AbstractQuery query(this->index.model);
+    debian::Packages<TypeParam> packages({query, debian::EXACT});
+    meta::Class const packageClass = debian::Package<TypeParam>::metaClass();
+    packages.constrain(this->index.model->getExtension(packageClass, ObsoleteTag<TypeParam>::NAME),
+                       query::ValueMatchRelation::equal,
+                       Value(meta::StandardTypes::booleanMeta, false));
+
+    std::vector<ustring> names;
+    for (auto const& [package] : query.results(packages))
+        names.push_back(package->getName());
+    EXPECT_THAT(names, testing::UnorderedElementsAre(u"b-dev", u"v-dev", u"developer"));
 }
 
 TYPED_TEST(ObsoleteTagTest, BelongsToOneModel)

@@ -150,6 +150,21 @@ TYPED_TEST(QuestionsTest, FindTheDependenciesThatNameAVirtualPackage)
                             Row{"spell", "1 all", "Depends: words"}));
 }
 
+TYPED_TEST(QuestionsTest, FindTheDependenciesThatNameAMissingPackage)
+{
+    AskedModel<TypeParam> const index;
+    std::vector<Row> const expected = {{"editor", "1 all", "Depends: gone | lost (>= 3)"}};
+
+    EXPECT_EQ(index.questions.reverseDependencies("gone").rows(), expected);
+    EXPECT_EQ(index.questions.reverseDependencies("lost").rows(), expected);
+
+    Model const available = Model::create(index.model->getModelConstellation());
+    available->setModelURI(debian::AVAILABLE_URI);
+    auto const other = test::loadText<TypeParam>(available, paragraph("gone"));
+    ASSERT_EQ(debian::resolveTargets<TypeParam>(index.loaded.index).found, 1u);
+    EXPECT_EQ(index.questions.reverseDependencies("gone").rows(), expected);
+}
+
 TYPED_TEST(QuestionsTest, TellADependencyOnceThatNamesAPackageTwice)
 {
     AskedModel<TypeParam> const index(paragraph("a") +
@@ -186,11 +201,11 @@ TYPED_TEST(QuestionsTest, RefuseWhatIsNoRegularExpression)
     }
 }
 
-TYPED_TEST(QuestionsTest, RefuseNamesThatTheIndexDoesNotHold)
+TYPED_TEST(QuestionsTest, RefuseNamesThatNobodyKnows)
 {
     AskedModel<TypeParam> const index;
 
-    for (std::string const name : {"nothing", "gone", ""})
+    for (std::string const name : {"nothing", "li", ""})
     {
         try
         {
@@ -199,7 +214,7 @@ TYPED_TEST(QuestionsTest, RefuseNamesThatTheIndexDoesNotHold)
         }
         catch (std::runtime_error const& error)
         {
-            EXPECT_EQ(error.what(), "the index has no package \"" + name + '"');
+            EXPECT_EQ(error.what(), "neither a package nor a dependency is called \"" + name + '"');
         }
     }
 }
