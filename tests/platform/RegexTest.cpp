@@ -6,9 +6,11 @@
 
 #include <chrono>
 #include <optional>
+#include <random>
 #include <string>
 #include <type_traits>
 #include <utility>
+#include <vector>
 
 namespace {
 
@@ -267,6 +269,60 @@ TEST(RegexPattern, IsEnoughForLongOrdinaryTexts)
     EXPECT_TRUE(Pattern(u"cat|end of all").isFoundIn(text + u"the end of all"));
     EXPECT_FALSE(Pattern(u"fox.*cat").isFoundIn(text));
     EXPECT_FALSE(Pattern(u"\\bcow\\b").isFoundIn(text));
+}
+
+TEST(RegexPattern, FindsPlainCharactersAndDotsLikeAnyOtherPattern)
+{
+    std::mt19937 random(1);
+    auto const below = [&](std::size_t bound) { return random() % bound; };
+    std::vector<std::u16string> const items{u"a", u"b", u".", u".*", u".*", u"\\.", u"\\*", u"ab"};
+    // Line ends, a surrogate pair, and halves of one.
+    std::vector<std::u16string> const characters{u"a",
+                                                 u"b",
+                                                 u"a",
+                                                 u"b",
+                                                 u".",
+                                                 u"*",
+                                                 u"\n",
+                                                 u"\r\n",
+                                                 u"\x85",
+                                                 u"\u2028",
+                                                 u"\u2029",
+                                                 u"\v",
+                                                 u"\u0084",
+                                                 u"\u2027",
+                                                 u"\U0001F600",
+                                                 std::u16string(1, 0xD83D),
+                                                 std::u16string(1, 0xDE00)};
+    int found = 0;
+    for (int round = 0; round < 20'000; ++round)
+    {
+        std::u16string pattern;
+        for (std::size_t left = below(6); left > 0; --left)
+            pattern += items[below(items.size())];
+        std::u16string subject;
+        for (std::size_t left = below(9); left > 0; --left)
+            subject += characters[below(round % 2 == 0 ? 4 : characters.size())];
+
+        // The second way, which matches nothing, keeps all optimisations away.
+        bool const expected = Pattern(u"(?:" + pattern + u"|[^\\s\\S])").isFoundIn(subject);
+        ASSERT_EQ(Pattern(pattern).isFoundIn(subject), expected)
+            << testing::PrintToString(pattern) << " in " << testing::PrintToString(subject);
+        found += expected;
+    }
+    EXPECT_GT(found, 5'000);
+    EXPECT_LT(found, 15'000);
+}
+
+TEST(RegexPattern, EndsForPlainCharactersThatAreComparedOften)
+{
+    std::u16string const mostly = std::u16string(200, u'a') + u"b";
+    std::u16string const subject(100'000, u'a');
+
+    EXPECT_FALSE(Pattern(mostly).isFoundIn(subject));
+    double const seconds =
+        secondsOf([&] { EXPECT_THAT(refusal(mostly, subject + u"b"), HasSubstr("given up")); });
+    EXPECT_LT(seconds, 10);
 }
 
 TEST(RegexPattern, CanBeMovedButNotCopied)

@@ -1,5 +1,6 @@
 #include "textkit/regex/Pattern.h"
 
+#include "textkit/regex/Glob.h"
 #include "textkit/regex/RegexError.h"
 
 #define PCRE2_CODE_UNIT_WIDTH 16
@@ -108,7 +109,8 @@ MatchContext limits()
 
 struct Pattern::Compiled
 {
-    std::u16string pattern;  // for errors
+    std::u16string pattern;    // for errors
+    std::optional<Glob> glob;  // finds the same as the code, if there is one
     Code code;
     MatchContext context;
     MatchData match;
@@ -119,6 +121,8 @@ Pattern::Pattern(std::u16string_view pattern, bool caseSensitive)
 {
     m_compiled->code = compile(pattern, caseSensitive);
     m_compiled->pattern = pattern;
+    if (caseSensitive)
+        m_compiled->glob = Glob::parse(pattern);
     m_compiled->context = limits();
     m_compiled->match = owned<MatchData>(pcre2_match_data_create(1, nullptr));
 }
@@ -129,6 +133,11 @@ Pattern::~Pattern() = default;
 
 bool Pattern::isFoundIn(std::u16string_view subject) const
 {
+    if (m_compiled->glob)
+    {
+        if (std::optional<bool> const isFound = m_compiled->glob->isFoundIn(subject, MOST_STEPS))
+            return *isFound;
+    }
     Effort effort;
     pcre2_match_context* const context = m_compiled->context.get();
     pcre2_set_callout(context, count, &effort);

@@ -20,7 +20,7 @@ namespace textkit::regex {
 ///
 /// Patterns may come from strangers: one pattern is at most 65536 code units long, and a search is
 /// given up after ten million steps or 64 MiB, a step being an item of the pattern tried or a code
-/// unit passed.
+/// unit passed. What a `Glob` can find is found without that.
 ///
 /// Movable, not copyable. Threads: used by one at a time, since searches share their memory.
 class Pattern
