@@ -183,16 +183,18 @@ Value plainValue(Dice& dice, meta::Type const& type, bool optional)
 class RandomModel
 {
 public:
-    RandomModel(Zoo const& zoo, Dice& dice) : m_zoo(zoo), m_dice(dice)
+    /// At most so many elements, and stand-ins besides; that share of the properties gets values.
+    RandomModel(Zoo const& zoo, Dice& dice, std::size_t most, int percentFilled)
+        : m_zoo(zoo),
+          m_dice(dice)
     {
-        std::size_t const most = dice.chance(10) ? 30 : 12;
         for (std::size_t left = dice.below(most + 1); left > 0; --left)
             m_elements.push_back(makeElement());
         for (ModelElement const& element : m_elements)
         {
             for (meta::Property const& property : m_zoo.propertiesOf(element->getMetaClass()))
             {
-                if (dice.chance(60) && !isContainment(property))
+                if (dice.chance(percentFilled) && !isContainment(property))
                     tryToFill(element, property);
             }
         }
@@ -305,13 +307,12 @@ private:
 class RandomQuery
 {
 public:
-    RandomQuery(Zoo const& zoo, RandomModel const& world, Dice& dice)
+    RandomQuery(Zoo const& zoo, RandomModel const& world, Dice& dice, std::size_t instances)
         : m_zoo(zoo),
           m_world(world),
           m_dice(dice),
           query(world.model)
     {
-        std::size_t const instances = dice.oneOf<std::size_t>({1, 1, 1, 2, 2, 2, 3});
         for (std::size_t id = 0; id < instances; ++id)
         {
             m_classes.push_back(dice.pick(zoo.classes));
@@ -461,37 +462,70 @@ Outcome runWith(RandomQuery& random, NativeTarnkilnQuery::Engine engine)
     return outcome;
 }
 
+/// Runs queries with both engines and compares what they give.
+class Comparison
+{
+public:
+    void run(RandomQuery& random, Dice& dice)
+    {
+        using Engine = NativeTarnkilnQuery::Engine;
+        bool const plainFirst = dice.chance(50);
+        Outcome const first = runWith(random, plainFirst ? Engine::Plain : Engine::Fast);
+        Outcome const second = runWith(random, plainFirst ? Engine::Fast : Engine::Plain);
+        ++m_runs;
+        m_failures += !first.failure.empty();
+        m_withRows += !first.rows.empty();
+
+        ASSERT_EQ(first.failure, second.failure) << m_runs << plainFirst;
+        ASSERT_EQ(first, second) << m_runs << plainFirst;
+    }
+    void expectVariety() const
+    {
+        EXPECT_GT(m_failures, m_runs / 50);
+        EXPECT_GT(m_withRows, m_runs / 10);
+    }
+
+private:
+    int m_runs = 0;
+    int m_failures = 0;
+    int m_withRows = 0;
+};
+
 class RandomQueries : public ::testing::TestWithParam<unsigned>
 {};
 
 TEST_P(RandomQueries, GiveTheSameRowsWithBothEngines)
 {
-    using Engine = NativeTarnkilnQuery::Engine;
-    constexpr int MODELS = 120;
-    constexpr int QUERIES = 50;
     Zoo const zoo;
     Dice dice(GetParam());
-    int failures = 0;
-    int withRows = 0;
-    for (int model = 0; model < MODELS; ++model)
+    Comparison comparison;
+    for (int model = 0; model < 120; ++model)
     {
-        RandomModel const world(zoo, dice);
-        for (int number = 0; number < QUERIES; ++number)
+        RandomModel const world(zoo, dice, dice.chance(10) ? 30 : 12, 60);
+        for (int number = 0; number < 50; ++number)
         {
-            RandomQuery random(zoo, world, dice);
-            bool const plainFirst = dice.chance(50);
-            Outcome const first = runWith(random, plainFirst ? Engine::Plain : Engine::Fast);
-            Outcome const second = runWith(random, plainFirst ? Engine::Fast : Engine::Plain);
-            failures += !first.failure.empty();
-            withRows += !first.rows.empty();
-
-            ASSERT_EQ(first.failure, second.failure) << model << ' ' << number << plainFirst;
-            ASSERT_EQ(first, second) << model << ' ' << number << plainFirst;
+            RandomQuery random(zoo, world, dice, dice.oneOf<std::size_t>({1, 1, 1, 2, 2, 2, 3}));
+            ASSERT_NO_FATAL_FAILURE(comparison.run(random, dice)) << model;
         }
     }
-    // Else nothing much was compared.
-    EXPECT_GT(failures, MODELS * QUERIES / 50);
-    EXPECT_GT(withRows, MODELS * QUERIES / 10);
+    comparison.expectVariety();
+}
+
+TEST_P(RandomQueries, GiveTheSameRowsOfManyElements)
+{
+    Zoo const zoo;
+    Dice dice(GetParam());
+    Comparison comparison;
+    for (int model = 0; model < 2; ++model)
+    {
+        RandomModel const world(zoo, dice, 200, 4);
+        for (int number = 0; number < 200; ++number)
+        {
+            RandomQuery random(zoo, world, dice, 1);
+            ASSERT_NO_FATAL_FAILURE(comparison.run(random, dice)) << model;
+        }
+    }
+    comparison.expectVariety();
 }
 
 INSTANTIATE_TEST_SUITE_P(Seeds, RandomQueries, ::testing::Values(1u, 2u, 3u, 4u));

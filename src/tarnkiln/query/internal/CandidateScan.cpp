@@ -8,9 +8,10 @@
 namespace tarn::kiln::internal {
 namespace {
 
-// How far ahead memory is asked for: the elements of a model lie anywhere.
-constexpr std::size_t FAR_AHEAD = 16;
-constexpr std::size_t NEAR_AHEAD = 8;
+void touch(void const* place)
+{
+    static_cast<void>(*static_cast<char const volatile*>(place));
+}
 
 }  // namespace
 
@@ -29,49 +30,62 @@ bool CandidateScan::mayStopEarly() const
            });
 }
 
+inline bool CandidateScan::passesAll(std::vector<ElementTest> const& tests,
+                                     ModelElement::Impl& element)
+{
+    for (ElementTest const& test : tests)
+    {
+        bool const isPassed = test.isOfField
+                                  ? test.test.compare(test.place.field(element), test.test.other)
+                                  : passes(test, element);
+        if (!isPassed)
+            return false;
+    }
+    return true;
+}
+
 void CandidateScan::run(std::size_t enough)
 {
     m_candidates.resize(m_query.instances.size());
     m_elements = m_query.model->getAllElementImpls();
     constexpr std::size_t ALL = ~std::size_t{0};
     std::size_t const most = enough != 0 && mayStopEarly() ? enough : ALL;
-    for (std::size_t number = 0; number < m_elements.size(); ++number)
+    Block block;
+    for (std::size_t begin = 0; begin < m_elements.size(); begin += BLOCK)
     {
-        prefetch(number);
-        ModelElement::Impl& element = *m_elements[number];
-        ElementKind const& kind = m_kinds.kindOf(element);
-        for (InstanceTests const& instance : kind.instances)
+        std::size_t const end = std::min(begin + BLOCK, m_elements.size());
+        touchBlock({m_elements.data() + begin, end - begin}, block);
+        for (std::size_t number = begin; number < end; ++number)
         {
-            m_usualKind = &kind;
-            if (!std::all_of(instance.tests.begin(), instance.tests.end(),
-                             [&](ElementTest const& test) { return passes(test, element); }))
-                continue;
-            m_candidates[instance.instance].push_back(&element);
-            if (m_candidates[instance.instance].size() >= most)
-                return;
+            ModelElement::Impl& element = *m_elements[number];
+            ElementKind const& kind = m_kinds.kindOf(*block.types[number - begin], element);
+            for (InstanceTests const& instance : kind.instances)
+            {
+                m_usualKind = &kind;
+                if (!passesAll(instance.tests, element))
+                    continue;
+                m_candidates[instance.instance].push_back(&element);
+                if (m_candidates[instance.instance].size() >= most)
+                    return;
+            }
         }
     }
 }
 
-/// Asks for what will be read soon, on the guess that most elements are of the kind of the last one
-/// that was tested.
-void CandidateScan::prefetch(std::size_t number) const
+/// Reads of each element what will be read of it, one step for all after the other. The elements of
+/// a model lie anywhere, and only so does the processor wait for many of them at a time. Guesses
+/// that most are of the kind of the last one that was tested.
+void CandidateScan::touchBlock(std::span<ModelElement::Impl* const> elements, Block& block) const
 {
-    if (number + FAR_AHEAD >= m_elements.size())
-        return;
-    ModelElement::Impl const& later = *m_elements[number + FAR_AHEAD];
-    __builtin_prefetch(&later);
+    for (std::size_t at = 0; at < elements.size(); ++at)
+        block.types[at] = &typeid(*elements[at]);
     if (!m_usualKind)
         return;
-    if (!m_usualKind->isReflective)
+    for (std::size_t at = 0; at < elements.size(); ++at)
     {
-        __builtin_prefetch(reinterpret_cast<char const*>(&later) + m_usualKind->touched);
-        return;
+        if (block.types[at] == m_usualKind->type)
+            touch(m_usualKind->touched(*elements[at]));
     }
-    __builtin_prefetch(&later + 1);
-    ModelElement::Impl const& sooner = *m_elements[number + NEAR_AHEAD];
-    if (typeid(sooner) == typeid(ReflectiveModelElementImpl))
-        __builtin_prefetch(&cellsOf(sooner));
 }
 
 bool CandidateScan::passes(ElementTest const& test, ModelElement::Impl& element)

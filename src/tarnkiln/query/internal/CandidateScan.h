@@ -5,7 +5,10 @@
 #include "tarnkiln/query/internal/NativeQueryState.h"
 #include "tarnkiln/query/internal/RegexCache.h"
 
+#include <array>
 #include <cstddef>
+#include <span>
+#include <typeinfo>
 #include <vector>
 
 namespace tarn::kiln::internal {
@@ -30,8 +33,17 @@ public:
     std::vector<std::vector<ModelElement::Impl*>>& getCandidates() { return m_candidates; }
 
 private:
+    static constexpr std::size_t BLOCK = 64;
+
+    /// Elements that are looked at together.
+    struct Block
+    {
+        std::array<std::type_info const*, BLOCK> types;
+    };
+
     bool mayStopEarly() const;
-    void prefetch(std::size_t at) const;
+    void touchBlock(std::span<ModelElement::Impl* const> elements, Block& block) const;
+    bool passesAll(std::vector<ElementTest> const& tests, ModelElement::Impl& element);
     bool passes(ElementTest const& test, ModelElement::Impl& element);
     bool ask(ElementTest const& test, ModelElement::Impl& element);
 

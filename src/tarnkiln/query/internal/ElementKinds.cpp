@@ -29,6 +29,7 @@ ElementKind const& ElementKinds::makeOrFind(void const* key, ModelElement::Impl 
 ElementKind ElementKinds::makeKind(ModelElement::Impl const& element)
 {
     ElementKind kind;
+    kind.type = &typeid(element);
     kind.isReflective = m_lastBy == KeptBy::Layout;
     meta::Class const& metaClass = element.getMetaClass();
     for (std::size_t id = 0; id < m_query.instances.size(); ++id)
@@ -39,8 +40,8 @@ ElementKind ElementKinds::makeKind(ModelElement::Impl const& element)
         InstanceTests& instance = kind.instances.emplace_back(InstanceTests{id, {}});
         for (std::size_t at = 1; at < constraints.size(); ++at)
             instance.tests.push_back(makeTest(*constraints[at], element));
-        if (kind.touched == 0 && !instance.tests.empty())
-            kind.touched = instance.tests.front().place.offset();
+        if (!kind.firstPlace.isKnown() && !instance.tests.empty())
+            kind.firstPlace = instance.tests.front().place;
     }
     return kind;
 }
@@ -57,7 +58,10 @@ ElementTest ElementKinds::makeTest(SingleObjectConstraint const& constraint,
     meta::Property const& property = test.valueConstraint->getProperty();
     test.place = PlainPlace::find(element, m_lastBy, property);
     if (test.place.isKnown())
+    {
         test.test = m_tests.make(*test.valueConstraint, test.place.kind(), property->getType());
+        test.isOfField = test.place.isField() && test.test.single == ValueTest::Answer::Compare;
+    }
     return test;
 }
 }  // namespace tarn::kiln::internal

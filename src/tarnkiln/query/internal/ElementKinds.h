@@ -21,7 +21,8 @@ struct ElementTest
     bool isTopLevel = false;                                           ///< Asks for that only.
     PropertyRelationValueConstraint const* valueConstraint = nullptr;  ///< If it is one.
     PlainPlace place;
-    ValueTest test;  ///< What the value at `place` is tested for.
+    ValueTest test;          ///< What the value at `place` is tested for.
+    bool isOfField = false;  ///< The value is a required field, and is compared.
 };
 
 /// The tests of one search instance, after that of the class.
@@ -34,9 +35,16 @@ struct InstanceTests
 /// What elements of one kind are tested for: the search instances that they can stand for.
 struct ElementKind
 {
+    /// Something in memory that is read first, after the C++ class of the element.
+    void const* touched(ModelElement::Impl const& element) const
+    {
+        return isReflective ? &cellsOf(element) : firstPlace.field(element);
+    }
+
     std::vector<InstanceTests> instances;
+    std::type_info const* type = nullptr;  ///< The C++ class.
     bool isReflective = false;
-    std::ptrdiff_t touched = 0;  ///< Where the first field is that is read.
+    PlainPlace firstPlace;  ///< That is read.
 };
 
 /// Sorts the elements that a run meets into kinds, each of which is looked into once.
@@ -47,14 +55,11 @@ class ElementKinds
 public:
     ElementKinds(NativeQueryState const& query, RegexCache& regexes);
 
-    ElementKind const& kindOf(ModelElement::Impl const& element)
+    /// \param type  the C++ class of `element`.
+    ElementKind const& kindOf(std::type_info const& type, ModelElement::Impl const& element)
     {
-        void const* const key = keyOf(element);
-        auto const bits = reinterpret_cast<std::uintptr_t>(key);
-        Cached& cached = m_cache[(bits >> 4 ^ bits >> 10) % m_cache.size()];
-        if (cached.key != key || !cached.kind)
-            cached = {key, &makeOrFind(key, element)};
-        return *cached.kind;
+        Cached const& cached = m_byType.at(&type);
+        return cached.key == &type ? *cached.kind : findKind(type, element);
     }
 
 private:
@@ -63,12 +68,32 @@ private:
         void const* key = nullptr;
         ElementKind const* kind = nullptr;
     };
-
-    void const* keyOf(ModelElement::Impl const& element)
+    class Cache
     {
-        std::type_info const& type = typeid(element);
+    public:
+        /// Where what is kept for `key` is or would be.
+        Cached& at(void const* key)
+        {
+            auto const bits = reinterpret_cast<std::uintptr_t>(key);
+            return m_all[(bits >> 4 ^ bits >> 10) % m_all.size()];
+        }
+
+    private:
+        std::array<Cached, 64> m_all;
+    };
+
+    ElementKind const& findKind(std::type_info const& type, ModelElement::Impl const& element)
+    {
         if (&type != m_lastType)
             useType(type, element);
+        void const* const key = keyOf(type, element);
+        Cached& cached = (m_lastBy == KeptBy::Class ? m_byType : m_byKey).at(key);
+        if (cached.key != key || !cached.kind)
+            cached = {key, &makeOrFind(key, element)};
+        return *cached.kind;
+    }
+    void const* keyOf(std::type_info const& type, ModelElement::Impl const& element) const
+    {
         if (m_lastBy == KeptBy::Class)
             return &type;
         return m_lastBy == KeptBy::Layout
@@ -87,6 +112,7 @@ private:
     KeptBy m_lastBy = KeptBy::Nobody;  ///< How elements of `m_lastType` are sorted.
     std::unordered_map<std::type_info const*, KeptBy> m_by;
     std::unordered_map<void const*, std::unique_ptr<ElementKind>> m_kinds;
-    std::array<Cached, 64> m_cache;
+    Cache m_byType;  ///< For generated classes.
+    Cache m_byKey;   ///< For all others.
 };
 }  // namespace tarn::kiln::internal

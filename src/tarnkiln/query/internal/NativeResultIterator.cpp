@@ -14,7 +14,7 @@ bool NativeTarnkilnQuery::NativeResultIterator::next(std::vector<ModelElement>& 
 {
     if (m_next < m_rows.getRowCount())
     {
-        m_rows.getRow(m_next++, row);
+        m_rows.takeRow(m_next++, row);
         return true;
     }
     row.assign(m_rows.getInstanceCount(), ModelElement());

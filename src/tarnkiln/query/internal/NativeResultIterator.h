@@ -17,7 +17,7 @@ public:
     bool next(std::vector<ModelElement>& row) override;
 
 private:
-    internal::NativeResultSet const m_rows;
+    internal::NativeResultSet m_rows;
     std::size_t m_next = 0;
 };
 }  // namespace tarn::kiln::query

@@ -1,6 +1,6 @@
 #include "tarnkiln/query/internal/NativeResultSet.h"
 
-#include <iterator>
+#include <algorithm>
 
 namespace tarn::kiln::internal {
 
@@ -9,9 +9,10 @@ NativeResultSet::NativeResultSet(std::size_t instances, std::size_t width)
       m_width(width)
 {}
 
-void NativeResultSet::getRow(std::size_t number, std::vector<ModelElement>& row) const
+void NativeResultSet::takeRow(std::size_t number, std::vector<ModelElement>& row)
 {
-    auto const first = std::next(m_cells.begin(), static_cast<std::ptrdiff_t>(number * m_width));
-    row.assign(first, std::next(first, static_cast<std::ptrdiff_t>(m_width)));
+    auto const first = m_cells.begin() + static_cast<std::ptrdiff_t>(number * m_width);
+    row.resize(m_width);
+    std::move(first, first + static_cast<std::ptrdiff_t>(m_width), row.begin());
 }
 }  // namespace tarn::kiln::internal

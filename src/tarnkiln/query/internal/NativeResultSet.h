@@ -22,8 +22,8 @@ public:
 
     std::size_t getInstanceCount() const { return m_instances; }
     std::size_t getRowCount() const { return m_cells.size() / m_width; }
-    /// Assigns the row to `row`.
-    void getRow(std::size_t number, std::vector<ModelElement>& row) const;
+    /// Moves the row to `row`, which can be done once.
+    void takeRow(std::size_t number, std::vector<ModelElement>& row);
 
 private:
     std::size_t m_instances;

@@ -60,18 +60,22 @@ public:
 
     bool isKnown() const { return m_form != Form::None; }
     SlotKind kind() const { return m_kind; }
-    /// From the beginning of the element, for elements of generated classes.
-    std::ptrdiff_t offset() const { return m_offset; }
+    /// Whether it is a field that always has a value.
+    bool isField() const { return m_form == Form::Field; }
+    /// In an element of a generated class.
+    void const* field(ModelElement::Impl const& element) const
+    {
+        return reinterpret_cast<char const*>(&element) + m_offset;
+    }
 
     KeptValue read(ModelElement::Impl const& element) const
     {
-        void const* const field = reinterpret_cast<char const*>(&element) + m_offset;
         switch (m_form)
         {
         case Form::Field:
-            return {KeptValue::Shape::Single, field};
+            return {KeptValue::Shape::Single, field(element)};
         case Form::OptionalField: {
-            void const* const payload = m_payload(field);
+            void const* const payload = m_payload(field(element));
             return {payload ? KeptValue::Shape::Optional : KeptValue::Shape::Absent, payload};
         }
         case Form::Cell:
@@ -111,8 +115,8 @@ private:
 
     Form m_form = Form::None;
     SlotKind m_kind = SlotKind::Other;
-    bool m_isInPlace = false;                         ///< The word of the cell is the payload.
-    std::ptrdiff_t m_offset = 0;                      ///< Of a field.
+    bool m_isInPlace = false;     ///< The word of the cell is the payload.
+    std::ptrdiff_t m_offset = 0;  ///< Of a field, from where the element begins.
     void const* (*m_payload)(void const*) = nullptr;  ///< Looks into an optional field.
     ReflectiveSlot const* m_slot = nullptr;           ///< Of a cell.
     void const* m_default = nullptr;                  ///< What a null word of a cell points to.

@@ -97,24 +97,12 @@ ValueTest ValueTests::makeRegexp(PropertyRelationValueConstraint const& constrai
     if (!pattern || !isReadable<Text>(constraint.getValue()))
         return test;
     test.single = Answer::Compare;
-    if constexpr (std::is_same_v<Text, string>)
-    {
-        test.other = &m_ofBytes.emplace_back(LazyRegex<string>{m_regexes, *pattern});
-        test.compare = [](void const* payload, void const* other) {
-            auto const& regex = *static_cast<LazyRegex<string> const*>(other);
-            return regex.regexes.ofBytes(regex.pattern)
-                .matches(*static_cast<string const*>(payload));
-        };
-    }
-    else
-    {
-        test.other = &m_ofUnits.emplace_back(LazyRegex<ustring>{m_regexes, *pattern});
-        test.compare = [](void const* payload, void const* other) {
-            auto const& regex = *static_cast<LazyRegex<ustring> const*>(other);
-            return regex.regexes.ofUnits(regex.pattern)
-                .isFoundIn(*static_cast<ustring const*>(payload));
-        };
-    }
+    auto& regexes = std::get<std::deque<LazyRegex<Text>>>(m_lazyRegexes);
+    test.other = &regexes.emplace_back(LazyRegex<Text>{m_regexes, *pattern});
+    test.compare = [](void const* payload, void const* other) {
+        return static_cast<LazyRegex<Text> const*>(other)->matches(
+            *static_cast<Text const*>(payload));
+    };
     return test;
 }
 

@@ -7,6 +7,7 @@
 
 #include <cstdint>
 #include <deque>
+#include <tuple>
 
 namespace tarn::kiln::internal {
 
@@ -59,8 +60,16 @@ public:
     /// A pattern that is compiled when a text is first matched.
     template <class Text> struct LazyRegex
     {
+        bool matches(Text const& text) const
+        {
+            if (!compiled)
+                compiled = &regexes.compiled(pattern);
+            return RegexCache::matches(*compiled, text);
+        }
+
         RegexCache& regexes;
         Text const& pattern;
+        mutable RegexCache::Compiled<Text> const* compiled = nullptr;
     };
 
 private:
@@ -74,7 +83,6 @@ private:
 
     RegexCache& m_regexes;
     std::deque<int> m_numbers;
-    std::deque<LazyRegex<string>> m_ofBytes;
-    std::deque<LazyRegex<ustring>> m_ofUnits;
+    std::tuple<std::deque<LazyRegex<string>>, std::deque<LazyRegex<ustring>>> m_lazyRegexes;
 };
 }  // namespace tarn::kiln::internal
