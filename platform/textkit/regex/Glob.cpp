@@ -80,6 +80,12 @@ std::optional<bool> Glob::isFoundIn(std::u16string_view subject, std::int64_t mo
     auto part = m_parts.begin();
     for (std::size_t at = 0; at < subject.size();)
     {
+        if (part == m_parts.begin() && part->first() != Part::ANY_CHARACTER)
+        {
+            at = subject.find(part->first(), at);
+            if (at == NONE)
+                return false;
+        }
         std::size_t compared = 0;
         std::size_t const behind = part->matchAt(subject, at, compared);
         mostSteps -= static_cast<std::int64_t>(compared);

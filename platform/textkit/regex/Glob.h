@@ -36,6 +36,8 @@ private:
 
         explicit Part(std::u16string_view units) : m_units(units) {}
 
+        char16_t first() const { return m_units.front(); }
+
         /// The place behind the part if it stands at `at`, else `npos`. Adds to `compared` how many
         /// of its characters were looked at.
         std::size_t matchAt(std::u16string_view subject, std::size_t at,
