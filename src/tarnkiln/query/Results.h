@@ -24,6 +24,8 @@ namespace tarn::kiln::query {
 /// the query. An element without generated code is no `C` and gives an empty handle.
 ///
 /// The query must outlive the range.
+///
+/// Threads: as the query and its model.
 template <class... C> class Results
 {
 public:
@@ -66,9 +68,8 @@ public:
     Row const* operator->() const { return &m_row; }
     Iterator& operator++()
     {
-        std::vector<ModelElement> elements;
-        m_hasRow = m_rows->next(elements);
-        m_row = m_hasRow ? typed(elements, std::index_sequence_for<C...>()) : Row();
+        m_hasRow = m_rows->next(m_elements);
+        m_row = m_hasRow ? typed(m_elements, std::index_sequence_for<C...>()) : Row();
         return *this;
     }
     void operator++(int) { ++*this; }
@@ -82,6 +83,7 @@ private:
     }
 
     std::unique_ptr<ReflectiveQuery::ResultIterator> m_rows;
+    std::vector<ModelElement> m_elements;  ///< Of the row; its memory serves all rows.
     Row m_row;
     bool m_hasRow = false;
 };
