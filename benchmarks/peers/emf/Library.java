@@ -1,3 +1,4 @@
+import org.eclipse.emf.common.util.URI;
 import org.eclipse.emf.ecore.EAttribute;
 import org.eclipse.emf.ecore.EClass;
 import org.eclipse.emf.ecore.EClassifier;
@@ -19,6 +20,7 @@ final class Library {
     static final EClass LIBRARY = newClass("Library");
     static final EClass BOOK = newClass("Book");
     static final EClass AUTHOR = newClass("Author");
+    static final EAttribute NAME = attribute(LIBRARY, "name", EcorePackage.Literals.ESTRING);
     static final EAttribute TITLE = attribute(BOOK, "title", EcorePackage.Literals.ESTRING);
     static final EAttribute PAGES = attribute(BOOK, "pages", EcorePackage.Literals.EINT);
     static final EAttribute PRICE = attribute(BOOK, "price", EcorePackage.Literals.EDOUBLE);
@@ -30,6 +32,9 @@ final class Library {
     static final EReference BOOKS_BY = reference(AUTHOR, "books", BOOK, -1, false);
     static final EReference NEXT = reference(BOOK, "next", BOOK, 1, false);
     static final EReference PREVIOUS = reference(BOOK, "previous", BOOK, 1, false);
+    /** What refers to a book of another resource. */
+    static final EClass CARD = newClass("Card");
+    static final EReference CARD_BOOK = reference(CARD, "book", BOOK, 1, false);
 
     static {
         opposites(BOOKS, LIBRARY_OF);
@@ -39,27 +44,43 @@ final class Library {
         pack.setName("library");
         pack.setNsPrefix("library");
         pack.setNsURI("http://tarnkiln.invalid/benchmarks/library");
-        pack.getEClassifiers().addAll(List.of(LIBRARY, BOOK, AUTHOR));
+        pack.getEClassifiers().addAll(List.of(LIBRARY, BOOK, AUTHOR, CARD));
     }
 
-    final Resource resource = new Resource();
+    final Resource resource = new Resource(URI.createURI("books:library"));
     final EObject library = EcoreUtil.create(LIBRARY);
     final EObject secondLibrary = EcoreUtil.create(LIBRARY);
     final EObject[] books;
     final String[] ids;
-    private final String[] titles;
+    private String[] titles;
 
+    /** Two libraries without books. */
     Library(int size) {
         resource.getContents().add(library);
         resource.getContents().add(secondLibrary);
         books = new EObject[size];
         ids = new String[size];
-        titles = new String[size];
-        for (int i = 0; i < size; ++i)
+    }
+
+    static Library filled(int size) {
+        Library made = new Library(size);
+        made.makeTitles();
+        made.fill();
+        return made;
+    }
+
+    void makeTitles() {
+        titles = new String[books.length];
+        for (int i = 0; i < titles.length; ++i)
             titles[i] = title(i);
     }
 
-    /** Fills the library: the workload "create". */
+    /** Leaves the titles to the books. */
+    void dropTitles() {
+        titles = null;
+    }
+
+    /** Fills the first library, the workload "create". */
     void fill() {
         List<EObject> contents = list(library, BOOKS);
         EObject author = null;
@@ -68,17 +89,17 @@ final class Library {
                 author = addAuthor(i / BOOKS_PER_AUTHOR);
             EObject book = EcoreUtil.create(BOOK);
             book.eSet(TITLE, titles[i]);
-            book.eSet(PAGES, pages(i));
+            book.eSet(PAGES, pages(i, 0));
             book.eSet(PRICE, 0.5 * i);
             contents.add(book);
             book.eSet(AUTHOR_OF, author);
             if (i > 0)
-                books[i - 1].eSet(NEXT, book);
+                book.eSet(PREVIOUS, books[i - 1]);
             books[i] = book;
         }
     }
 
-    /** Reads the UUIDs, outside of what is measured. */
+    /** Reads the UUIDs, by which books are found. */
     void readIds() {
         for (int i = 0; i < books.length; ++i)
             ids[i] = resource.getURIFragment(books[i]);
@@ -95,8 +116,9 @@ final class Library {
         return "Book" + Integer.toString(1000000 + i % 1000000).substring(1);
     }
 
-    static int pages(int i) {
-        return (int) ((i * 7919L) % 1000) + 1;
+    /** From 1 to 1000, evenly; other ones in the next turn. */
+    static int pages(int i, int turn) {
+        return (int) ((i * 7919L + turn) % 1000) + 1;
     }
 
     @SuppressWarnings("unchecked")
@@ -106,6 +128,10 @@ final class Library {
 
     /** A resource that gives each object a UUID and finds it by that. */
     static final class Resource extends XMIResourceImpl {
+        Resource(URI uri) {
+            super(uri);
+        }
+
         @Override
         protected boolean useUUIDs() {
             return true;
