@@ -9,21 +9,21 @@ final class Access {
         int[] order = measure.order;
         int size = measure.size;
         long[] sum = new long[1];
-        measure.measure("read in order", () -> Measure.time(() -> {
+        measure.measure("read in order", () -> Clock.time(() -> {
             for (EObject book : books)
                 sum[0] += (Integer) book.eGet(Library.PAGES);
         }) / size);
-        measure.measure("read at random", () -> Measure.time(() -> {
+        measure.measure("read at random", () -> Clock.time(() -> {
             for (int i : order)
                 sum[0] += (Integer) books[i].eGet(Library.PAGES);
         }) / size);
         int[] turn = new int[1];
         measure.measure("set", () -> {
             ++turn[0];
-            return Measure.time(() -> setPages(books, turn[0])) / size;
+            return Clock.time(() -> setPages(books, turn[0])) / size;
         });
         library.readIds();
-        measure.measure("find by UUID", () -> Measure.time(() -> {
+        measure.measure("find by UUID", () -> Clock.time(() -> {
             for (int i : order)
                 sum[0] += library.resource.getEObject(library.ids[i]) == books[i] ? 1 : 0;
         }) / size);

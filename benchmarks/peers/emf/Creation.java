@@ -10,7 +10,7 @@ final class Creation {
             Library library = new Library(measure.size);
             library.makeTitles();
             System.gc();  // of the round before
-            return Measure.time(library::fill) / measure.size;
+            return Clock.time(library::fill) / measure.size;
         });
     }
 

@@ -29,7 +29,7 @@ final class Deletion {
                 int first = Math.max(0, gone.size() - inBlock);
                 Library.list(library.library, Library.BOOKS)
                     .removeAll(new HashSet<>(gone.subList(0, first)));
-                taken += Measure.time(() -> gone.listIterator(first).forEachRemaining(
+                taken += Clock.time(() -> gone.listIterator(first).forEachRemaining(
                     EcoreUtil::remove));
                 measured += gone.size() - first;
             }

@@ -6,7 +6,7 @@ import java.util.Random;
 import java.util.function.DoubleSupplier;
 import java.util.function.Supplier;
 
-/** The clock of all workloads: which are wanted, how often they run, and what is printed of them. */
+/** How workloads are measured: which are wanted, how often they run, and what is printed. */
 final class Measure {
     private static final int WARM_UP_ROUNDS = 5;
     private static final int ROUNDS = 5;
@@ -28,13 +28,6 @@ final class Measure {
             numbers.add(i);
         Collections.shuffle(numbers, new Random(1));
         order = numbers.stream().mapToInt(Integer::intValue).toArray();
-    }
-
-    /** The nanoseconds of one run of `body`. */
-    static double time(Runnable body) {
-        long begin = System.nanoTime();
-        body.run();
-        return System.nanoTime() - begin;
     }
 
     /** Ends the program if a workload did not do what it should. */
@@ -74,7 +67,7 @@ final class Measure {
         List<double[]> figures = new ArrayList<>();
         double[] spent = {0};
         while (figures.size() < rounds || (spent[0] < nanoseconds && figures.size() < MOST_ROUNDS))
-            spent[0] += time(() -> figures.add(round.get()));
+            spent[0] += Clock.time(() -> figures.add(round.get()));
         return figures;
     }
 

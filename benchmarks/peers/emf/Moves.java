@@ -45,10 +45,10 @@ final class Moves {
         measure.measure(List.of("move " + way, "undo moves " + way), () -> {
             ChangeDescription[] recorded = new ChangeDescription[1];
             System.gc();  // of the round before
-            double moved = Measure.time(
+            double moved = Clock.time(
                 () -> recorded[0] = Recording.record(library, () -> move.accept(count)));
             Measure.require(to.size() == count, "books have moved");
-            double undone = Measure.time(recorded[0]::apply);
+            double undone = Clock.time(recorded[0]::apply);
             Measure.require(to.isEmpty() && from.size() == measure.size, "books are back");
             return new double[] {moved / count, undone / count};
         });

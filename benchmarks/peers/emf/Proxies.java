@@ -32,13 +32,13 @@ final class Proxies {
         measure.measure(resolve, () -> {
             proxies.referByProxies();
             System.gc();  // of the round before
-            return Measure.time(proxies::readAll) / measure.size;
+            return Clock.time(proxies::readAll) / measure.size;
         });
         proxies.referByProxies();
         proxies.readAll();
-        measure.measure(again, () -> Measure.time(proxies::readAll) / measure.size);
+        measure.measure(again, () -> Clock.time(proxies::readAll) / measure.size);
         proxies.moveCards();
-        measure.measure(local, () -> Measure.time(proxies::readAll) / measure.size);
+        measure.measure(local, () -> Clock.time(proxies::readAll) / measure.size);
     }
 
     private EObject[] makeCards(ResourceSet resources, String name) {

@@ -27,7 +27,7 @@ final class Queries {
     private static void measure(Measure measure, String workload, int rows, IntSupplier walk) {
         measure.measure(workload, () -> {
             int[] found = new int[1];
-            double taken = Measure.time(() -> found[0] = walk.getAsInt());
+            double taken = Clock.time(() -> found[0] = walk.getAsInt());
             Measure.require(found[0] == rows, "the right number of rows");
             return taken / measure.size;
         });

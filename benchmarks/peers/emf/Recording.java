@@ -18,16 +18,16 @@ final class Recording {
             ++turn[0];
             Object before = books[size - 1].eGet(Library.PAGES);
             ChangeDescription[] recorded = new ChangeDescription[1];
-            double set = Measure.time(
+            double set = Clock.time(
                 () -> recorded[0] = record(library, () -> Access.setPages(books, turn[0])));
-            double undone = Measure.time(recorded[0]::apply);
+            double undone = Clock.time(recorded[0]::apply);
             Measure.require(before.equals(books[size - 1].eGet(Library.PAGES)), "pages are back");
             return new double[] {set / size, undone / size};
         });
         measure.measure("one recorded set", () -> {
             ++turn[0];
             int i = turn[0] % size;
-            return Measure.time(() -> record(
+            return Clock.time(() -> record(
                 library, () -> books[i].eSet(Library.PAGES, Library.pages(i, turn[0]))));
         });
     }

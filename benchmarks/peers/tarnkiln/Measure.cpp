@@ -6,6 +6,8 @@
 #include <numeric>
 #include <random>
 
+#include <time.h>
+
 namespace peers {
 namespace {
 
@@ -61,6 +63,13 @@ void Measure::floor(char const* workload, Round const& round) const
 void Measure::floor(std::vector<char const*> const& workloads, RoundOfSeveral const& round) const
 {
     measure("floor", workloads, round);
+}
+
+double Measure::now()
+{
+    timespec passed{};
+    clock_gettime(CLOCK_THREAD_CPUTIME_ID, &passed);
+    return static_cast<double>(passed.tv_sec) * 1e9 + static_cast<double>(passed.tv_nsec);
 }
 
 void Measure::measure(char const* side, std::vector<char const*> const& workloads,

@@ -1,7 +1,6 @@
 /// \file
-/// The clock of all workloads: which are wanted, how often they run, and what is printed of them.
+/// How workloads are measured: which are wanted, how often they run, and what is printed.
 #pragma once
-#include <chrono>
 #include <cstddef>
 #include <functional>
 #include <string>
@@ -33,7 +32,7 @@ public:
     void floor(char const* workload, Round const& round) const;
     void floor(std::vector<char const*> const& workloads, RoundOfSeveral const& round) const;
 
-    /// The nanoseconds that `body` takes.
+    /// The nanoseconds of processor time that `body` takes.
     template <class Body> static double time(Body const& body);
     /// The same for each of the books, to which `body` does something each.
     template <class Body> double timeEach(Body const& body) const;
@@ -43,6 +42,7 @@ public:
     static void require(bool holds, char const* what);
 
 private:
+    static double now();
     void measure(char const* side, std::vector<char const*> const& workloads,
                  RoundOfSeveral const& round) const;
 
@@ -53,10 +53,9 @@ private:
 
 template <class Body> double Measure::time(Body const& body)
 {
-    auto const begin = std::chrono::steady_clock::now();
+    double const begin = now();
     body();
-    std::chrono::duration<double, std::nano> const taken = std::chrono::steady_clock::now() - begin;
-    return taken.count();
+    return now() - begin;
 }
 
 template <class Body> double Measure::timeEach(Body const& body) const
