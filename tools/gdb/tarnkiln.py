@@ -167,10 +167,36 @@ class Collection:
         return hint() if hint else None
 
 
+class SequenceEntries:
+    """The entries of a sequence, leaf by leaf."""
+
+    def __init__(self, value):
+        self.value = value
+
+    def to_string(self):
+        return f"entries of length {int(self.value['m_size'])}"
+
+    def children(self):
+        if self.value["m_root"]:
+            for number, entry in enumerate(self.below(self.value["m_root"])):
+                yield f"[{number}]", entry
+
+    def below(self, node):
+        count = int(node["count"])
+        if int(node["level"]) == 0:
+            entries = (node + 1).cast(gdb.lookup_type(NAMESPACE + "ModelElement").pointer())
+            yield from ((entries + i).dereference() for i in range(count))
+            return
+        inner = gdb.lookup_type(NAMESPACE + "support::SequenceEntries::Inner").pointer()
+        for i in range(count):
+            yield from self.below(node.cast(inner)["children"][i])
+
+
 class Printers(gdb.printing.PrettyPrinter):
     """Finds the printer of a value by its class, or by the class that it derives from."""
 
-    EXACT = {"boost::uuids::uuid": Uuid, NAMESPACE + "Value": Value}
+    EXACT = {"boost::uuids::uuid": Uuid, NAMESPACE + "Value": Value,
+             NAMESPACE + "support::SequenceEntries": SequenceEntries}
     DERIVED = ((NAMESPACE + "ElementHandle", Handle),
                (NAMESPACE + "AbstractOwnedCollection", Collection))
 

@@ -2,6 +2,6 @@
 
 namespace tarn::kiln {
 
-template class TypedReferenceCollection<ModelElement, std::vector<ModelElement>>;
+template class TypedReferenceCollection<ModelElement, support::SequenceEntries>;
 template class ElementSequence<ModelElement>;
 }  // namespace tarn::kiln

@@ -3,11 +3,13 @@
 #pragma once
 #include "tarnkiln/collections/GenericSequenceInterface.h"
 #include "tarnkiln/collections/SaturatedBloomFilter.h"
+#include "tarnkiln/collections/SequenceEntries.h"
 #include "tarnkiln/collections/SequenceIterator.h"
 #include "tarnkiln/collections/TypedReferenceCollection.h"
 
 #include <algorithm>
 #include <memory>
+#include <optional>
 #include <utility>
 #include <vector>
 
@@ -18,9 +20,9 @@ namespace tarn::kiln {
 /// A proxy is resolved in its place when it is read. A sequence with an opposite is unique,
 /// whatever it was told. Positions count from 0 and are trusted.
 template <class T>
-class TARNKILN_EXPORT ElementSequence : public TypedReferenceCollection<T, std::vector<T>>
+class TARNKILN_EXPORT ElementSequence : public TypedReferenceCollection<T, support::SequenceEntries>
 {
-    using Base = TypedReferenceCollection<T, std::vector<T>>;
+    using Base = TypedReferenceCollection<T, support::SequenceEntries>;
 
 public:
     class GenericSequence;
@@ -49,7 +51,7 @@ public:
     T const& at(std::size_t index) const;
     T const& operator[](std::size_t index) const { return at(index); }
     const_iterator begin() const { return {*this, 0}; }
-    const_iterator end() const { return {*this, m_entries.size()}; }
+    const_iterator end() const { return {*this, size()}; }
     /// Whether `element` counts as an entry. In a one-to-many association its own reference to the
     /// owner decides. False for null, destroyed elements and proxies.
     bool contains(ModelElement const& element) const;
@@ -103,6 +105,7 @@ protected:
     // ReferenceCollection
     void basicAdd(ModelElement const& element) override;
     void basicRemove(ModelElement const& element) override;
+    void basicCopyValues(ReferenceCollection const& other) override;
     bool basicContainsProxyTo(ModelElement const& target) override;
 
     /// Puts `element`, which is live and not an entry, in the place of the entry at `index`.
@@ -112,15 +115,24 @@ protected:
     using Base::m_owner;
 
 private:
+    friend class support::SequenceIterator<T>;
+
+    T const& entryAt(std::size_t index) const { return static_cast<T const&>(m_entries[index]); }
+    bool isProxyAt(std::size_t index) const
+    {
+        return m_entries.mayHoldProxies() && Base::isProxy(m_entries[index]);
+    }
     void resolveAt(std::size_t index) const;
-    std::size_t find(ModelElement const& element, std::size_t likelyIndex = 0) const;
-    std::size_t findForRemoval(ModelElement const& element) const;
+    std::size_t find(ModelElement const& element, std::size_t likelyIndex) const;
+    std::size_t findForChange(ModelElement const& element) const;
+    std::optional<bool> containsWithoutSearch(ModelElement const& element) const;
+    bool containsForChange(ModelElement const& element) const;
     void countIn(ModelElement const& element) const;
     void countOut(ModelElement const& element) const;
 
     bool const m_unique;
     std::unique_ptr<SaturatedBloomFilter> m_filter;  ///< Counts what is in here and no proxy.
-    std::unique_ptr<GenericSequence> m_generic;
+    mutable GenericSequence m_generic;
 };
 
 /// The view of a sequence for code that knows no element class.
@@ -188,7 +200,7 @@ ElementSequence<T>::ElementSequence(ModelElement::Impl* owner, bool unique, Feat
                                     Feature const& opposite)
     : Base(owner, feature, opposite),
       m_unique(unique || opposite),
-      m_generic(std::make_unique<GenericSequence>(*this))
+      m_generic(*this)
 {}
 
 template <class T> ElementSequence<T>::~ElementSequence() = default;
@@ -196,10 +208,18 @@ template <class T> ElementSequence<T>::~ElementSequence() = default;
 template <class T> T const& ElementSequence<T>::at(std::size_t index) const
 {
     resolveAt(index);
-    return m_entries[index];
+    return entryAt(index);
 }
 
 template <class T> bool ElementSequence<T>::contains(ModelElement const& element) const
+{
+    std::optional<bool> const known = containsWithoutSearch(element);
+    return known ? *known : indexOf(element) != size();
+}
+
+/// What can be told without a look at the entries.
+template <class T>
+std::optional<bool> ElementSequence<T>::containsWithoutSearch(ModelElement const& element) const
 {
     if (!element || Base::isProxy(element))
         return false;
@@ -207,12 +227,19 @@ template <class T> bool ElementSequence<T>::contains(ModelElement const& element
         return Base::isReferredBackBy(element);
     if (m_filter && !m_filter->contains(element.getImpl()->getUuid()))
         return false;
-    return find(element) != m_entries.size();
+    return std::nullopt;
+}
+
+/// The same as `contains`, for an element that is about to be added.
+template <class T> bool ElementSequence<T>::containsForChange(ModelElement const& element) const
+{
+    std::optional<bool> const known = containsWithoutSearch(element);
+    return known ? *known : findForChange(element) != size();
 }
 
 template <class T> std::size_t ElementSequence<T>::indexOf(ModelElement const& element) const
 {
-    return find(element);
+    return m_entries.findFirst(element);
 }
 
 template <class T> void ElementSequence<T>::push_back(T const& element)
@@ -220,7 +247,7 @@ template <class T> void ElementSequence<T>::push_back(T const& element)
     if (!element || Base::isOwnerDead())
         return;
     Base::checkCompatibleModel(Base::implOf(element));
-    if (m_unique && contains(element))
+    if (m_unique && containsForChange(element))
         return;
 
     T const added = element;
@@ -237,16 +264,16 @@ template <class T> std::size_t ElementSequence<T>::insert(std::size_t index, T c
     Base::checkCompatibleModel(Base::implOf(element));
     if (m_unique)
     {
-        std::size_t const present = find(element);
-        if (present != m_entries.size())
+        std::size_t const present = findForChange(element);
+        if (present != size())
             return present;
     }
 
     T const added = element;
     AbstractOwnedCollection::Operation operation(*this);
     Base::modifying();
-    std::size_t const place = std::min(index, m_entries.size());
-    m_entries.insert(m_entries.begin() + static_cast<std::ptrdiff_t>(place), added);
+    std::size_t const place = std::min(index, size());
+    m_entries.insert(place, added);
     Base::linkAdded(added);
     countIn(added);
     operation.commit();
@@ -262,7 +289,7 @@ template <class T> void ElementSequence<T>::replace(std::size_t index, T const& 
         return;
     if (!element)
         Base::reportCannotAddNonExistentObject();
-    if (m_unique && contains(element))
+    if (m_unique && containsForChange(element))
         Base::reportCannotAddSecondObject();
     replaceElement(index, element);
 }
@@ -275,7 +302,7 @@ void ElementSequence<T>::replaceElement(std::size_t index, ModelElement const& e
     AbstractOwnedCollection::Operation operation(*this);
     Base::modifying();
     resolveAt(index);
-    T const removed = m_entries[index];
+    T const removed = entryAt(index);
     if (m_owner && Base::getOpposite())
     {
         if (!Base::isProxy(added))
@@ -289,7 +316,9 @@ void ElementSequence<T>::replaceElement(std::size_t index, ModelElement const& e
     countOut(removed);
     countIn(added);
     // Linking may have taken an earlier entry of the same element out.
-    m_entries[find(removed, index)] = added;
+    std::size_t const place = find(removed, index);
+    if (place != size())
+        m_entries.exchange(place, added);
     operation.commit();
 }
 
@@ -300,8 +329,8 @@ template <class T> void ElementSequence<T>::ensureAt(std::size_t index, T const&
     std::size_t const present = insert(index, element);
     AbstractOwnedCollection::Operation operation(*this);
     Base::modifying();
-    if (index < m_entries.size() && present < m_entries.size())
-        std::swap(m_entries[present], m_entries[index]);
+    if (index < size() && present < size())
+        m_entries.swapEntries(present, index);
     operation.commit();
 }
 
@@ -314,17 +343,24 @@ template <class T> void ElementSequence<T>::erase(std::size_t index)
     if (Base::hasUpkeep())
     {
         resolveAt(index);
-        Base::unlinkRemoved(m_entries[index]);
+        T const removed = entryAt(index);
+        Base::unlinkRemoved(removed);
     }
     countOut(m_entries[index]);
-    T const released = std::move(m_entries[index]);
-    m_entries.erase(m_entries.begin() + static_cast<std::ptrdiff_t>(index));
+    ModelElement const released = m_entries.take(index);
     operation.commit();
 }
 
 template <class T> void ElementSequence<T>::remove(ModelElement const& element)
 {
-    for (std::size_t index = 0; index < m_entries.size(); ++index)
+    if (!m_entries.mayHoldProxies())
+    {
+        std::size_t const place = findForChange(element);
+        if (place != size())
+            erase(place);
+        return;
+    }
+    for (std::size_t index = 0; index < size(); ++index)
     {
         if (at(index) == element)
             return erase(index);
@@ -339,55 +375,59 @@ template <class T> void ElementSequence<T>::clear()
     Base::modifying();
     if (Base::hasUpkeep() || m_filter)
     {
-        for (std::size_t index = 0; index < m_entries.size(); ++index)
+        for (std::size_t index = 0; index < size(); ++index)
         {
             if (Base::hasUpkeep())
             {
                 resolveAt(index);
-                Base::unlinkRemoved(m_entries[index]);
+                T const removed = entryAt(index);
+                Base::unlinkRemoved(removed);
             }
             countOut(m_entries[index]);
         }
     }
-    std::vector<T> const released = std::exchange(m_entries, {});
+    support::SequenceEntries const released = std::exchange(m_entries, support::SequenceEntries());
     operation.commit();
 }
 
 template <class T> void ElementSequence<T>::setFilter(std::unique_ptr<SaturatedBloomFilter> filter)
 {
     m_filter = std::move(filter);
-    for (T const& entry : m_entries)
-        countIn(entry);
+    m_entries.forEach([&](ModelElement const& entry) { countIn(entry); });
 }
 
 template <class T> std::vector<ModelElement> ElementSequence<T>::getAllValues() const
 {
+    if (!m_entries.mayHoldProxies())
+        return getAllValuesAndProxies();
     std::vector<ModelElement> result;
-    result.reserve(m_entries.size());
-    for (std::size_t index = 0; index < m_entries.size(); ++index)
+    result.reserve(size());
+    for (std::size_t index = 0; index < size(); ++index)
     {
-        resolveAt(index);
-        if (!Base::isProxy(m_entries[index]))
-            result.push_back(m_entries[index]);
+        T const& entry = at(index);
+        if (!Base::isProxy(entry))
+            result.push_back(entry);
     }
     return result;
 }
 
 template <class T> std::vector<ModelElement> ElementSequence<T>::getAllValuesAndProxies() const
 {
-    return {m_entries.begin(), m_entries.end()};
+    std::vector<ModelElement> result;
+    m_entries.appendTo(result);
+    return result;
 }
 
 template <class T> GenericCollectionInterface* ElementSequence<T>::getGenericInterface() const
 {
-    return m_generic.get();
+    return &m_generic;
 }
 
 template <class T>
 void ElementSequence<T>::replaceProxy(ModelElement const& element, unsigned long index)
 {
     T const added = Base::toEntry(element);
-    T const removed = std::exchange(m_entries[index], added);
+    ModelElement const removed = m_entries.exchange(index, added);
     countOut(removed);
     countIn(added);
     Base::linkAdded(added);
@@ -395,15 +435,15 @@ void ElementSequence<T>::replaceProxy(ModelElement const& element, unsigned long
 
 template <class T> void ElementSequence<T>::resolveAll()
 {
-    for (std::size_t index = 0; index < m_entries.size(); ++index)
+    for (std::size_t index = 0; m_entries.mayHoldProxies() && index < size(); ++index)
         resolveAt(index);
 }
 
 template <class T> void ElementSequence<T>::resolveLocal()
 {
-    for (std::size_t index = 0; index < m_entries.size(); ++index)
+    for (std::size_t index = 0; m_entries.mayHoldProxies() && index < size(); ++index)
     {
-        if (Base::isProxy(m_entries[index]) && !Base::namesModel(m_entries[index]))
+        if (isProxyAt(index) && !Base::namesModel(m_entries[index]))
             resolveAt(index);
     }
 }
@@ -413,34 +453,45 @@ template <class T> void ElementSequence<T>::basicAdd(ModelElement const& element
     T const added = Base::toEntry(element);
     AbstractOwnedCollection::Operation operation(*this);
     Base::modifying();
-    m_entries.push_back(added);
+    m_entries.append(added);
     countIn(added);
     operation.commit();
 }
 
 template <class T> void ElementSequence<T>::basicRemove(ModelElement const& element)
 {
-    std::size_t const index = findForRemoval(element);
-    if (index == m_entries.size())
+    std::size_t const index = findForChange(element);
+    if (index == size())
         return;
     AbstractOwnedCollection::Operation operation(*this);
     Base::modifying();
-    T const released = std::move(m_entries[index]);
-    m_entries.erase(m_entries.begin() + static_cast<std::ptrdiff_t>(index));
+    ModelElement const released = m_entries.take(index);
     countOut(released);
+    operation.commit();
+}
+
+/// A snapshot shares what it copies. Other copies don't, for only one of those that share may have
+/// its entries found fast.
+template <class T> void ElementSequence<T>::basicCopyValues(ReferenceCollection const& other)
+{
+    support::SequenceEntries const& present = static_cast<ElementSequence const&>(other).m_entries;
+    support::SequenceEntries copy = m_owner ? present.duplicate() : present;
+    AbstractOwnedCollection::Operation operation(*this);
+    Base::modifying();
+    m_entries.swap(copy);
     operation.commit();
 }
 
 template <class T> bool ElementSequence<T>::basicContainsProxyTo(ModelElement const& target)
 {
-    if (!m_owner || !target || Base::isProxy(target))
+    if (!m_owner || !target || Base::isProxy(target) || !m_entries.mayHoldProxies())
         return false;
-    for (T& entry : m_entries)
+    for (std::size_t index = 0; index < size(); ++index)
     {
-        if (Base::isProxy(entry) && Base::peekResolveProxy(entry) == target)
+        if (isProxyAt(index) && Base::peekResolveProxy(m_entries[index]) == target)
         {
-            entry = Base::toEntry(target);
-            countIn(entry);
+            m_entries.exchange(index, Base::toEntry(target));
+            countIn(target);
             return true;
         }
     }
@@ -450,17 +501,17 @@ template <class T> bool ElementSequence<T>::basicContainsProxyTo(ModelElement co
 /// Puts the element that a proxy names in its place, unless the other end does not refer back.
 template <class T> void ElementSequence<T>::resolveAt(std::size_t index) const
 {
-    if (!Base::isProxy(m_entries[index]))
+    if (!isProxyAt(index))
         return;
-    T const proxy = m_entries[index];
+    T const proxy = entryAt(index);
     ModelElement const target = Base::resolveEntry(proxy);
     if (!target || !Base::acceptsElement(target))
         return;
     // Resolving may have loaded, and loading may have changed this sequence.
     std::size_t const place = find(proxy, index);
-    if (place == m_entries.size())
+    if (place == size())
         return;
-    m_entries[place] = T::cast(target);
+    m_entries.exchange(place, target);
     countIn(target);
 }
 
@@ -468,28 +519,17 @@ template <class T> void ElementSequence<T>::resolveAt(std::size_t index) const
 template <class T>
 std::size_t ElementSequence<T>::find(ModelElement const& element, std::size_t likelyIndex) const
 {
-    if (likelyIndex < m_entries.size() && m_entries[likelyIndex] == element)
+    if (likelyIndex < size() && m_entries[likelyIndex] == element)
         return likelyIndex;
-    auto const place = std::find_if(m_entries.begin(), m_entries.end(),
-                                    [&](T const& entry) { return entry == element; });
-    return static_cast<std::size_t>(place - m_entries.begin());
+    return m_entries.findFirst(element);
 }
 
-/// The same for an element that leaves: where it can be in here only once, it is looked for from
-/// both ends, since what leaves often came last.
-template <class T>
-std::size_t ElementSequence<T>::findForRemoval(ModelElement const& element) const
+/// The position of an element that is about to leave or to be added. Any will do where it can be in
+/// here only once, and it is often near to the last one. Remembers how to find others.
+template <class T> std::size_t ElementSequence<T>::findForChange(ModelElement const& element) const
 {
-    if (!m_unique || m_filter)
-        return find(element);
-    for (std::size_t front = 0, back = m_entries.size(); front < back; ++front)
-    {
-        if (m_entries[--back] == element)
-            return back;
-        if (m_entries[front] == element)
-            return front;
-    }
-    return m_entries.size();
+    bool const mustBeFirst = !m_unique || m_filter;
+    return m_owner ? m_entries.findForChange(element, mustBeFirst) : m_entries.findFirst(element);
 }
 
 template <class T> void ElementSequence<T>::countIn(ModelElement const& element) const
@@ -504,6 +544,6 @@ template <class T> void ElementSequence<T>::countOut(ModelElement const& element
         m_filter->remove(element.getImpl()->getUuid());
 }
 
-extern template class TypedReferenceCollection<ModelElement, std::vector<ModelElement>>;
+extern template class TypedReferenceCollection<ModelElement, support::SequenceEntries>;
 extern template class ElementSequence<ModelElement>;
 }  // namespace tarn::kiln

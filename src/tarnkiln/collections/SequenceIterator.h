@@ -1,8 +1,11 @@
 /// \file
 /// The iterator of `ElementSequence`.
 #pragma once
+#include "tarnkiln/collections/SequenceEntries.h"
+
 #include <compare>
 #include <cstddef>
+#include <cstdint>
 #include <iterator>
 
 namespace tarn::kiln {
@@ -12,7 +15,8 @@ namespace support {
 
 /// A position in an `ElementSequence`, which resolves the entry there when it is read.
 ///
-/// Does not survive a change of the sequence.
+/// It keeps the entries beside those that it has read at hand, so that walking takes one step an
+/// entry. Does not survive a change of the sequence.
 template <class T> class SequenceIterator
 {
 public:
@@ -31,7 +35,20 @@ public:
     /// The position, counted from 0.
     std::size_t index() const { return static_cast<std::size_t>(m_index); }
 
-    reference operator*() const { return m_sequence->at(index()); }
+    reference operator*() const
+    {
+        SequenceEntries const& entries = m_sequence->m_entries;
+        if (entries.mayHoldProxies())
+            return m_sequence->at(index());
+        if (m_version != entries.version() || index() < m_near.begin || index() >= m_near.end)
+        {
+            m_near = entries.runAt(index());
+            m_version = entries.version();
+            if (!m_near.first)
+                return m_sequence->at(index());
+        }
+        return static_cast<reference>(m_near.first[index() - m_near.begin]);
+    }
     pointer operator->() const { return &**this; }
     reference operator[](difference_type distance) const { return *(*this + distance); }
 
@@ -84,6 +101,8 @@ public:
 private:
     ElementSequence<T> const* m_sequence = nullptr;
     difference_type m_index = 0;
+    mutable SequenceEntries::Run m_near;  ///< Of the entries at `m_version`.
+    mutable std::uint32_t m_version = 0;
 };
 }  // namespace support
 }  // namespace tarn::kiln
