@@ -2,50 +2,61 @@ import org.eclipse.emf.ecore.EObject;
 import org.eclipse.emf.ecore.util.EcoreUtil;
 
 import java.util.ArrayList;
-import java.util.HashSet;
 import java.util.List;
 
 /**
- * Taking every second book out of its library, one by one; references to it stay. Each removal
- * passes the other books, so in large libraries only the last few of each block are measured, and
- * those before them go at once.
+ * Taking every second book out of its library, one by one from the front; references to it stay.
+ * Each removal passes the books before and behind it, and its cost changes evenly from the first one
+ * to the last. So those in the middle, which cost the mean, stand for all.
  */
 final class Deletion {
-    private static final int BLOCKS = 16;
-    /** How often a book is passed at most in what is measured. */
-    private static final long STEPS = 4_000_000_000L;
+    private static final int MOST = 4000;
 
-    private Deletion() {}
+    private final EObject[] books;
+    private final List<EObject> contents;
+    /** The removals are of every second book from `first` on, which stands at `position`. */
+    private final int count;
+    private final int first;
+    private final int position;
 
-    static void measure(Measure measure) {
-        int inBlock = (int) Math.min(measure.size, STEPS / measure.size) / BLOCKS;
-        measure.measure("delete every second book", () -> {
-            Library library = Library.filled(measure.size);
-            System.gc();  // of the round before
-            double taken = 0;
-            int measured = 0;
-            for (int block = 0; block < BLOCKS; ++block) {
-                List<EObject> gone = everySecond(library, block);
-                int first = Math.max(0, gone.size() - inBlock);
-                Library.list(library.library, Library.BOOKS)
-                    .removeAll(new HashSet<>(gone.subList(0, first)));
-                taken += Clock.time(() -> gone.listIterator(first).forEachRemaining(
-                    EcoreUtil::remove));
-                measured += gone.size() - first;
-            }
-            Measure.require(Library.list(library.library, Library.BOOKS).size()
-                == measure.size - measure.size / 2, "half of the books are gone");
-            return taken / measured;
-        });
+    private Deletion(Library library) {
+        books = library.books;
+        contents = Library.list(library.library, Library.BOOKS);
+        count = Math.min(books.length / 2, MOST);
+        first = (books.length / 2 - count) / 2 * 2;
+        position = first / 2;
+        removeThoseBefore();
     }
 
-    private static List<EObject> everySecond(Library library, int block) {
-        long size = library.books.length;
-        List<EObject> books = new ArrayList<>();
-        for (int i = (int) (size * block / BLOCKS); i < size * (block + 1) / BLOCKS; ++i) {
-            if (i % 2 == 1)
-                books.add(library.books[i]);
+    static void measure(Measure measure) {
+        String workload = "delete every second book";
+        if (!measure.wants(workload))
+            return;
+        Deletion deletion = new Deletion(Library.filled(measure.size));
+        measure.measure(workload, deletion::round);
+    }
+
+    private double round() {
+        int before = contents.size();
+        double taken = Clock.time(() -> {
+            for (int i = 0; i < count; ++i)
+                EcoreUtil.remove(books[first + 2 * i + 1]);
+        });
+        Measure.require(contents.size() == before - count, "books are gone");
+        for (int i = 0; i < count; ++i)
+            contents.add(position + 2 * i + 1, books[first + 2 * i + 1]);
+        return taken / count;
+    }
+
+    private void removeThoseBefore() {
+        List<EObject> others = new ArrayList<>();
+        for (int i = 0; i < books.length; ++i) {
+            if (i >= first || i % 2 == 0)
+                others.add(books[i]);
         }
-        return books;
+        contents.clear();
+        contents.addAll(others);
+        Measure.require(contents.get(position) == books[first], "the first book to stay");
+        System.gc();
     }
 }

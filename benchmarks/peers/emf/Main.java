@@ -4,7 +4,7 @@ import java.util.List;
 /**
  * Runs workloads on libraries of the given size and prints a line for each: whose figure it is,
  * its name, and the nanoseconds, or bytes, of one operation.
- * Usage: Main BOOKS [PART-OF-A-NAME...]
+ * Usage: Main BOOKS [NAME...]
  */
 public final class Main {
     private Main() {}

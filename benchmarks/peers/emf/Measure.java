@@ -9,17 +9,17 @@ import java.util.function.Supplier;
 /** How workloads are measured: which are wanted, how often they run, and what is printed. */
 final class Measure {
     private static final int WARM_UP_ROUNDS = 5;
-    private static final int ROUNDS = 5;
+    private static final int ROUNDS = 3;
     private static final int MOST_ROUNDS = 101;
     private static final double WARM_UP_NANOSECONDS = 300e6;
-    private static final double NANOSECONDS = 50e6;
+    private static final double NANOSECONDS = 100e6;
 
     final int size;
     /** The numbers of all books, shuffled. */
     final int[] order;
     private final List<String> wanted;
 
-    /** @param wanted parts of the names of workloads; none for all. */
+    /** @param wanted names of workloads, where "*" at the end stands for anything; none for all. */
     Measure(int size, List<String> wanted) {
         this.size = size;
         this.wanted = wanted;
@@ -37,7 +37,13 @@ final class Measure {
     }
 
     boolean wants(String workload) {
-        return wanted.isEmpty() || wanted.stream().anyMatch(workload::contains);
+        return wanted.isEmpty() || wanted.stream().anyMatch(name -> matches(workload, name));
+    }
+
+    private static boolean matches(String workload, String name) {
+        int length = name.length() - 1;
+        return name.endsWith("*") ? workload.startsWith(name.substring(0, length))
+                                  : workload.equals(name);
     }
 
     /** Prints the median of what `round` gives, the time of one operation. */
@@ -74,7 +80,7 @@ final class Measure {
     /** The bytes of all live objects: collects until two readings agree. */
     static long usedBytes() {
         long last = -1;
-        for (int i = 0; i < 20; ++i) {
+        for (int i = 0; i < 6; ++i) {
             System.gc();
             try {
                 Thread.sleep(20);  // lets the collector's helpers drop what was only weakly held

@@ -1,7 +1,6 @@
 import org.eclipse.emf.common.util.URI;
 import org.eclipse.emf.ecore.EObject;
 import org.eclipse.emf.ecore.InternalEObject;
-import org.eclipse.emf.ecore.resource.ResourceSet;
 import org.eclipse.emf.ecore.resource.impl.ResourceSetImpl;
 import org.eclipse.emf.ecore.util.EcoreUtil;
 
@@ -11,15 +10,13 @@ import java.util.HashMap;
 /** Cards that refer to books: of another resource by UUIDs, which the first read resolves. */
 final class Proxies {
     private final Library library;
-    private final EObject[] cards;
+    private final ResourceSetImpl resources = new ResourceSetImpl();
 
     private Proxies(Library library) {
         this.library = library;
         library.readIds();
-        ResourceSetImpl resources = new ResourceSetImpl();
         resources.setURIResourceMap(new HashMap<>());  // finds resources faster
         resources.getResources().add(library.resource);
-        cards = makeCards(resources, "books:cards");
     }
 
     static void measure(Measure measure) {
@@ -29,44 +26,46 @@ final class Proxies {
         if (!measure.wants(resolve) && !measure.wants(again) && !measure.wants(local))
             return;
         Proxies proxies = new Proxies(Library.filled(measure.size));
+        Library.Resource catalogue = new Library.Resource(URI.createURI("books:cards"));
+        proxies.resources.getResources().add(catalogue);
+        EObject[] elsewhere = proxies.makeCards(catalogue);
         measure.measure(resolve, () -> {
-            proxies.referByProxies();
-            System.gc();  // of the round before
-            return Clock.time(proxies::readAll) / measure.size;
+            proxies.referByProxies(elsewhere);
+            return Clock.time(() -> proxies.readAll(elsewhere)) / measure.size;
         });
-        proxies.referByProxies();
-        proxies.readAll();
-        measure.measure(again, () -> Clock.time(proxies::readAll) / measure.size);
-        proxies.moveCards();
-        measure.measure(local, () -> Clock.time(proxies::readAll) / measure.size);
+        proxies.referByProxies(elsewhere);
+        proxies.readAll(elsewhere);
+        measure.measure(again, () -> Clock.time(() -> proxies.readAll(elsewhere)) / measure.size);
+        EObject[] beside = proxies.makeCards(proxies.library.resource);
+        proxies.referToBooks(beside);
+        measure.measure(local, () -> Clock.time(() -> proxies.readAll(beside)) / measure.size);
     }
 
-    private EObject[] makeCards(ResourceSet resources, String name) {
-        Library.Resource catalogue = new Library.Resource(URI.createURI(name));
-        resources.getResources().add(catalogue);
-        EObject[] made = new EObject[library.books.length];
-        for (int i = 0; i < made.length; ++i)
-            made[i] = EcoreUtil.create(Library.CARD);
-        catalogue.getContents().addAll(Arrays.asList(made));
-        return made;
+    private EObject[] makeCards(Library.Resource resource) {
+        EObject[] cards = new EObject[library.books.length];
+        for (int i = 0; i < cards.length; ++i)
+            cards[i] = EcoreUtil.create(Library.CARD);
+        resource.getContents().addAll(Arrays.asList(cards));
+        return cards;
     }
 
-    private void referByProxies() {
+    private void referToBooks(EObject[] cards) {
+        for (int i = 0; i < cards.length; ++i)
+            cards[i].eSet(Library.CARD_BOOK, library.books[i]);
+    }
+
+    private void referByProxies(EObject[] cards) {
         URI uri = library.resource.getURI();
         for (int i = 0; i < cards.length; ++i) {
             EObject proxy = EcoreUtil.create(Library.BOOK);
             ((InternalEObject) proxy).eSetProxyURI(uri.appendFragment(library.ids[i]));
             cards[i].eSet(Library.CARD_BOOK, proxy);
         }
+        System.gc();  // of the proxies before
     }
 
-    private void readAll() {
+    private void readAll(EObject[] cards) {
         for (int i = 0; i < cards.length; ++i)
             Measure.require(cards[i].eGet(Library.CARD_BOOK) == library.books[i], "the book");
-    }
-
-    /** Puts the cards beside the books that they refer to. */
-    private void moveCards() {
-        library.resource.getContents().addAll(Arrays.asList(cards));
     }
 }

@@ -17,7 +17,7 @@ public:
     /// The same of several workloads that are measured in one round.
     using RoundOfSeveral = std::function<std::vector<double>()>;
 
-    /// \param wanted  parts of the names of workloads; none for all.
+    /// \param wanted  names of workloads, where "*" at the end stands for anything; none for all.
     Measure(std::size_t size, std::vector<std::string> wanted);
 
     std::size_t size() const { return m_size; }

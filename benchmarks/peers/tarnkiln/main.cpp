@@ -1,7 +1,7 @@
 /// \file
 /// Runs workloads on libraries of the given size and prints a line for each figure: whether it is
 /// ours or the floor, the name of the workload, and the nanoseconds, or bytes, of one operation.
-/// Usage: books_of_tarnkiln BOOKS [PART-OF-A-NAME...]
+/// Usage: books_of_tarnkiln BOOKS [NAME...]
 #include "benchmarks/peers/tarnkiln/Workloads.h"
 
 #include <cstdio>
@@ -11,7 +11,7 @@ int main(int count, char** arguments)
 {
     if (count < 2)
     {
-        std::fputs("usage: books_of_tarnkiln BOOKS [PART-OF-A-NAME...]\n", stderr);
+        std::fputs("usage: books_of_tarnkiln BOOKS [NAME...]\n", stderr);
         return 2;
     }
     peers::Measure const measure(std::strtoul(arguments[1], nullptr, 10),
