@@ -12,6 +12,7 @@ namespace {
 
 constexpr unsigned FULL_LEAF = 31;  ///< With its parent behind, a leaf fills what malloc gives.
 constexpr unsigned FULL_INNER = 32;
+constexpr unsigned SMALL_LEAF = 12;  ///< A smaller one looks for a neighbour to join.
 constexpr unsigned MAX_HEIGHT = 16;
 
 /// From how many entries on an index is made, and down to how many it is kept.
@@ -542,7 +543,8 @@ ModelElement SequenceEntries::take(std::size_t index)
     path.addToSizes(~std::uint32_t{0});
     --m_size;
     noteChange(index);
-    shrink(path);
+    if (leaf.count < SMALL_LEAF)
+        shrink(path);
     if (m_size < INDEX_TO)
         m_index.reset();
     return taken;

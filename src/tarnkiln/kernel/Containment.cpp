@@ -17,49 +17,65 @@ namespace {
 /// How many levels of a tree are destroyed inside one another before deeper ones wait.
 constexpr int MAX_DESTRUCTION_DEPTH = 100;
 
+/// An element that is destroyed when the outermost level of its tree ends.
+struct Waiting
+{
+    ModelElement element;
+    ModelElement container; ///< To which the element still points.
+    bool keepIncoming;
+    bool multiModel;
+};
+
 /// The levels of one tree that are being destroyed, and what waits for the outermost of them, so
 /// that a tree of any depth needs little stack.
 struct Destructions
 {
-    struct Waiting
-    {
-        ModelElement element;
-        ModelElement container; ///< To which the element still points.
-        bool keepIncoming;
-        bool multiModel;
-    };
-
     int depth = 0;
-    std::vector<Waiting> waiting;
+    std::vector<Waiting>* waiting = nullptr; ///< Made by the outermost level of a deep tree.
 };
 
-thread_local Destructions destructions;
+/// Holds no object, so that it is found without a test whether it has been made.
+constinit thread_local Destructions destructions;
 
 /// One level.
 class DestructionLevel
 {
 public:
-    DestructionLevel() { ++destructions.depth; }
+    explicit DestructionLevel(Destructions& all)
+        : m_all(all)
+    {
+        ++m_all.depth;
+    }
     DestructionLevel(DestructionLevel const&) = delete;
     DestructionLevel& operator=(DestructionLevel const&) = delete;
     ~DestructionLevel()
     {
-        if (--destructions.depth == 0)
-            destructions.waiting.clear(); // not empty after a failure only
+        if (--m_all.depth == 0)
+            delete std::exchange(m_all.waiting, nullptr); // not empty after a failure only
     }
 
-    static bool isDeepest() { return destructions.depth == MAX_DESTRUCTION_DEPTH; }
     /// Destroys what waits, if this is the outermost level.
     void finish() const
     {
-        while (destructions.depth == 1 && !destructions.waiting.empty()) {
-            Destructions::Waiting const next = std::move(destructions.waiting.back());
-            destructions.waiting.pop_back();
+        while (m_all.depth == 1 && m_all.waiting && !m_all.waiting->empty()) {
+            Waiting const next = std::move(m_all.waiting->back());
+            m_all.waiting->pop_back();
             next.element->destroyRecursively(next.keepIncoming, /*removeFromContainer=*/false,
                                              next.multiModel);
         }
     }
+
+private:
+    Destructions& m_all;
 };
+
+/// Lets an element wait for the outermost level.
+void postpone(Destructions& all, Waiting waiting)
+{
+    if (!all.waiting)
+        all.waiting = new std::vector<Waiting>;
+    all.waiting->push_back(std::move(waiting));
+}
 
 /// Lets a tree that is destroyed by a hook in the middle of another one count its own levels.
 class SeparateDestruction
@@ -71,7 +87,7 @@ public:
     }
     SeparateDestruction(SeparateDestruction const&) = delete;
     SeparateDestruction& operator=(SeparateDestruction const&) = delete;
-    ~SeparateDestruction() { destructions = std::move(m_outer); }
+    ~SeparateDestruction() { destructions = m_outer; }
 
 private:
     Destructions m_outer;
@@ -250,13 +266,13 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
 {
     if (!isLive())
         return;
-    if (DestructionLevel::isDeepest() && !isProxy() && !removeFromContainer) {
-        destructions.waiting.push_back(
-            {ModelElement(this), container(), keepIncoming, multiModel});
+    Destructions& ofThread = destructions; // found once, which takes a call in a shared library
+    if (ofThread.depth == MAX_DESTRUCTION_DEPTH && !isProxy() && !removeFromContainer) {
+        postpone(ofThread, {ModelElement(this), container(), keepIncoming, multiModel});
         return;
     }
     ModelElement const keep(this);
-    DestructionLevel const level;
+    DestructionLevel const level(ofThread);
     if (!isProxy()) {
         aboutToDestroy();
         notifyDestroying();

@@ -51,12 +51,17 @@ void DefaultModelUsageProvider::elementDestroying(ModelElement::Impl* element)
 
 void DefaultModelUsageProvider::clear()
 {
+    m_last = nullptr;
     m_elements.clear();
 }
 
 void DefaultModelUsageProvider::count(ModelElement::Impl const& element, long step)
 {
-    if (meta::Class const& metaClass = element.getMetaClass())
-        m_elements[metaClass] += step;
+    meta::Class const& metaClass = element.getMetaClass();
+    if (!metaClass)
+        return;
+    if (!m_last || m_last->first != metaClass)
+        m_last = &*m_elements.try_emplace(metaClass).first;
+    m_last->second += step;
 }
 } // namespace tarn::kiln

@@ -5,6 +5,7 @@
 #include "tarnkiln/meta/DataModelUsageProvider.h"
 
 #include <unordered_map>
+#include <utility>
 
 namespace tarn::kiln {
 
@@ -25,5 +26,6 @@ private:
 
     /// Elements by class; packages are only looked for when they are asked for.
     std::unordered_map<meta::Class, long, std::hash<ModelElement>> m_elements;
+    std::pair<meta::Class const, long>* m_last = nullptr; ///< The entry that was changed last.
 };
 } // namespace tarn::kiln

@@ -7,6 +7,7 @@
 #include <array>
 #include <cerrno>
 #include <cstdint>
+#include <memory>
 #include <system_error>
 #include <vector>
 
@@ -23,10 +24,24 @@ constexpr int MAX_DELETION_DEPTH = 32;
 struct Deletions
 {
     int depth = 0;
-    std::vector<ElementImpl*> waiting;
+    std::vector<ElementImpl*>* waiting = nullptr;  ///< Made when the first one waits.
 };
 
-thread_local Deletions deletions;
+/// Holds no object, so that it is found without a test whether it has been made.
+constinit thread_local Deletions deletions;
+
+/// Deletes what waits, and what comes to wait meanwhile.
+void deleteWaiting(Deletions& all)
+{
+    std::unique_ptr<std::vector<ElementImpl*>> const waiting(all.waiting);
+    while (!waiting->empty())
+    {
+        ElementImpl* const next = waiting->back();
+        waiting->pop_back();
+        delete next;
+    }
+    all.waiting = nullptr;
+}
 
 /// All of the state from the system's source of randomness. `std::random_device` would ask the
 /// processor for each word, which takes milliseconds on a virtual machine, and that in each thread.
@@ -63,23 +78,19 @@ void ElementImpl::removeRef()
 
 void ElementImpl::deleteThis()
 {
-    if (deletions.depth == MAX_DELETION_DEPTH)
+    Deletions& ofThread = deletions;  // found once, which takes a call in a shared library
+    if (ofThread.depth == MAX_DELETION_DEPTH)
     {
-        deletions.waiting.push_back(this);
+        if (!ofThread.waiting)
+            ofThread.waiting = new std::vector<ElementImpl*>;
+        ofThread.waiting->push_back(this);
         return;
     }
-    ++deletions.depth;
+    ++ofThread.depth;
     delete this;
-    if (deletions.depth == 1)
-    {
-        while (!deletions.waiting.empty())
-        {
-            ElementImpl* const next = deletions.waiting.back();
-            deletions.waiting.pop_back();
-            delete next;
-        }
-    }
-    --deletions.depth;
+    if (ofThread.depth == 1 && ofThread.waiting)
+        deleteWaiting(ofThread);
+    --ofThread.depth;
 }
 
 void ElementImpl::invalidate()

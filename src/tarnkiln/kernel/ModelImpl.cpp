@@ -11,6 +11,7 @@
 #include "tarnkiln/kernel/internal/DeclaredExtensions.h"
 #include "tarnkiln/kernel/internal/LocalTransactionFactoryImpl.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
+#include "tarnkiln/kernel/internal/sortByAddress.h"
 #include "tarnkiln/meta/Package.h"
 #include "tarnkiln/services/ElementIdResolver.h"
 #include "tarnkiln/services/ModelIdNormalizer.h"
@@ -410,15 +411,18 @@ void Model::Impl::destroyAllContents()
 }
 
 /// Top-level elements in their order, in which they also lie in memory more or less, and then what
-/// they contain.
+/// they contain, as it lies in memory.
 std::vector<ModelElement> Model::Impl::getElementsInOrder() const
 {
     std::vector<ModelElement> elements = m_topLevelElements.all();
-    if (elements.size() != m_elements.size()) {
-        m_elements.forEach([&](ModelElement::Impl* element) {
-            if (!m_topLevelElements.contains(element))
-                elements.emplace_back(element);
-        });
+    if (elements.size() == m_elements.size())
+        return elements;
+    std::vector<ModelElement::Impl*> all = getAllElementImpls();
+    internal::sortByAddress(all);
+    elements.reserve(all.size());
+    for (ModelElement::Impl* const element : all) {
+        if (!m_topLevelElements.contains(element))
+            elements.emplace_back(element);
     }
     return elements;
 }

@@ -7,6 +7,7 @@
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 
 #include <algorithm>
+#include <ranges>
 
 namespace tarn::kiln {
 
@@ -15,12 +16,15 @@ using internal::SlotKind;
 
 namespace {
 
+bool holdsElements(internal::ReflectiveSlot const& slot)
+{
+    return slot.kind() == SlotKind::Reference || slot.kind() == SlotKind::References;
+}
+
 /// Whether the slot refers to elements that neither are contained by this one nor contain it.
 bool isPlainReference(internal::ReflectiveSlot const& slot)
 {
-    bool const isReference =
-        slot.kind() == SlotKind::Reference || slot.kind() == SlotKind::References;
-    return isReference && !Feature(slot.property()).isComposite();
+    return holdsElements(slot) && !Feature(slot.property()).isComposite();
 }
 
 bool isDying(ModelElement::Impl const& source, ModelElement const& target)
@@ -123,7 +127,7 @@ void ReflectiveModelElementImpl::disassociateIncoming()
         if (slot.kind() == SlotKind::Reference && !slot.dependents().empty())
             DependentCollections(*this, slot).leave();
     }
-    for (ReflectiveSlot const& slot : layout().slots())
+    for (ReflectiveSlot const& slot : layout().slots() | std::views::filter(holdsElements))
     {
         Feature const opposite = Feature(slot.property()).opposite();
         if (!isPlainReference(slot) || !opposite)
@@ -152,7 +156,11 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
     auto const destroyChild = [&](ModelElement const& child) {
         child->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
     };
-    for (ReflectiveSlot const& slot : layout().slots())
+    auto const isInUse = [&](ReflectiveSlot const& slot) {
+        return slot.kind() == SlotKind::Reference ? basicTarget(slot) != nullptr
+                                                  : slot.kind() == SlotKind::References;
+    };
+    for (ReflectiveSlot const& slot : layout().slots() | std::views::filter(isInUse))
     {
         bool const isComposite = Feature(slot.property()).isComposite();
         if (slot.kind() == SlotKind::Reference && basicTarget(slot))
