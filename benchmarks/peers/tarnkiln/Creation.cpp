@@ -18,11 +18,11 @@ template <class Made> double bytesABook(Made& library)
 
 void measureBytes(Measure const& measure)
 {
-    measure.ours("bytes a book", [&] {
+    measure.oursOnce("bytes a book", [&] {
         Library library(measure.size());
         return bytesABook(library);
     });
-    measure.floor("bytes a book", [&] {
+    measure.floorOnce("bytes a book", [&] {
         PlainLibrary library(Library::titles(measure.size()));
         return bytesABook(library);
     });

@@ -27,6 +27,12 @@ std::vector<std::vector<double>> run(Measure::RoundOfSeveral const& round, std::
     return figures;
 }
 
+void print(char const* side, char const* workload, double figure)
+{
+    std::printf("%s\t%s\t%.3f\n", side, workload, figure);
+    std::fflush(stdout);
+}
+
 bool matches(std::string_view workload, std::string_view name)
 {
     if (!name.ends_with('*'))
@@ -72,6 +78,22 @@ void Measure::floor(std::vector<char const*> const& workloads, RoundOfSeveral co
     measure("floor", workloads, round);
 }
 
+void Measure::oursOnce(char const* workload, Round const& round) const
+{
+    measureOnce("ours", workload, round);
+}
+
+void Measure::floorOnce(char const* workload, Round const& round) const
+{
+    measureOnce("floor", workload, round);
+}
+
+void Measure::measureOnce(char const* side, char const* workload, Round const& round) const
+{
+    if (wants(workload))
+        print(side, workload, round());
+}
+
 double Measure::now()
 {
     timespec passed{};
@@ -93,9 +115,8 @@ void Measure::measure(char const* side, std::vector<char const*> const& workload
         for (std::vector<double> const& of : figures)
             sorted.push_back(of[i]);
         std::sort(sorted.begin(), sorted.end());
-        std::printf("%s\t%s\t%.3f\n", side, workloads[i], sorted[sorted.size() / 2]);
+        print(side, workloads[i], sorted[sorted.size() / 2]);
     }
-    std::fflush(stdout);
 }
 
 void Measure::keep(long result)

@@ -31,6 +31,9 @@ public:
     /// The same for what plain structs do.
     void floor(char const* workload, Round const& round) const;
     void floor(std::vector<char const*> const& workloads, RoundOfSeveral const& round) const;
+    /// Prints a figure that is the same in each round.
+    void oursOnce(char const* workload, Round const& round) const;
+    void floorOnce(char const* workload, Round const& round) const;
 
     /// The nanoseconds of processor time that `body` takes.
     template <class Body> static double time(Body const& body);
@@ -43,6 +46,7 @@ public:
 
 private:
     static double now();
+    void measureOnce(char const* side, char const* workload, Round const& round) const;
     void measure(char const* side, std::vector<char const*> const& workloads,
                  RoundOfSeveral const& round) const;
 

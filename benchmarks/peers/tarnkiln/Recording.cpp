@@ -36,14 +36,14 @@ void measureBytes(Measure const& measure, FullLibraries& libraries)
         return static_cast<double>(benchkit::liveBytes() - before) /
                static_cast<double>(measure.size());
     };
-    measure.ours(workload, [&] {
+    measure.oursOnce(workload, [&] {
         Library const& library = libraries.ours();
         std::size_t const before = benchkit::liveBytes();
         Transaction const transaction = library.model->beginTransaction(/*revertible=*/true);
         setAll(library, /*turn=*/1);
         return since(before);  // taken back
     });
-    measure.floor(workload, [&] {
+    measure.floorOnce(workload, [&] {
         PlainLibrary const& library = libraries.plain();
         std::size_t const before = benchkit::liveBytes();
         std::vector<OldPages> const record = setAll(library, /*turn=*/1);
