@@ -12,9 +12,9 @@ public final class Main {
     public static void main(String[] arguments) {
         List<String> wanted = Arrays.asList(arguments).subList(1, arguments.length);
         Measure measure = new Measure(Integer.parseInt(arguments[0]), wanted);
-        Creation.measure(measure);
         measureFilled(measure);
         Proxies.measure(measure);
+        Creation.measure(measure);
         Deletion.measure(measure);
     }
 

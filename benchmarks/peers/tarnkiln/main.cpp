@@ -16,7 +16,6 @@ int main(int count, char** arguments)
     }
     peers::Measure const measure(std::strtoul(arguments[1], nullptr, 10),
                                  {arguments + 2, arguments + count});
-    peers::measureCreation(measure);
     {
         peers::FullLibraries libraries(measure.size());
         peers::measureAccess(measure, libraries);
@@ -26,5 +25,6 @@ int main(int count, char** arguments)
         peers::measureMoves(measure, libraries);
     }
     peers::measureProxies(measure);
+    peers::measureCreation(measure);  // last: what it frees lies scattered
     peers::measureDeletion(measure);
 }
