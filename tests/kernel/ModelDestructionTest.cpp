@@ -6,6 +6,7 @@
 #include "tests/support/ExpectRaises.h"
 #include "tests/support/FakeDataSource.h"
 #include "tests/support/InvalidationLog.h"
+#include "tests/support/NodeImpl.h"
 #include "tests/support/PlainChange.h"
 #include "tests/support/ScriptedListener.h"
 
@@ -384,5 +385,28 @@ TEST_F(TheDestructionOfAModel, CutsItsProxiesOff)
     EXPECT_EQ(proxy->getModelImpl(), nullptr);
     EXPECT_FALSE(proxy->getModel());
     proxy = Plain();
+}
+
+TEST_F(TheDestructionOfAModel, EmptiesTheReferencesOfThousandsOfElements)
+{
+    Node const parent = Node::create(model);
+    std::vector<Node> children;
+    Transaction const filling = model->beginTransaction(/*revertible=*/false);
+    for (int i = 0; i < 3000; ++i)
+    {
+        children.push_back(Node::create(model));
+        children.back()->setParent(parent);
+        children.back()->setBuddy(children.front());
+    }
+    filling.commit();
+
+    model->destroy();
+
+    for (Node const& child : children)
+    {
+        ASSERT_FALSE(child);
+        ASSERT_EQ(child->getBuddyImpl(), nullptr);
+    }
+    EXPECT_EQ(model->getElementCount(), 0u);
 }
 }  // namespace

@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <ranges>
+#include <span>
 
 namespace tarn::kiln {
 
@@ -133,10 +134,10 @@ void ReflectiveModelElementImpl::disassociateIncoming()
         if (!isPlainReference(slot) || !opposite)
             continue;
         bool const isSingle = slot.kind() == SlotKind::Reference;
-        std::vector<ModelElement> const targets =
-            isSingle ? std::vector<ModelElement>(1, ModelElement(basicTarget(slot)))
-                     : members(slot);
-        if (targets.empty() || !targets.front().getImpl())
+        ModelElement const single(isSingle ? basicTarget(slot) : nullptr);
+        std::vector<ModelElement> const several = members(slot);
+        std::span const targets = single.getImpl() ? std::span(&single, 1) : std::span(several);
+        if (targets.empty())
             continue;
         notifyModifying(slot.index());
         for (ModelElement const& target : targets)
