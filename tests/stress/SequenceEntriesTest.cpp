@@ -344,4 +344,28 @@ TEST_P(ExhaustedMemory, LetsFindersDoWithoutAnIndex)
 }
 
 INSTANTIATE_TEST_SUITE_P(Sizes, ExhaustedMemory, testing::Values(0, 1, 2, 31, 32, 300, 992, 4000));
+TEST(SharedEntries, HaveRoomForMoreAfterSomeWereTaken)
+{
+    Elements const elements(40);
+    for (std::size_t size = 1; size < elements.size(); ++size)
+    {
+        SequenceEntries entries;
+        Plain list;
+        for (std::size_t i = 0; i < size; ++i)
+        {
+            entries.append(elements[i]);
+            list.push_back(elements[i]);
+        }
+        for (; list.size() > size / 2; list.pop_back())
+            static_cast<void>(entries.take(list.size() - 1));
+        SequenceEntries const snapshot = entries;
+        Plain const before = list;
+
+        entries.append(elements[size]);
+        list.push_back(elements[size]);
+
+        EXPECT_TRUE(holds(entries, list)) << size;
+        EXPECT_TRUE(holds(snapshot, before)) << size;
+    }
+}
 }  // namespace

@@ -341,10 +341,13 @@ void SequenceEntries::makeRoomInRoot()
         growRoot();
         return;
     }
-    if (m_root->level != 0 || m_root->count < m_root->capacity)
+    if (m_root->level != 0)
         return unshareRoot();
+    bool const isShared = m_root->owners.load(std::memory_order_acquire) != 1;
+    if (!isShared && m_root->count < m_root->capacity)
+        return;
     unsigned const capacity = leafCapacityFor(m_root->count + 1u);
-    if (m_root->owners.load(std::memory_order_acquire) != 1)
+    if (isShared)
     {
         disown(std::exchange(m_root, copyLeaf(*m_root, capacity)));
         return;
