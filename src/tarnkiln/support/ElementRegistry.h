@@ -139,6 +139,7 @@ private:
         std::uintptr_t m_bits = 0;
     };
     static_assert(alignof(ModelElement::Impl) > Entry::FAR);
+    __extension__ using Wide = unsigned __int128;
 
     /// Depends on all bytes: those of a family of UUIDs often differ in a few only.
     std::size_t home(UUID const& id) const
@@ -148,15 +149,21 @@ private:
         std::memcpy(halves, id.data, sizeof halves);
         std::uint64_t word = halves[0] ^ std::rotl(halves[1] * SPREAD, 32);
         word ^= word >> 32;
-        return static_cast<std::size_t>(word * SPREAD >> m_shift);
+        // The product is a fraction of 2^64, and that fraction of the table is the place.
+        return static_cast<std::size_t>(static_cast<Wide>(word * SPREAD) * m_capacity >> 64);
     }
-    std::size_t next(std::size_t at) const { return (at + 1) & (m_capacity - 1); }
+    std::size_t next(std::size_t at) const { return at + 1 == m_capacity ? 0 : at + 1; }
+    /// From one place on to another, which may lie before it.
+    std::size_t stepsFrom(std::size_t from, std::size_t to) const
+    {
+        return to >= from ? to - from : to + m_capacity - from;
+    }
     std::size_t distanceAt(std::size_t at) const
     {
         Entry const entry = m_table[at];
         if (entry.distance() < Entry::FAR)
             return entry.distance();
-        return (at - home(entry.element()->getUuid())) & (m_capacity - 1);
+        return stepsFrom(home(entry.element()->getUuid()), at);
     }
     void place(ModelElement::Impl* element)
     {
@@ -171,7 +178,7 @@ private:
     {
         for (std::size_t at = next(gap); !m_table[at].isFree(); at = next(at)) {
             std::size_t const distance = distanceAt(at);
-            std::size_t const step = (at - gap) & (m_capacity - 1);
+            std::size_t const step = stepsFrom(gap, at);
             if (distance >= step) {
                 m_table[gap] = Entry(m_table[at].element(), distance - step);
                 gap = at;
@@ -181,25 +188,32 @@ private:
     }
     void reserveFor(std::size_t count)
     {
-        if (count * 4 <= m_capacity * 3)
+        if (count * 5 <= m_capacity * 4)
             return;
-        std::size_t capacity = m_capacity ? m_capacity * 2 : 16;
-        while (count * 4 > capacity * 3)
-            capacity *= 2;
+        std::size_t capacity = m_capacity ? larger(m_capacity) : 16;
+        while (count * 5 > capacity * 4)
+            capacity = larger(capacity);
         auto old = std::make_unique<Entry[]>(capacity);
         std::size_t const oldCapacity = m_capacity;
         m_table.swap(old);
         m_capacity = capacity;
-        m_shift = 64 - std::countr_zero(capacity);
+        // An element's UUID is far away: by the time that it is needed it shall have arrived.
+        constexpr std::size_t AHEAD = 16;
         for (std::size_t at = 0; at < oldCapacity; ++at) {
+            if (at + AHEAD < oldCapacity && !old[at + AHEAD].isFree())
+                __builtin_prefetch(&old[at + AHEAD].element()->getUuid());
             if (!old[at].isFree())
                 place(old[at].element());
         }
     }
+    /// The next one of 16, 24, 32, 48, 64, ...
+    static std::size_t larger(std::size_t capacity)
+    {
+        return std::has_single_bit(capacity) ? capacity / 2 * 3 : capacity / 3 * 4;
+    }
 
     std::unique_ptr<Entry[]> m_table;
-    std::size_t m_capacity = 0; ///< A power of two; at most three quarters are used.
-    int m_shift = 0;            ///< Leaves as many of 64 bits as a place in the table has.
+    std::size_t m_capacity = 0; ///< At most four fifths are used.
     std::size_t m_size = 0;
     std::size_t m_mayReturn = 0;
 };
