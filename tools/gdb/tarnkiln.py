@@ -125,7 +125,7 @@ class Value:
         name = own_name(type_impl) or "unnamed"
         shape = str(self.value["m_flags"]).split("::")[-1]
         head = name if shape == "Single" else f"{shape} of {name}"
-        data = self.value["m_data"]
+        data = self.value["m_payload"]["m_data"]
         if not data:
             return f"{head}, absent"
         if shape in ("Single", "OptionalSingle"):

@@ -47,16 +47,10 @@ Model::Impl* modelOf(ModelElement::Impl const* owner)
 {
     return owner ? owner->getModelImpl() : nullptr;
 }
-
-Transaction beginUnlessOpen(Model::Impl* model)
-{
-    return model && !model->getCurrentTransaction() ? model->beginTransaction(/*revertible=*/false)
-                                                    : Transaction();
-}
 }  // namespace
 
 AbstractOwnedCollection::Operation::Operation(AbstractOwnedCollection& collection)
-    : m_transaction(beginUnlessOpen(modelOf(collection.m_owner))),
+    : m_transaction(modelOf(collection.m_owner)),
       m_step(modelOf(collection.m_owner))
 {}
 
@@ -65,6 +59,6 @@ AbstractOwnedCollection::Operation::~Operation() = default;
 TransactionResult AbstractOwnedCollection::Operation::commit()
 {
     m_step.close();
-    return m_transaction ? m_transaction.commit() : TransactionResult::NotCompleted;
+    return m_transaction.commit();
 }
 }  // namespace tarn::kiln

@@ -9,6 +9,7 @@
 #include "tarnkiln/meta/Fwd.h"
 #include "tarnkiln/meta/Property.h"
 #include "tarnkiln/support/OpenStep.h"
+#include "tarnkiln/support/OwnTransaction.h"
 
 namespace tarn::kiln {
 
@@ -103,7 +104,7 @@ public:
     TransactionResult commit();
 
 private:
-    Transaction m_transaction;  ///< Empty unless opened here.
+    support::OwnTransaction m_transaction;
     support::OpenStep m_step;
 };
 }  // namespace tarn::kiln

@@ -4,8 +4,9 @@
 #include "tarnkiln/kernel/ChangesHolder.h"
 #include "tarnkiln/kernel/UUIDHasher.h"
 
+#include <boost/container/deque.hpp>
+
 #include <unordered_map>
-#include <vector>
 
 namespace tarn::kiln {
 
@@ -49,6 +50,8 @@ public:
     {
         for (std::size_t i = 0; i < m_records.size(); ++i)
         {
+            if (i + AHEAD < m_records.size() && m_records[i + AHEAD])
+                m_records[i + AHEAD]->prefetchElement();
             if (m_records[i])
                 visit(*m_records[i]);
         }
@@ -58,13 +61,20 @@ public:
     {
         for (std::size_t i = m_records.size(); i-- != 0;)
         {
+            if (i >= AHEAD && m_records[i - AHEAD])
+                m_records[i - AHEAD]->prefetchElement();
             if (m_records[i])
                 visit(*m_records[i]);
         }
     }
 
 private:
-    std::vector<ChangesHolder> m_records;  ///< Null where one was let go.
+    /// So many records before its turn an element is fetched into the cache.
+    static constexpr std::size_t AHEAD = 8;
+    using Blocks = boost::container::deque_options_t<boost::container::block_size<128u>>;
+
+    /// Null where one was let go.
+    boost::container::deque<ChangesHolder, void, Blocks> m_records;
     /// Of the first so many records, by UUID; made when a report first needs it.
     mutable std::unordered_multimap<UUID, ModelElement::Impl::Changes*, internal::UUIDHasher>
         m_byUuid;

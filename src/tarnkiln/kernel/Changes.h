@@ -64,6 +64,8 @@ public:
     void releaseElement() noexcept;
     /// Null unless it is kept.
     ModelElement::Impl* getKeptElement() const { return m_keepsElement ? m_element : nullptr; }
+    /// Does no harm if it is gone.
+    void prefetchElement() const { __builtin_prefetch(m_element); }
     /// @}
 
     /// False if the property is not live, has no slot, or is none of the element's class.

@@ -36,7 +36,7 @@ public:
     ~ElementHandle()
     {
         if (m_impl)
-            m_impl->removeRef();
+            m_impl->release();
     }
     ElementHandle& operator=(ElementHandle const& other)
     {
@@ -44,7 +44,7 @@ public:
             if (other.m_impl)
                 other.m_impl->addRef();
             if (ElementImpl* const old = std::exchange(m_impl, other.m_impl))
-                old->removeRef();
+                old->release();
         }
         return *this;
     }

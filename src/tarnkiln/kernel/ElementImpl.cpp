@@ -1,13 +1,14 @@
 #include "tarnkiln/kernel/ElementImpl.h"
 
 #include <boost/random/mersenne_twister.hpp>
-#include <boost/random/uniform_int_distribution.hpp>
 
 #include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstdint>
+#include <cstring>
 #include <memory>
+#include <mutex>
 #include <system_error>
 #include <vector>
 
@@ -45,9 +46,11 @@ void deleteWaiting(Deletions& all)
 
 /// All of the state from the system's source of randomness. `std::random_device` would ask the
 /// processor for each word, which takes milliseconds on a virtual machine, and that in each thread.
-boost::random::mt19937 seededGenerator()
+using Generator = boost::random::mt19937_64;
+
+Generator seededGenerator()
 {
-    std::array<std::uint32_t, boost::random::mt19937::state_size> words;
+    std::array<std::uint32_t, 2 * Generator::state_size> words;
     constexpr std::size_t AT_ONCE = 64;  // no call may ask for more than 256 bytes
     for (std::size_t at = 0; at < words.size(); at += AT_ONCE)
     {
@@ -56,7 +59,7 @@ boost::random::mt19937 seededGenerator()
             throw std::system_error(errno, std::generic_category(), "no seed for new UUIDs");
     }
     auto first = words.begin();
-    return boost::random::mt19937(first, words.end());
+    return Generator(first, words.end());
 }
 
 }  // namespace
@@ -72,7 +75,7 @@ ElementImpl::~ElementImpl() = default;
 
 void ElementImpl::removeRef()
 {
-    if (m_refCount.fetch_sub(1) == 1)
+    if (!isPermanent() && m_refCount.fetch_sub(1) == 1)
         deleteThis();
 }
 
@@ -100,6 +103,20 @@ void ElementImpl::invalidate()
         m_callback(this, nullptr);
 }
 
+void ElementImpl::makePermanent()
+{
+    // Found from here, and so not taken for lost, when the process ends.
+    static auto* const permanents = new std::vector<ElementImpl*>;
+    static auto* const mutex = new std::mutex;
+
+    std::lock_guard const lock(*mutex);
+    if (isPermanent())
+        return;
+    permanents->push_back(this);
+    m_refCount.fetch_add(1);  // for those who count on meanwhile
+    m_isPermanent.store(true, std::memory_order_relaxed);
+}
+
 void ElementImpl::setInvalidateCallback(InvalidateCallback callback)
 {
     if (!m_callback)
@@ -108,15 +125,13 @@ void ElementImpl::setInvalidateCallback(InvalidateCallback callback)
 
 UUID ElementImpl::generateNewUuid()
 {
-    thread_local boost::random::mt19937 generator = seededGenerator();
-    boost::random::uniform_int_distribution<std::uint64_t> anyWord;
+    thread_local Generator generator = seededGenerator();
 
     UUID result;
     for (int half = 0; half < 2; ++half)
     {
-        std::uint64_t word = anyWord(generator);
-        for (int byte = 0; byte < 8; ++byte, word >>= 8)
-            result.data[half * 8 + byte] = static_cast<std::uint8_t>(word);
+        std::uint64_t const word = generator();
+        std::memcpy(&result.data[half * 8], &word, sizeof word);
     }
     result.data[8] = static_cast<std::uint8_t>((result.data[8] & 0x3F) | 0x80);
     result.data[6] = static_cast<std::uint8_t>((result.data[6] & 0x0F) | 0x40);

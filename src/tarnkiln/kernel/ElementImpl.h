@@ -51,8 +51,29 @@ public:
     /// Makes the object `Invalid` and tells the invalidate callback.
     virtual void invalidate();
 
-    void addRef() { m_refCount.fetch_add(1); }
+    void addRef()
+    {
+        if (!isPermanent())
+            m_refCount.fetch_add(1);
+    }
+    /// The same as `removeRef`, without a call where nothing is counted.
+    void release()
+    {
+        if (!isPermanent())
+            removeRef();
+    }
+    /// Of a permanent object: some count from before it became one.
     std::uint32_t getRefCount() const { return m_refCount.load(); }
+
+    /// \name Permanent objects
+    /// Types that all threads share are not counted: the count would be the one word that all of
+    /// them write. They stay in memory to the end of the process, dead or not.
+    ///
+    /// Threads: any; an object may become permanent while others count it.
+    /// @{
+    bool isPermanent() const { return m_isPermanent.load(std::memory_order_relaxed); }
+    void makePermanent();
+    /// @}
 
     UUID const& getUuid() const { return m_uuid; }
     ElementValidity getValidity() const { return m_validity; }
@@ -79,5 +100,8 @@ protected:
     UUID m_uuid;
     std::atomic<std::uint32_t> m_refCount{0};
     ElementValidity m_validity;
+
+private:
+    std::atomic<bool> m_isPermanent{false};
 };
 } // namespace tarn::kiln

@@ -24,7 +24,7 @@ ModelElement ModelElement::createProxy(Model const& model, meta::Class const& me
             reportException(tarnkiln::messages::NoSuchType(internal::qualifiedName(metaClass)));
     }
     ModelElement const proxy(
-        new ReflectiveModelElementImpl(model, metaClass, ElementImpl::generateNewUuid()));
+        ReflectiveModelElementImpl::create(model, metaClass, ElementImpl::generateNewUuid()));
     proxy->_becomeProxy(id, ElementImpl::ElementValidity::Constructing);
     return proxy;
 }
@@ -32,7 +32,7 @@ ModelElement ModelElement::createProxy(Model const& model, meta::Class const& me
 ModelElement ModelElement::createReflective(Model const& model, meta::Class const& metaClass,
                                             UUID const& id)
 {
-    ModelElement const element(new ReflectiveModelElementImpl(model, metaClass, id));
+    ModelElement const element(ReflectiveModelElementImpl::create(model, metaClass, id));
     element->notifyCreated();
     return element;
 }

@@ -113,6 +113,7 @@ std::vector<ModelElement::Impl*> Model::Impl::getAllElementImpls() const
 void Model::Impl::elementCreated(ModelElement::Impl* element, bool topLevel)
 {
     validateTransaction();
+    m_anchor.get()->changed();
     if (!m_elements.insert(element)) {
         element->m_uuid = UUID{}; // its destructor must not find the other element
         reportException(tarnkiln::messages::UUIDConflict());
@@ -161,6 +162,7 @@ void Model::Impl::allElementsDestroying()
 void Model::Impl::elementModifying(ModelElement::Impl* element, unsigned long index)
 {
     validateTransaction();
+    m_anchor.get()->changed();
     if (isRecording())
         m_currentTransaction->elementModifying(element, index);
 }
@@ -184,6 +186,7 @@ void Model::Impl::elementNoLongerTopLevel(ModelElement::Impl* element)
 
 void Model::Impl::remove(ModelElement::Impl* element)
 {
+    m_anchor.get()->changed();
     m_elements.erase(element);
     m_topLevelElements.erase(element);
 }
@@ -442,6 +445,7 @@ void Model::Impl::destroy()
     if (m_currentTransaction && m_currentTransaction->isProhibited())
         reportException(tarnkiln::messages::ChangesProhibited());
     m_validity = ElementValidity::ModelDestroying;
+    m_anchor.get()->changed();
     Transaction const transaction = beginTransaction(/*revertible=*/false);
     removeAllListeners();
     bool const multiModel = isMultiModel();

@@ -93,6 +93,11 @@ public:
     AbstractTransactionFactoryImpl& getDefaultTransactionFactory() const;
     /// Lets another party begin this model's transactions; null restores the default.
     void setTransactionFactory(std::unique_ptr<AbstractTransactionFactoryImpl> factory);
+    bool isFactoryLocal() const { return m_isFactoryLocal; }
+    /// Whether a transaction for one change, begun now, would tell nobody and keep nothing.
+    bool isUnwatched() const;
+    /// A change has ended that was made without a transaction, as nobody would have heard of it.
+    void unwatchedChangeEnded();
     /// Between these a rollback that can't be avoided waits (OpenStep.h).
     void openStep() { ++m_openSteps; }
     void closeStep() { --m_openSteps; }
@@ -299,9 +304,13 @@ public:
     /// Resolves, loads and makes nothing; does not depend on the size of the call stack.
     /// \returns a sentence for each violation; empty if all is well.
     std::vector<string> checkInvariants() const;
-    /// Runs `checkInvariants` and asserts on it, in checked builds: fully up to 2000 elements,
+    /// Runs `checkInvariants` and asserts on it, in checked builds, unless this is in the middle of
+    /// a change: fully up to 2000 elements,
     /// above that when the number of ended transactions is a power of two.
     void checkInvariantsAtEnd();
+
+    /// Tells of the model when it is gone, and whether it has changed.
+    support::CountedPointer<support::ModelAnchor> const& getAnchor() const { return m_anchor; }
 
 private:
     friend class Model;
@@ -342,12 +351,13 @@ private:
     unsigned int m_dataSourceLoadCount = 0;
     unsigned int m_parseCount = 0;
     unsigned int m_openSteps = 0;
-    support::CountedPointer<support::ModelAnchor> const m_anchor; ///< For dead elements.
+    support::CountedPointer<support::ModelAnchor> const m_anchor;
     unsigned long m_endedTransactions = 0;
     std::unique_ptr<internal::DeclaredExtensions> const m_extensions;
     std::unordered_set<ExtensionListener*> m_extensionListeners;
     std::unique_ptr<meta::DataModelUsageProvider> m_usageProvider;
     std::unique_ptr<AbstractTransactionFactoryImpl> m_transactionFactory;
+    bool m_isFactoryLocal = true; ///< Not brought by a client.
     ModelConstellation::Impl* m_constellation = nullptr;
     ustring m_modelURI;
     ustring m_locationModelId; ///< The form of the URI by which the constellation finds the model.

@@ -253,6 +253,7 @@ void Model::Impl::ContentsMove::moveElements()
         proxy->m_model = &m_target;
     m_target.m_proxies.merge(m_source.m_proxies);
     m_source.m_elements.clear();
+    m_source.m_anchor.get()->changed();
     m_source.m_topLevelElements.abandon();
     for (auto const& [name, record] : m_moving)
         m_source.m_extensions->remove(name, record.extension);

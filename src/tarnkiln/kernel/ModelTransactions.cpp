@@ -22,6 +22,7 @@ AbstractTransactionFactoryImpl& Model::Impl::getDefaultTransactionFactory() cons
 
 void Model::Impl::setTransactionFactory(std::unique_ptr<AbstractTransactionFactoryImpl> factory)
 {
+    m_isFactoryLocal = !factory;
     if (!factory)
         factory = std::make_unique<internal::LocalTransactionFactoryImpl>(*this);
     m_transactionFactory = std::move(factory);
@@ -56,6 +57,7 @@ Transaction Model::Impl::innerBeginTransaction(PrivateTag const&,
         Transaction const transaction(
             new internal::TransactionImpl(getModel(), nullptr, origin, deep));
         m_currentTransaction = static_cast<internal::TransactionImpl*>(transaction.getImpl());
+        m_anchor.get()->transactionBegan();
         return transaction;
     }
     m_constellation->createTransactionGroup(deep, origin);
@@ -73,6 +75,19 @@ void Model::Impl::doBeginTransaction(internal::TransactionGroup* group,
 {
     m_currentTransaction =
         new internal::TransactionImpl(getModel(), group, origin, group->isDeep());
+    m_anchor.get()->transactionBegan();
+}
+
+bool Model::Impl::isUnwatched() const
+{
+    return !m_currentTransaction && m_isFactoryLocal && m_listeners.empty() &&
+           m_validity == ElementValidity::Valid && !isRegistryModel() && !isMultiModel();
+}
+
+void Model::Impl::unwatchedChangeEnded()
+{
+    ++m_endedTransactions;
+    checkInvariantsAtEnd();
 }
 
 void Model::Impl::validateTransaction() const
@@ -90,6 +105,7 @@ void Model::Impl::validateTransaction() const
 void Model::Impl::transactionEnded()
 {
     m_currentTransaction = nullptr;
+    m_anchor.get()->transactionEnded();
     ++m_endedTransactions;
     m_elements.forgetReturns();
     m_topLevelElements.forgetReturns();

@@ -49,7 +49,9 @@ Value Value::createOptionalEnumValue(meta::Property const& property,
     Value result(ValueMeta(typeOf(property), ValueFlags::OptionalSingle), nullptr);
     if (!internal::isEnumType(result.m_type))
         result.failCast();
-    result.setPayload(number ? new unsigned long(static_cast<unsigned long>(*number)) : nullptr);
+    result.m_payload.setType<unsigned long>();
+    if (number)
+        result.m_payload.store(static_cast<unsigned long>(*number));
     return result;
 }
 
@@ -60,14 +62,14 @@ Value Value::createCollectionValue(meta::Property const& property,
     // Where a property has one value, the collection as a whole is that value.
     if (result.m_flags == ValueFlags::OptionalSingle)
         result.m_flags = ValueFlags::Single;
-    result.m_data = collection;
+    result.m_payload.share(collection);
     return result;
 }
 
 Value Value::createReflectiveDataTypeValue(ReflectiveDataType const& value)
 {
     Value result(ValueMeta(value.getDataType()), nullptr);
-    result.setPayload(new ReflectiveDataType(value));
+    result.m_payload.store(value);
     result.setReflective();
     return result;
 }
@@ -115,32 +117,6 @@ Value Value::createEmptyValue(meta::Property const& property)
     return createEmptyValue(property->getType(), property->getLower() == 1);
 }
 
-Value::Value(ValueMeta const& meta, std::nullptr_t) : ValueMeta(meta) {}
-
-Value::Value(Value const& other)
-    : ValueMeta(other),
-      m_data(other.m_cloner ? other.m_cloner(other.m_data) : other.m_data),
-      m_deleter(other.m_deleter),
-      m_cloner(other.m_cloner),
-      m_comparator(other.m_comparator),
-      m_extractor(other.m_extractor)
-{}
-
-Value::Value(Value&& other) noexcept
-    : ValueMeta(other),
-      m_data(std::exchange(other.m_data, nullptr)),
-      m_deleter(other.m_deleter),
-      m_cloner(other.m_cloner),
-      m_comparator(other.m_comparator),
-      m_extractor(other.m_extractor)
-{}
-
-Value::~Value()
-{
-    if (m_deleter)
-        m_deleter(m_data);
-}
-
 Value& Value::operator=(Value const& other)
 {
     if (this != &other)
@@ -154,24 +130,14 @@ Value& Value::operator=(Value&& other) noexcept
     if (this != &other)
     {
         ValueMeta::operator=(other);
-        std::swap(m_data, other.m_data);
-        std::swap(m_deleter, other.m_deleter);
-        std::swap(m_cloner, other.m_cloner);
-        std::swap(m_comparator, other.m_comparator);
+        m_payload.swap(other.m_payload);
     }
     return *this;
 }
 
 bool Value::operator==(Value const& other) const
 {
-    if (m_type != other.m_type || m_flags != other.m_flags)
-        return false;
-    if (!m_comparator)
-        return m_data == other.m_data;
-    // A collection of an element is never equal to a container, and must not be read as one.
-    if (m_data && other.m_data && m_comparator != other.m_comparator)
-        return false;
-    return m_comparator(m_data, other.m_data);
+    return m_type == other.m_type && m_flags == other.m_flags && m_payload == other.m_payload;
 }
 
 boost::optional<long> Value::getEnumNumber() const
@@ -276,7 +242,7 @@ void Value::failCast() const
 
 void Value::storeElement(ModelElement const& element)
 {
-    setPayload(new ModelElement(element));
+    m_payload.store(element);
 }
 
 void Value::checkElement(meta::Class const& required) const

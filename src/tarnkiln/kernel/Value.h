@@ -11,6 +11,7 @@
 #pragma once
 #include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ValueMeta.h"
+#include "tarnkiln/kernel/ValuePayload.h"
 #include "tarnkiln/kernel/ValueTraits.h"
 
 #include <boost/optional.hpp>
@@ -100,10 +101,10 @@ public:
     ///     property has many values.
     static Value createEmptyValue(meta::Property const& property);
 
-    Value(Value const& other);
+    Value(Value const& other) = default;
     /// Leaves the other value without payload, but of the same type and shape.
-    Value(Value&& other) noexcept;
-    ~Value();
+    Value(Value&& other) noexcept = default;
+    ~Value() = default;
     Value& operator=(Value const& other);
     /// Swaps the payloads and copies type and shape, which the other value keeps.
     Value& operator=(Value&& other) noexcept;
@@ -166,7 +167,7 @@ public:
     ReflectiveDataType toReflectiveDataType() const;
 
     /// Whether there is no payload; never so for a value that holds an empty handle.
-    bool isAbsent() const { return !m_data; }
+    bool isAbsent() const { return !m_payload.address(); }
     /// @}
 
     /// \name Properties
@@ -188,13 +189,11 @@ private:
     template <class T> friend struct support::ValueAccess;
     friend struct support::PayloadAccess;
 
-    using Deleter = void (*)(void*);
-    using Cloner = void* (*)(void*);
-    using Comparator = bool (*)(void*, void*);
     using Extractor = std::vector<Value> (*)(Value const&);
 
     /// Without payload and functions.
-    Value(ValueMeta const& meta, std::nullptr_t);
+    Value(ValueMeta const& meta, std::nullptr_t) : ValueMeta(meta) {}
+    Value(meta::Type const& type, ValueFlags flags, std::nullptr_t) : ValueMeta(type, flags) {}
 
     /// `type`, with the registry started before it is read.
     static meta::Type const& started(meta::Type const& type);
@@ -207,13 +206,9 @@ private:
     ModelElement const* element() const;
     /// The payload as a `T`; null if there is none. Fails if it is something else.
     template <class T> T const* payload() const;
-    template <class T> void setPayload(T* payload);
 
-    void* m_data = nullptr;
-    Deleter m_deleter = nullptr;        ///< Null: the payload is not owned.
-    Cloner m_cloner = nullptr;          ///< Null: copies share the payload.
-    Comparator m_comparator = nullptr;  ///< Null: payloads are compared by address.
-    Extractor m_extractor = nullptr;    ///< Not null only for an unmanaged collection.
+    ValuePayload m_payload;
+    Extractor m_extractor = nullptr;  ///< Not null only for an unmanaged collection.
 };
 
 /// Shows type, shape unless it is `Single`, and contents to people, texts in quotes and all else in
@@ -228,7 +223,8 @@ private:
 TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, Value const& value);
 
 template <support::Payload T>
-Value::Value(meta::Type const& type, T const& payload) : Value(ValueMeta(started(type)), nullptr)
+Value::Value(meta::Type const& type, T const& payload)
+    : Value(started(type), ValueFlags::Single, nullptr)
 {
     if constexpr (support::ElementReference<T>)
         storeElement(payload);

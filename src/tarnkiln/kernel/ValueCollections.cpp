@@ -45,8 +45,9 @@ template <class Collection> void ValueAccess<Collection&>::check(Value const& va
 template <class Collection> Collection& ValueAccess<Collection&>::read(Value const& value)
 {
     // A payload of the value's own is no collection of an element.
-    auto* const held =
-        value.m_deleter ? nullptr : static_cast<AbstractOwnedCollection*>(value.m_data);
+    auto* const held = value.m_payload.isOwned()
+                           ? nullptr
+                           : static_cast<AbstractOwnedCollection*>(value.m_payload.address());
     auto* const collection = dynamic_cast<Collection*>(held);
     if (!collection)
         value.failCast();

@@ -15,8 +15,6 @@ ValueMeta::ValueMeta(meta::Property const& property)
         m_keyType = property->getQualifiedBy()->getType();
 }
 
-ValueMeta::ValueMeta(meta::Type const& type, ValueFlags flags) : m_type(type), m_flags(flags) {}
-
 void ValueMeta::setReflective()
 {
     m_reflective = true;

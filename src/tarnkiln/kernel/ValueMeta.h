@@ -16,7 +16,10 @@ class TARNKILN_EXPORT ValueMeta
 public:
     /// What a value of `property`, which must not be empty, looks like.
     explicit ValueMeta(meta::Property const& property);
-    explicit ValueMeta(meta::Type const& type, ValueFlags flags = ValueFlags::Single);
+    explicit ValueMeta(meta::Type const& type, ValueFlags flags = ValueFlags::Single)
+        : m_type(type),
+          m_flags(flags)
+    {}
 
     ValueMeta(ValueMeta const& other) = default;
     /// Copies: the other one stays as it is.

@@ -88,12 +88,19 @@ void MetaRegistry::initialize()
 }
 
 MetaRegistry::LockedModel::LockedModel(MetaRegistry& registry)
-    : m_lock(registry.m_mutex),
+    : m_registry(registry),
+      m_lock(registry.m_mutex),
       m_model(registry.m_model),
       m_thawer(registry.m_freezer.thaw())
-{}
+{
+    ++m_registry.m_lockDepth;
+}
 
-MetaRegistry::LockedModel::~LockedModel() = default;
+MetaRegistry::LockedModel::~LockedModel()
+{
+    if (--m_registry.m_lockDepth == 0)
+        m_registry.publish();
+}
 
 MetaRegistry::LockedConstModel::LockedConstModel(MetaRegistry const& registry)
     : m_lock(registry.m_mutex),

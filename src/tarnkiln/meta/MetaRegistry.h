@@ -26,6 +26,7 @@
 #include <mutex>
 #include <unordered_map>
 #include <utility>
+#include <vector>
 
 namespace tarn::kiln::internal {
 class UnregisterDestroyedTypes;
@@ -74,7 +75,9 @@ public:
     /// Enters a type under `name`; either function may be null.
     ///
     /// An entry whose type is dead gives way to the new one. Makes the collections of the type's
-    /// attributes, operations or literals, so that other threads need not.
+    /// attributes, operations or literals, so that other threads need not. When the outermost
+    /// `LockedModel` is left, the type and these become permanent, so that threads which share them
+    /// write nothing to them.
     /// \throws tarnkiln::messages::DuplicateTypeInRegistry  (name) if another type has the name.
     void registerType(Type const& type, ustring const& name, CollectionInstantiator collection,
                       BuilderInstantiator builder);
@@ -194,6 +197,8 @@ private:
 
     void initialize();
     TypeEntry const* findEntry(Type const& type) const;
+    /// Ends the counting of handles of the types that were registered since the last call.
+    void publish() noexcept;
     ValueOwnershipConverter* findConverter(Value const& value) const;
 
     Model m_model;
@@ -203,6 +208,8 @@ private:
     std::map<ustring, Package> m_families;      ///< The package registered last for each.
     std::unordered_map<Type, std::unique_ptr<ValueOwnershipConverter>, std::hash<ModelElement>>
         m_converters;
+    std::vector<Type> m_unpublished;  ///< Registered under the lock that is held.
+    unsigned m_lockDepth = 0;         ///< Of `LockedModel`s inside one another.
     mutable std::recursive_mutex m_mutex;  ///< Guards all of the above.
     bool m_initialised = false;
     std::unique_ptr<internal::UnregisterDestroyedTypes> m_unregisterDestroyedTypes;
@@ -220,6 +227,7 @@ public:
     Model const& getModel() const { return m_model; }
 
 private:
+    MetaRegistry& m_registry;
     std::lock_guard<std::recursive_mutex> m_lock;
     Model m_model;
     Model::Thawer m_thawer;

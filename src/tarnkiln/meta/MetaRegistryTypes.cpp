@@ -14,6 +14,8 @@
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/meta/TypeImpl.h"
 
+#include <algorithm>
+
 namespace tarn::kiln::meta {
 namespace {
 
@@ -32,12 +34,45 @@ void materialise(Type const& type)
     if (Enum const enumeration = Enum::cast(type))
         enumeration->getLiterals();
 }
+
+/// Types and what they own are asked by all threads, which would contend for the counts.
+void makePermanent(Type const& type)
+{
+    if (!type)
+        return;
+    auto const makeAll = [](auto const& members) {
+        for (auto const& [name, member] : members)
+            member.getElementImpl()->makePermanent();
+    };
+    type.getElementImpl()->makePermanent();
+    if (StructuredType const structured = StructuredType::cast(type))
+    {
+        makeAll(structured->getOwnedAttributes());
+        makeAll(structured->getOwnedOperations());
+    }
+    if (Enum const enumeration = Enum::cast(type))
+        makeAll(enumeration->getLiterals());
+}
 }  // namespace
+
+void MetaRegistry::publish() noexcept
+{
+    try
+    {
+        std::for_each(m_unpublished.begin(), m_unpublished.end(), makePermanent);
+    }
+    catch (...)
+    {
+        // those that are left stay counted
+    }
+    m_unpublished.clear();
+}
 
 void MetaRegistry::registerType(Type const& type, ustring const& name,
                                 CollectionInstantiator collection, BuilderInstantiator builder)
 {
     LockedModel const locked(*this);
+    m_unpublished.push_back(type);
     TypeEntry const entry{builder, collection, type};
     auto const [position, inserted] = m_types.emplace(name, entry);
     if (!inserted)

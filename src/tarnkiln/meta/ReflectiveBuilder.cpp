@@ -109,7 +109,7 @@ ModelElement ReflectiveBuilder::construct(UUID const& id) const
     if (m_metaClass && m_metaClass->isAbstract())
         reportException(
             tarnkiln::messages::NoSuchOperation(u"create", internal::qualifiedName(m_metaClass)));
-    return ModelElement(new ReflectiveModelElementImpl(
+    return ModelElement(ReflectiveModelElementImpl::create(
         getModel(), m_metaClass, id.is_nil() ? ElementImpl::generateNewUuid() : id));
 }
 

@@ -130,7 +130,7 @@ void ReflectiveModelElementImpl::disassociateIncoming()
     }
     for (ReflectiveSlot const& slot : layout().slots() | std::views::filter(holdsElements))
     {
-        Feature const opposite = Feature(slot.property()).opposite();
+        Feature const opposite = layout().factsOf(slot).opposite;
         if (!isPlainReference(slot) || !opposite)
             continue;
         bool const isSingle = slot.kind() == SlotKind::Reference;
@@ -163,7 +163,7 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
     };
     for (ReflectiveSlot const& slot : layout().slots() | std::views::filter(isInUse))
     {
-        bool const isComposite = Feature(slot.property()).isComposite();
+        bool const isComposite = layout().factsOf(slot).isComposite;
         if (slot.kind() == SlotKind::Reference && basicTarget(slot))
         {
             if (isComposite)
@@ -176,7 +176,7 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
             continue;
         if (isComposite)
             std::for_each(children.begin(), children.end(), destroyChild);
-        _basicClear(static_cast<ReferenceCollection*>(m_cells->getCollection(slot)));
+        _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
     }
 }
 
@@ -194,7 +194,7 @@ void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
     {
         if (!isPlainReference(slot))
             continue;
-        Feature const opposite = Feature(slot.property()).opposite();
+        Feature const opposite = layout().factsOf(slot).opposite;
         if (slot.kind() == SlotKind::Reference)
         {
             leaveProxy(ModelElement(basicTarget(slot)), opposite);
@@ -205,7 +205,7 @@ void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
         for (ModelElement const& member : present)
             leaveProxy(member, opposite);
         if (!present.empty())
-            _basicClear(static_cast<ReferenceCollection*>(m_cells->getCollection(slot)));
+            _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
     }
 }
 
@@ -221,7 +221,7 @@ void ReflectiveModelElementImpl::basicDisassociateAll()
             basicSetTarget(slot, ModelElement());
         else if (slot.kind() != SlotKind::References)
             continue;
-        else if (AbstractOwnedCollection* const present = m_cells->getCollection(slot))
+        else if (AbstractOwnedCollection* const present = cells().getCollection(slot))
             present->basicDropContents();
     }
 }

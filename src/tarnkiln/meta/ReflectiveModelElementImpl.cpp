@@ -1,5 +1,6 @@
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 
+#include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 
@@ -10,28 +11,59 @@ using internal::isPlain;
 using internal::ReflectiveCells;
 using internal::ReflectiveLayout;
 
-void ReflectiveModelElementImpl::CellsDeleter::operator()(ReflectiveCells* cells) const
+ReflectiveModelElementImpl*
+ReflectiveModelElementImpl::create(Model const& model, meta::Class const& metaClass, UUID const& id)
 {
-    ReflectiveCells::Deleter()(cells);
+    if (!model)
+        reportException(tarnkiln::messages::CannotCreateWithoutModel());
+    LayoutHandle const layout = ReflectiveLayout::of(metaClass);
+    return new (layout) ReflectiveModelElementImpl(model, layout, id);
+}
+
+void* ReflectiveModelElementImpl::operator new(std::size_t size, LayoutHandle const& layout)
+{
+    return ::operator new(size + ReflectiveCells::sizeFor(*layout.get()));
+}
+
+void ReflectiveModelElementImpl::operator delete(void* element, LayoutHandle const& /*layout*/)
+{
+    ::operator delete(element);
+}
+
+void ReflectiveModelElementImpl::operator delete(void* element)
+{
+    ::operator delete(element);
 }
 
 ReflectiveModelElementImpl::ReflectiveModelElementImpl(Model const& model,
-                                                       meta::Class const& metaClass, UUID const& id)
-    : ModelElement::Impl(model, id),
-      m_cells(ReflectiveCells::create(ReflectiveLayout::of(metaClass)).release())
+                                                       LayoutHandle const& layout, UUID const& id)
+    : ModelElement::Impl(model, id)
 {
-    for (ReflectiveSlot const& slot : layout().slots())
+    static_assert(sizeof(ReflectiveModelElementImpl) % alignof(ReflectiveCells) == 0);
+    ReflectiveCells* const made = ReflectiveCells::create(&cells(), layout);
+    try
     {
-        if (isPlain(slot.kind()))
-            m_cells->set(slot, slot.keepInitial());
+        for (ReflectiveSlot const& slot : layout.get()->slots())
+        {
+            if (isPlain(slot.kind()))
+                made->set(slot, slot.keepInitial());
+        }
+    }
+    catch (...)
+    {
+        made->destroy();
+        throw;
     }
 }
 
-ReflectiveModelElementImpl::~ReflectiveModelElementImpl() = default;
+ReflectiveModelElementImpl::~ReflectiveModelElementImpl()
+{
+    cells().destroy();
+}
 
 internal::ReflectiveLayout const& ReflectiveModelElementImpl::layout() const
 {
-    return m_cells->layout();
+    return getCells().layout();
 }
 
 meta::Class const& ReflectiveModelElementImpl::getMetaClass() const
@@ -45,7 +77,7 @@ void ReflectiveModelElementImpl::invalidate()
     {
         if (!isCollection(slot->kind()))
             continue;
-        if (AbstractOwnedCollection* const present = m_cells->getCollection(*slot))
+        if (AbstractOwnedCollection* const present = cells().getCollection(*slot))
             collectionInvalidated(present);
     }
     ModelElement::Impl::invalidate();

@@ -5,8 +5,9 @@
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/Property.h"
+#include "tarnkiln/support/CountedPointer.h"
 
-#include <memory>
+#include <cstddef>
 
 namespace tarn::kiln {
 namespace internal {
@@ -35,13 +36,16 @@ class TARNKILN_EXPORT ReflectiveModelElementImpl final : public ModelElement::Im
 public:
     class ReflectiveStorage;  // internal/ReflectiveStorage.h
 
+    /// A new element, which no model knows yet.
+    ///
     /// \throws tarnkiln::messages::CannotCreateWithoutModel  if `model` is empty or dead.
     /// \throws tarnkiln::messages::CannotUsePropertyWithoutType  (name) if a stored property has no
     ///     live type.
     /// \throws tarnkiln::messages::UnsupportedQualification  (qualified name of the type) if the
     ///     keys of a collection can not be of the type of its qualifying property.
     /// \throws tarnkiln::messages::InvalidValue  if a single property has a type without values.
-    ReflectiveModelElementImpl(Model const& model, meta::Class const& metaClass, UUID const& id);
+    static ReflectiveModelElementImpl* create(Model const& model, meta::Class const& metaClass,
+                                              UUID const& id);
     ~ReflectiveModelElementImpl() override;
 
     // ElementImpl
@@ -84,7 +88,10 @@ public:
     /// @}
 
     /// What it keeps for its properties, for readers of many elements.
-    internal::ReflectiveCells const& getCells() const { return *m_cells; }
+    internal::ReflectiveCells const& getCells() const
+    {
+        return *reinterpret_cast<internal::ReflectiveCells const*>(this + 1);
+    }
 
     // ModelElement::Impl
     void doDestroy(bool keepIncoming, bool multiModel) override;
@@ -139,14 +146,23 @@ private:
     using Layout = internal::ReflectiveLayout;
     using ReflectiveSlot = internal::ReflectiveSlot;
 
-    struct CellsDeleter
+    using LayoutHandle = support::CountedPointer<Layout const>;
+
+    ReflectiveModelElementImpl(Model const& model, LayoutHandle const& layout, UUID const& id);
+    /// Room for the cells too, which lie behind the element.
+    static void* operator new(std::size_t size, LayoutHandle const& layout);
+    static void operator delete(void* element, LayoutHandle const& layout);
+    static void operator delete(void* element);
+    internal::ReflectiveCells& cells() const
     {
-        void operator()(internal::ReflectiveCells* cells) const;
-    };
+        return const_cast<internal::ReflectiveCells&>(getCells());
+    }
 
     // Reading
     Layout const& layout() const;
-    bool mayRead(meta::Property const& property, ReflectionPrivateTag const& tag) const;
+    /// The slot of a property that may be read; else null.
+    ReflectiveSlot const* readableSlot(meta::Property const& property,
+                                       ReflectionPrivateTag const& tag) const;
     ModelElement::Impl* containerBy(ReflectiveSlot const& slot) const;
     ModelElement::Impl* basicTarget(ReflectiveSlot const& slot) const;
     void basicSetTarget(ReflectiveSlot const& slot, ModelElement const& target) const;
@@ -170,14 +186,14 @@ private:
     ReflectiveSlot const* settableSlot(meta::Property const& property,
                                        ReflectionPrivateTag const& tag) const;
     void checkType(ReflectiveSlot const& slot, Value const& value) const;
+    bool isOfType(ReflectiveSlot const& slot, Value const& value) const;
     void checkOwnKey(ReflectiveSlot const& slot, ModelElement const& target) const;
     void setPlain(ReflectiveSlot const& slot, Value const& value);
+    void storePlain(ReflectiveSlot const& slot, Value const& value);
     void setReference(ReflectiveSlot const& slot, ModelElement const& target);
     void setContainer(ReflectiveSlot const& slot, ModelElement const& container);
     void applyPlain(ReflectiveSlot const& slot, Value const& value);
     void applyReference(ReflectiveSlot const& slot, ModelElement const& target);
     void applyContainer(ReflectiveSlot const& slot, ModelElement const& container);
-
-    std::unique_ptr<internal::ReflectiveCells, CellsDeleter> m_cells;
 };
 }  // namespace tarn::kiln

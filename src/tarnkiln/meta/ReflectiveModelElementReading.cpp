@@ -20,17 +20,18 @@ namespace tarn::kiln {
 
 using internal::SlotKind;
 
-bool ReflectiveModelElementImpl::mayRead(meta::Property const& property,
+internal::ReflectiveSlot const*
+ReflectiveModelElementImpl::readableSlot(meta::Property const& property,
                                          ReflectionPrivateTag const& tag) const
 {
-    return property && getMetaClass() && getMetaClass()->isATypeOf(property) &&
-           (property->isPublicAccessor() || !(tag == PUBLIC_ACCESS));
+    ReflectiveSlot const* const slot = layout().find(property);
+    return slot && layout().mayRead(*slot, tag) ? slot : nullptr;
 }
 
 bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property,
                                                   ReflectionPrivateTag const& tag) const
 {
-    ReflectiveSlot const* const slot = mayRead(property, tag) ? layout().find(property) : nullptr;
+    ReflectiveSlot const* const slot = readableSlot(property, tag);
     if (!slot)
         return ModelElement::Impl::hasPropertyValue(property, PUBLIC_ACCESS);
     switch (slot->kind())
@@ -43,23 +44,23 @@ bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property
         return mayHaveMembers(*slot) && shown(*slot, tag).getGenericInterface()->genericSize() > 0;
     case SlotKind::Values: {
         auto const* const values =
-            static_cast<AbstractPrimitiveCollection*>(m_cells->getCollection(*slot));
+            static_cast<AbstractPrimitiveCollection*>(cells().getCollection(*slot));
         return values && values->size() > 0;
     }
     case SlotKind::Annotations: {
-        auto const* const map = static_cast<StringToStringMap*>(m_cells->getCollection(*slot));
+        auto const* const map = static_cast<StringToStringMap*>(cells().getCollection(*slot));
         return map && !map->empty();
     }
     default:
         return property->getLower() != 0 ||
-               !slot->holds(m_cells->get(*slot), Value::createEmptyValue(property));
+               !slot->holds(cells().get(*slot), Value::createEmptyValue(property));
     }
 }
 
 Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& property,
                                                    ReflectionPrivateTag const& tag) const
 {
-    ReflectiveSlot const* const slot = mayRead(property, tag) ? layout().find(property) : nullptr;
+    ReflectiveSlot const* const slot = readableSlot(property, tag);
     if (!slot)
         return ModelElement::Impl::getPropertyValue(
             property, meta::Extension::cast(property) ? tag : PUBLIC_ACCESS);
@@ -78,7 +79,7 @@ Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& propert
     case SlotKind::Annotations:
         return Value::createCollectionValue(property, made(*slot));
     default:
-        return slot->read(m_cells->get(*slot));
+        return slot->read(cells().get(*slot));
     }
 }
 
@@ -87,25 +88,25 @@ Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& propert
 /// The container, if it holds this element in the very property that is the opposite.
 ModelElement::Impl* ReflectiveModelElementImpl::containerBy(ReflectiveSlot const& slot) const
 {
-    Feature const opposite = Feature(slot.property()).opposite();
+    Feature const opposite = layout().factsOf(slot).opposite;
     return opposite && getContainment() == opposite ? basicContainer() : nullptr;
 }
 
 ModelElement::Impl* ReflectiveModelElementImpl::basicTarget(ReflectiveSlot const& slot) const
 {
-    return m_cells->get(slot).pointer<ModelElement::Impl>();
+    return cells().get(slot).pointer<ModelElement::Impl>();
 }
 
 /// Changes nothing but the handle; putting a target in the place of its proxy is no change.
 void ReflectiveModelElementImpl::basicSetTarget(ReflectiveSlot const& slot,
                                                 ModelElement const& target) const
 {
-    internal::ReflectiveCell const old = m_cells->get(slot);
+    internal::ReflectiveCell const old = cells().get(slot);
     internal::ReflectiveCell cell;
     cell.point(target.getImpl());
     if (target.getImpl())
         target.getImpl()->addRef();
-    m_cells->set(slot, cell);
+    cells().set(slot, cell);
     slot.release(old);
 }
 
@@ -180,21 +181,21 @@ void ReflectiveModelElementImpl::visitReferences(ReferenceVisitor const& visit) 
 
 AbstractOwnedCollection* ReflectiveModelElementImpl::made(ReflectiveSlot const& slot) const
 {
-    if (AbstractOwnedCollection* const present = m_cells->getCollection(slot))
+    if (AbstractOwnedCollection* const present = cells().getCollection(slot))
         return present;
     auto* const self = const_cast<ReflectiveModelElementImpl*>(this);
-    return m_cells->publish(slot, slot.makeCollection(self));
+    return cells().publish(slot, slot.makeCollection(self));
 }
 
 bool ReflectiveModelElementImpl::mayHaveMembers(ReflectiveSlot const& slot) const
 {
-    return m_cells->getCollection(slot) || support::hasDataSource(*this);
+    return cells().getCollection(slot) || support::hasDataSource(*this);
 }
 
 ReferenceCollection& ReflectiveModelElementImpl::loaded(ReflectiveSlot const& slot) const
 {
     auto* const collection = static_cast<ReferenceCollection*>(made(slot));
-    if (m_cells->get(slot).state != internal::CellState::Loaded && m_cells->markLoaded(slot))
+    if (cells().get(slot).state != internal::CellState::Loaded && cells().markLoaded(slot))
         _loadCollectionContents(collection);
     return *collection;
 }
@@ -217,7 +218,7 @@ std::vector<ModelElement> ReflectiveModelElementImpl::members(ReflectiveSlot con
 {
     if (slot.kind() != SlotKind::References)
         return {};
-    auto const* const present = static_cast<ReferenceCollection*>(m_cells->getCollection(slot));
+    auto const* const present = static_cast<ReferenceCollection*>(cells().getCollection(slot));
     return present ? present->getAllValuesAndProxies() : std::vector<ModelElement>();
 }
 

@@ -4,11 +4,11 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/internal/ReflectiveStorage.h"
 
-#include <algorithm>
-#include <utility>
+#include <cstdint>
 
 namespace tarn::kiln {
 
+using internal::CellState;
 using internal::isCollection;
 using internal::ReflectiveCell;
 using internal::ReflectiveCells;
@@ -16,7 +16,7 @@ using internal::SlotKind;
 
 ModelElement::Impl::Changes* ReflectiveModelElementImpl::createChanges() const
 {
-    return new Changes(getUuid(), getModel(), getMetaClass(), layout().getRecordSize());
+    return new Changes(*this, layout().getRecordSize());
 }
 
 ModelElement::Impl::Storage* ReflectiveModelElementImpl::createStorage() const
@@ -30,14 +30,14 @@ void ReflectiveModelElementImpl::copyValue(Storage* storage, unsigned long index
     auto& record = static_cast<ReflectiveStorage&>(*storage);
     for (ReflectiveSlot const& slot : layout().slots())
     {
-        if (slot.index() == index && slot.property())
-            record.keep(slot, m_cells->get(slot));
+        if (slot.index() == index && slot.property() && slot.kind() != SlotKind::Container)
+            record.keep(slot, cells().get(slot));
     }
 }
 
 void ReflectiveModelElementImpl::copyStateFromStorage(Storage* storage)
 {
-    static_cast<ReflectiveStorage&>(*storage).swapWith(*m_cells);
+    static_cast<ReflectiveStorage&>(*storage).swapWith(cells());
     ModelElement::Impl::copyStateFromStorage(storage);
 }
 
@@ -46,69 +46,77 @@ void ReflectiveModelElementImpl::copyStateFromStorage(Storage* storage)
 using Record = ReflectiveModelElementImpl::ReflectiveStorage;
 
 Record::ReflectiveStorage(ReflectiveModelElementImpl const& element)
-    : Storage(element.getUuid(), element.getModel(), element.getMetaClass(),
-              element.layout().getRecordSize()),
-      m_layout(element.m_cells->layoutHandle())
+    : Storage(element, element.layout().getRecordSize()),
+      m_layout(element.cells().layoutHandle())
 {}
 
 Record::~ReflectiveStorage()
 {
-    for (OldCell const& old : m_old)
-        old.slot->release(old.cell);
+    forEachCell([](ReflectiveSlot const& slot, Word word, std::uint32_t state) {
+        slot.release({word, static_cast<CellState>(state)});
+    });
 }
 
-Record::OldCell const* Record::find(internal::ReflectiveSlot const& slot) const
+template <class Visit> void Record::forEachCell(Visit const& visit)
 {
-    auto const found = std::find_if(m_old.begin(), m_old.end(),
-                                    [&](OldCell const& old) { return old.slot == &slot; });
-    return found == m_old.end() ? nullptr : &*found;
+    oldValues().forEach<Word>([&](std::uint32_t key, Word& word, std::uint32_t& state) {
+        visit(m_layout.get()->slots()[key - 1], word, state);
+    });
 }
 
-void Record::keep(internal::ReflectiveSlot const& slot, ReflectiveCell cell)
+void Record::keep(ReflectiveSlot const& slot, ReflectiveCell cell)
 {
-    if (slot.kind() == SlotKind::Container || find(slot))
+    if (oldValues().find<Word>(keyOf(slot)))
         return;
-    m_old.reserve(m_old.size() + 1);
-    m_old.push_back({&slot, slot.copy(cell)});
+    ReflectiveCell const copy = slot.copy(cell);
+    try
+    {
+        oldValues().keep(keyOf(slot), copy.word, static_cast<std::uint32_t>(copy.state));
+    }
+    catch (...)
+    {
+        slot.release(copy);
+        throw;
+    }
 }
 
 void Record::swapWith(ReflectiveCells& cells) noexcept
 {
-    for (OldCell& old : m_old)
-    {
-        if (!isCollection(old.slot->kind()))
+    forEachCell([&](ReflectiveSlot const& slot, Word& word, std::uint32_t& state) {
+        if (!isCollection(slot.kind()))
         {
-            ReflectiveCell const present = cells.get(*old.slot);
-            cells.set(*old.slot, std::exchange(old.cell, present));
-            continue;
+            ReflectiveCell const present = cells.get(slot);
+            cells.set(slot, {word, static_cast<CellState>(state)});
+            word = present.word;
+            state = static_cast<std::uint32_t>(present.state);
+            return;
         }
-        AbstractOwnedCollection* const present = cells.getCollection(*old.slot);
-        auto* const snapshot = old.cell.pointer<AbstractOwnedCollection>();
+        AbstractOwnedCollection* const present = cells.getCollection(slot);
+        auto* const snapshot = reinterpret_cast<AbstractOwnedCollection*>(word);
         if (present && snapshot)
             present->basicSwapContents(*snapshot);
         else if (present)
             present->basicDropContents();
-    }
+    });
 }
 
 Value Record::getOldValue(meta::Property const& property, ReflectionPrivateTag const& tag) const
 {
     if (!property || !getMetaClass() || !getMetaClass()->isATypeOf(property))
         return Storage::getOldValue(property, tag);
-    internal::ReflectiveSlot const* const slot = m_layout.get()->find(property);
+    ReflectiveSlot const* const slot = m_layout.get()->find(property);
     if (slot && slot->kind() == SlotKind::Container)
         return oldContainerBy(property);
-    OldCell const* const old = slot ? find(*slot) : nullptr;
-    if (!old)
+    Word const* const word = slot ? oldValues().find<Word>(keyOf(*slot)) : nullptr;
+    if (!word)
         return Value::createEmptyValue(property);
+    ReflectiveCell const old{*word, static_cast<CellState>(oldValues().getNote(keyOf(*slot)))};
     if (slot->kind() == SlotKind::Reference)
-        return Value::createElementValue(property,
-                                         ModelElement(old->cell.pointer<ModelElement::Impl>()));
+        return Value::createElementValue(property, ModelElement(old.pointer<ModelElement::Impl>()));
     if (!isCollection(slot->kind()))
-        return slot->read(old->cell);
+        return slot->read(old);
 
-    Value value =
-        Value::createCollectionValue(property, old->cell.pointer<AbstractOwnedCollection>());
+    Value value = Value::createCollectionValue(property, old.pointer<AbstractOwnedCollection>());
     if (slot->kind() == SlotKind::References)
         value.setReflective();
     return value;

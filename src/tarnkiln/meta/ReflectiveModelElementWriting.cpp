@@ -12,7 +12,10 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 #include "tarnkiln/meta/internal/DependentCollections.h"
+#include "tarnkiln/meta/internal/PayloadAccess.h"
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
+#include "tarnkiln/support/OpenStep.h"
+#include "tarnkiln/support/OwnTransaction.h"
 
 namespace tarn::kiln {
 
@@ -28,20 +31,32 @@ class ChangeOfSeveral
 {
 public:
     explicit ChangeOfSeveral(ModelElement::Impl const& element)
-    {
-        element.getModelImpl()->validateTransaction();
-        if (!element.getModelImpl()->getCurrentTransaction())
-            m_transaction = element.getModelImpl()->beginTransaction(/*revertible=*/false);
-    }
+        : m_transaction(validated(element.getModelImpl())),
+          m_step(m_transaction.isSkipped() ? element.getModelImpl() : nullptr)
+    {}
     void commit()
     {
-        if (m_transaction)
-            m_transaction.commit();
+        m_step.close();
+        m_transaction.commit();
     }
 
 private:
-    Transaction m_transaction;  ///< Empty unless opened here.
+    static Model::Impl* validated(Model::Impl* model)
+    {
+        model->validateTransaction();
+        return model;
+    }
+
+    support::OwnTransaction m_transaction;
+    support::OpenStep m_step;  ///< Only where there is no transaction.
 };
+
+/// What a value holds whose type was found to suit.
+ModelElement elementOf(Value const& value)
+{
+    auto const* const held = support::PayloadAccess::get<ModelElement>(value);
+    return held ? *held : value.getValue<ModelElement>();
+}
 }  // namespace
 
 void ReflectiveModelElementImpl::setPropertyValue(meta::Property const& property,
@@ -57,18 +72,18 @@ void ReflectiveModelElementImpl::setPropertyValue(meta::Property const& property
     if (!isLive())
         return;
 
+    if (internal::isPlain(slot->kind()))
+        return setPlain(*slot, value);
     ModelElement const self(this);
     switch (slot->kind())
     {
     case SlotKind::Container:
-        return setContainer(*slot, value.getValue<ModelElement>());
+        return setContainer(*slot, elementOf(value));
     case SlotKind::Reference:
-        return setReference(*slot, value.getValue<ModelElement>());
-    case SlotKind::Annotations:
+        return setReference(*slot, elementOf(value));
+    default:
         return static_cast<StringToStringMap*>(made(*slot))
             ->assign(value.getValue<StringToStringMap&>());
-    default:
-        return setPlain(*slot, value);
     }
 }
 
@@ -77,19 +92,33 @@ internal::ReflectiveSlot const*
 ReflectiveModelElementImpl::settableSlot(meta::Property const& property,
                                          ReflectionPrivateTag const& tag) const
 {
-    if (!property || !getMetaClass() || !getMetaClass()->isATypeOf(property))
-        return nullptr;
-    if (tag == PUBLIC_ACCESS &&
-        (!property->isPublicMutator() || (property->isReadOnly() && !property->isSetOnce())))
-        return nullptr;
     ReflectiveSlot const* const slot = layout().find(property);
     bool const isSingle =
         slot && slot->kind() != SlotKind::Values && slot->kind() != SlotKind::References;
-    return isSingle ? slot : nullptr;
+    return isSingle && layout().factsOf(*slot).maySet(tag) ? slot : nullptr;
+}
+
+/// Whether the value is just what the property holds; if not, `checkType` has more to ask.
+bool ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot, Value const& value) const
+{
+    internal::SlotFacts const facts = layout().factsOf(slot);
+    bool const isShaped = value.getFlags() == ValueFlags::Single ||
+                          (value.getFlags() == ValueFlags::OptionalSingle && !facts.isRequired);
+    if (!facts.isTypeKept || !isShaped || value.getType() != slot.type())
+        return false;
+    if (!facts.isTypedByClass)
+        return true;
+    auto const* const held = support::PayloadAccess::get<ModelElement>(value);
+    if (!held || !held->getImpl())
+        return held != nullptr;
+    meta::Class const& metaClass = held->getImpl()->getMetaClass();
+    return metaClass && metaClass->isA(slot.type());
 }
 
 void ReflectiveModelElementImpl::checkType(ReflectiveSlot const& slot, Value const& value) const
 {
+    if (isOfType(slot, value))
+        return;
     meta::Property const& property = slot.property();
     meta::Type const type = property->getType();
     bool suits = false;
@@ -123,6 +152,8 @@ void ReflectiveModelElementImpl::checkType(ReflectiveSlot const& slot, Value con
 void ReflectiveModelElementImpl::checkOwnKey(ReflectiveSlot const& slot,
                                              ModelElement const& target) const
 {
+    if (!layout().factsOf(slot).opposite.isKeyed())
+        return;
     meta::Property const opposite = slot.property()->getOpposite();
     meta::Property const qualifier = opposite ? opposite->getQualifiedBy() : meta::Property();
     if (!qualifier || target->isProxy())
@@ -140,35 +171,40 @@ void ReflectiveModelElementImpl::checkOwnKey(ReflectiveSlot const& slot,
 
 void ReflectiveModelElementImpl::setPlain(ReflectiveSlot const& slot, Value const& value)
 {
+    if (value.getFlags() == ValueFlags::OptionalSingle && value.isAbsent())
+        storePlain(slot, Value::createEmptyValue(slot.property()));
+    else
+        storePlain(slot, value);
+}
+
+void ReflectiveModelElementImpl::storePlain(ReflectiveSlot const& slot, Value const& value)
+{
     meta::Property const& property = slot.property();
-    Value const empty = value.getFlags() == ValueFlags::OptionalSingle && value.isAbsent()
-                            ? Value::createEmptyValue(property)
-                            : value;
-    if (property->isSetOnce() && !slot.holds(m_cells->get(slot), Value::createEmptyValue(property)))
+    if (layout().factsOf(slot).isSetOnce &&
+        !slot.holds(cells().get(slot), Value::createEmptyValue(property)))
         reportException(tarnkiln::messages::CannotSetReadOnlyProperty(property->getName()));
-    if (slot.holds(m_cells->get(slot), empty))
+    if (slot.holds(cells().get(slot), value))
         return;
     DependentCollections const dependents(*this, slot);
-    dependents.check(empty);
+    dependents.check(value);
     if (dependents.isEmpty())
     {
         notifyModifying(slot.index());
-        return applyPlain(slot, empty);
+        return applyPlain(slot, value);
     }
     ChangeOfSeveral change(*this);
     dependents.leave();
     notifyModifying(slot.index());
-    applyPlain(slot, empty);
+    applyPlain(slot, value);
     dependents.enter();
     change.commit();
 }
 
 void ReflectiveModelElementImpl::applyPlain(ReflectiveSlot const& slot, Value const& value)
 {
-    internal::ReflectiveCell const added =
-        slot.keep(meta::MetaRegistry::getInstance().convertValueForOwnership(value));
-    internal::ReflectiveCell const removed = m_cells->get(slot);
-    m_cells->set(slot, added);
+    internal::ReflectiveCell const added = slot.keepOwn(value);
+    internal::ReflectiveCell const removed = cells().get(slot);
+    cells().set(slot, added);
     slot.release(removed);
 }
 
@@ -184,7 +220,8 @@ void ReflectiveModelElementImpl::setReference(ReflectiveSlot const& slot,
     if (property->isSetOnce() && present)
         reportException(tarnkiln::messages::CannotSetReadOnlyProperty(property->getName()));
     DependentCollections const dependents(*this, slot);
-    dependents.check(Value::createElementValue(property, target));
+    if (!dependents.isEmpty())
+        dependents.check(Value::createElementValue(property, target));
     if (target)
     {
         checkOwnKey(slot, target);
@@ -202,17 +239,16 @@ void ReflectiveModelElementImpl::setReference(ReflectiveSlot const& slot,
 void ReflectiveModelElementImpl::applyReference(ReflectiveSlot const& slot,
                                                 ModelElement const& target)
 {
-    Feature const feature = slot.property();
-    Feature const opposite = feature.opposite();
+    internal::SlotFacts const facts = layout().factsOf(slot);
     ModelElement const removed(basicTarget(slot));
-    if (removed && opposite)
-        _inverseRemoveThis(removed.getImpl(), opposite);
+    if (removed && facts.opposite)
+        _inverseRemoveThis(removed.getImpl(), facts.opposite);
     basicSetTarget(slot, target);
-    if (target && opposite)
-        _inverseAddThis(target.getImpl(), opposite, /*force=*/false);
-    else if (target && feature.isComposite())
-        _setContainedByThis(target.getImpl(), feature);
-    if (removed && !removed->isProxy() && !opposite && feature.isComposite())
+    if (target && facts.opposite)
+        _inverseAddThis(target.getImpl(), facts.opposite, /*force=*/false);
+    else if (target && facts.isComposite)
+        _setContainedByThis(target.getImpl(), slot.property());
+    if (removed && !removed->isProxy() && !facts.opposite && facts.isComposite)
         _basicSetUncontained(removed.getImpl());
 }
 
@@ -228,7 +264,8 @@ void ReflectiveModelElementImpl::setContainer(ReflectiveSlot const& slot,
     if (property->isSetOnce() && present && present->isLive())
         reportException(tarnkiln::messages::CannotSetReadOnlyProperty(property->getName()));
     DependentCollections const dependents(*this, slot);
-    dependents.check(Value::createElementValue(property, container));
+    if (!dependents.isEmpty())
+        dependents.check(Value::createElementValue(property, container));
     if (container)
     {
         if (container->isProxy())
@@ -250,7 +287,7 @@ void ReflectiveModelElementImpl::setContainer(ReflectiveSlot const& slot,
 void ReflectiveModelElementImpl::applyContainer(ReflectiveSlot const& slot,
                                                 ModelElement const& container)
 {
-    Feature const opposite = Feature(slot.property()).opposite();
+    Feature const opposite = layout().factsOf(slot).opposite;
     makeUncontained();
     if (!container)
         return;

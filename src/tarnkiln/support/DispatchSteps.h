@@ -12,6 +12,7 @@
 
 #include <type_traits>
 #include <typeinfo>
+#include <utility>
 
 namespace tarn::kiln::support {
 
@@ -143,7 +144,7 @@ Value Dispatched<Derived, Base>::getPropertyValue(meta::Property const& property
     boost::optional<Value> value;
     if (mayRead(property, tag))
         atReadable<Derived>(property, [&](auto row) { value = row.get(self(), property, tag); });
-    return value ? *value : Base::getPropertyValue(property, tag);
+    return value ? std::move(*value) : Base::getPropertyValue(property, tag);
 }
 
 /// Whether `Impl` and the classes above leave what `Dispatched` says of metaclass and values alone.

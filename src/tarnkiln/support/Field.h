@@ -79,6 +79,7 @@ Target* resolve(ModelElement::Impl const& element, CountedPointer<Target>& field
     if (slot.opposite && !slot.composite && !element._inverseContainsThis(resolved, *slot.opposite))
         return target;
     field = CountedPointer<Target>(resolved);
+    model->getAnchor().get()->changed();
     return resolved;
 }
 

@@ -29,26 +29,41 @@ public:
 
     /// Keeps `value` for `slot`, in the place of one that was kept before. Always the same `T` for
     /// a slot.
-    template <class T> void keep(unsigned long slot, T value)
+    ///
+    /// \param note  a number of the caller's own that goes with the value.
+    template <class T> void keep(unsigned long slot, T value, std::uint32_t note = 0)
     {
         if (T* const before = find<T>(slot))
             *before = std::move(value);
         else
             m_first = make(slot, std::move(value));
+        entryOf(slot)->note = note;
     }
     /// The value for `slot`, which is of the type `T`; null if there is none.
     template <class T> T* find(unsigned long slot)
     {
-        for (Entry* entry = m_first; entry; entry = entry->next)
-        {
-            if (entry->slot == slot)
-                return &static_cast<EntryOf<T>*>(entry)->value;
-        }
-        return nullptr;
+        Entry* const entry = entryOf(slot);
+        return entry ? &static_cast<EntryOf<T>*>(entry)->value : nullptr;
     }
     template <class T> T const* find(unsigned long slot) const
     {
         return const_cast<OldValues*>(this)->find<T>(slot);
+    }
+
+    /// Calls `visit(slot, value, note)` with references to each value but that of slot 0; all are of
+    /// the type `T`.
+    template <class T, class Visit> void forEach(Visit const& visit)
+    {
+        for (Entry* entry = m_first; entry; entry = entry->next)
+        {
+            if (entry->slot != 0)
+                visit(entry->slot, static_cast<EntryOf<T>*>(entry)->value, entry->note);
+        }
+    }
+    /// The number that came with the value for `slot`; there must be one.
+    std::uint32_t getNote(unsigned long slot) const
+    {
+        return const_cast<OldValues*>(this)->entryOf(slot)->note;
     }
 
 private:
@@ -63,6 +78,7 @@ private:
         Entry* next;
         void (*release)(Entry*, bool inPlace) noexcept;
         std::uint32_t slot;
+        std::uint32_t note = 0;
     };
     template <class T> struct EntryOf : Entry
     {
@@ -85,6 +101,13 @@ private:
 
     static constexpr std::size_t ROOM = 32;
 
+    Entry* entryOf(unsigned long slot)
+    {
+        Entry* entry = m_first;
+        while (entry && entry->slot != slot)
+            entry = entry->next;
+        return entry;
+    }
     bool isInPlace(Entry const* entry) const
     {
         return static_cast<void const*>(entry) == static_cast<void const*>(m_room);

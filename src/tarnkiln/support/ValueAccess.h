@@ -110,7 +110,7 @@ template <class T> struct Kept<boost::optional<T>> : Kept<T>
 {};
 template <class T> Value ValueAccess<T>::make(meta::Type const& type, T const& payload)
 {
-    Value value(ValueMeta(Value::started(type)), nullptr);
+    Value value(type, ValueFlags::Single, nullptr);
     store(value, payload);
     return value;
 }
@@ -122,18 +122,20 @@ template <class T> void ValueAccess<T>::store(Value& value, T const& payload)
     {
         using Entry = typename T::value_type;
         using Type = typename Kept<Entry>::Type;
-        value.setPayload(payload ? new Type(static_cast<Type>(*payload)) : nullptr);
+        value.m_payload.template setType<Type>();
+        if (payload)
+            value.m_payload.store(static_cast<Type>(*payload));
     }
     else if constexpr (OneOf<T, long, meta::Language>)
     {
         // The sign survives: the reader narrows again.
         if (isKeptAsLiteral<T>(value.m_type))
-            value.setPayload(new unsigned long(static_cast<unsigned long>(payload)));
+            value.m_payload.store(static_cast<unsigned long>(payload));
         else
-            value.setPayload(new T(payload));
+            value.m_payload.store(payload);
     }
     else
-        value.setPayload(new T(payload));
+        value.m_payload.store(payload);
 
     if constexpr (isContainerPayload<T>)
     {

@@ -1,46 +1,85 @@
 /// \file
-/// What a `Value` does with a payload of its own.
+/// How payloads of a type are made and read.
 #pragma once
 #include "tarnkiln/kernel/Value.h"
 
+#include <new>
+#include <type_traits>
+#include <utility>
+
 namespace tarn::kiln::support {
 
-template <class T> void genericDeleter(void* payload)
+/// What a `ValuePayload` does with a `T`.
+template <class T> struct PayloadOf
 {
-    delete static_cast<T*>(payload);
-}
+    static constexpr bool IN_PLACE = sizeof(T) <= ValuePayload::ROOM &&
+                                     alignof(T) <= alignof(void*) &&
+                                     std::is_nothrow_move_constructible_v<T>;
 
-/// A copy; null of null.
-template <class T> void* genericCloner(void* payload)
-{
-    return payload ? new T(*static_cast<T const*>(payload)) : nullptr;
-}
+    static void destroy(void* payload)
+    {
+        if constexpr (IN_PLACE)
+            static_cast<T*>(payload)->~T();
+        else
+            delete static_cast<T*>(payload);
+    }
+    static void copy(void const* payload, void* place)
+    {
+        if constexpr (IN_PLACE)
+            new (place) T(*static_cast<T const*>(payload));
+    }
+    static void* clone(void const* payload) { return new T(*static_cast<T const*>(payload)); }
+    static void relocate(void* from, void* to) noexcept
+    {
+        if constexpr (IN_PLACE)
+        {
+            new (to) T(std::move(*static_cast<T*>(from)));
+            static_cast<T*>(from)->~T();
+        }
+    }
+    static bool equals(void const* left, void const* right)
+    {
+        return *static_cast<T const*>(left) == *static_cast<T const*>(right);
+    }
 
-/// Null equals nothing but null.
-template <class T> bool genericComparator(void* left, void* right)
-{
-    if (!left || !right)
-        return left == right;
-    return *static_cast<T const*>(left) == *static_cast<T const*>(right);
-}
+    static constexpr ValuePayload::Functions FUNCTIONS{
+        IN_PLACE && std::is_trivially_copyable_v<T> && std::is_trivially_destructible_v<T>,
+        IN_PLACE,
+        destroy,
+        copy,
+        clone,
+        relocate,
+        equals};
+};
 }  // namespace tarn::kiln::support
 
 namespace tarn::kiln {
 
-template <class T> void Value::setPayload(T* payload)
+template <class T> bool ValuePayload::isOf() const
 {
-    m_data = payload;
-    m_deleter = support::genericDeleter<T>;
-    m_cloner = support::genericCloner<T>;
-    m_comparator = support::genericComparator<T>;
+    return m_functions == &support::PayloadOf<T>::FUNCTIONS;
+}
+
+template <class T> void ValuePayload::setType()
+{
+    m_functions = &support::PayloadOf<T>::FUNCTIONS;
+}
+
+template <class T> void ValuePayload::store(T const& object)
+{
+    if constexpr (support::PayloadOf<T>::IN_PLACE)
+        m_data = new (m_place) T(object);
+    else
+        m_data = new T(object);
+    setType<T>();
 }
 
 template <class T> T const* Value::payload() const
 {
-    // The deleter tells what the payload is: type and shape can be right and the payload be, say,
-    // a managed collection that was declared unmanaged.
-    if (m_data && m_deleter != support::genericDeleter<T>)
+    // Type and shape can be right and the payload be, say, a managed collection that was declared
+    // unmanaged.
+    if (m_payload.address() && !m_payload.isOf<T>())
         failCast();
-    return static_cast<T const*>(m_data);
+    return static_cast<T const*>(m_payload.address());
 }
 }  // namespace tarn::kiln

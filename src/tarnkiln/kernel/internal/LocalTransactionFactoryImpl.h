@@ -23,7 +23,8 @@ private:
         meta::TransactionOrigin origin;
         origin.setModel(m_model->getUuid());
         origin.setLanguage(meta::Language::CPlusPlus);
-        origin.setTransactionId(ElementImpl::generateNewUuid());
+        if (!m_model->getCurrentTransaction())  // a nested one is known by its parent's
+            origin.setTransactionId(ElementImpl::generateNewUuid());
         return m_model->innerBeginTransaction(m_tag, origin, deep);
     }
 

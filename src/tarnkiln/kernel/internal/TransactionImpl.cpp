@@ -138,6 +138,7 @@ void TransactionImpl::elementCreated(ModelElement::Impl* element)
         reportException(tarnkiln::messages::CreateWithDestroyAll());
     announceFirstChange();
     record(element, [](ModelElement::Impl::Changes& changes) { changes.setCreated(); });
+    set(CREATED_SOME);
 }
 
 void TransactionImpl::forgetCreation(ModelElement::Impl const* element)
@@ -511,6 +512,21 @@ TransactionResult TransactionImpl::undo()
     pinElements();
     set(ROLLED_BACK);
     // First what was created: it may have the UUID of what comes back.
+    if (has(CREATED_SOME))
+        takeBackCreated();
+    if (has(DESTROYED_SOME))
+        bringBackDestroyed();
+    m_changes->forEachBackward([](ModelElement::Impl::Changes& record) {
+        if (record.getKeptElement() && !record.isCreated())
+            record.getKeptElement()->copyStateFromStorage(
+                static_cast<ModelElement::Impl::Storage*>(&record));
+    });
+    unpinElements();
+    return TransactionResult::RolledBack;
+}
+
+void TransactionImpl::takeBackCreated()
+{
     m_changes->forEachBackward([this](ModelElement::Impl::Changes& record) {
         ModelElement::Impl* const element = record.getKeptElement();
         if (!element || !record.isCreated() || record.isDestroyed())
@@ -519,16 +535,13 @@ TransactionResult TransactionImpl::undo()
         m_model->remove(element);
         element->invalidate();
     });
+}
+
+void TransactionImpl::bringBackDestroyed()
+{
     m_changes->forEachBackward([this](ModelElement::Impl::Changes& record) {
         if (record.isDestroyed() && !record.isCreated())
             m_model->resurrectElement(record.getKeptElement());
     });
-    m_changes->forEachBackward([](ModelElement::Impl::Changes& record) {
-        if (record.getKeptElement() && !record.isCreated())
-            record.getKeptElement()->copyStateFromStorage(
-                static_cast<ModelElement::Impl::Storage*>(&record));
-    });
-    unpinElements();
-    return TransactionResult::RolledBack;
 }
 } // namespace tarn::kiln::internal

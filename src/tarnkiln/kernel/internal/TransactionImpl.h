@@ -119,7 +119,8 @@ private:
         FREEZE_ON_NOTIFY = 128,
         DEEP = 256,
         REVERT_UNCHANGED = 512,
-        DESTROYED_SOME = 1024 ///< Records keep destroyed elements.
+        DESTROYED_SOME = 1024, ///< Records keep destroyed elements.
+        CREATED_SOME = 2048
     };
     bool has(Flag flag) const { return (m_flags & flag) != 0; }
     void set(Flag flag) { m_flags |= flag; }
@@ -137,6 +138,8 @@ private:
                    ModelElement::Impl const* element) const;
     void pinElements();
     void unpinElements();
+    void takeBackCreated();
+    void bringBackDestroyed();
 
     Model m_model;
     TransactionGroup* m_group; ///< Null after the end, and for one that stands alone until then.

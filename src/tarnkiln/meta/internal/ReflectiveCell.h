@@ -22,7 +22,8 @@ enum class CellState : std::uint8_t
 /// | Slot | Word |
 /// |---|---|
 /// | number, Boolean, date-time, enumeration | the payload itself |
-/// | text, UUID | a pointer to the payload; null for an empty text and for the nil UUID |
+/// | text | a pointer to a `PackedText`; null for an empty one |
+/// | UUID | a pointer to it; null for the nil one |
 /// | another plain value | `Boxed` |
 /// | reference | a counted pointer to the target, which may be a proxy or dead |
 /// | collection | an owned pointer to it; null until it is first asked for |

@@ -8,31 +8,32 @@
 
 namespace tarn::kiln::internal {
 
-std::size_t ReflectiveCells::sizeFor(std::size_t slots)
+std::size_t ReflectiveCells::sizeFor(ReflectiveLayout const& layout)
 {
-    return sizeof(ReflectiveCells) + slots * (sizeof(std::uint64_t) + sizeof(CellState));
+    return sizeof(ReflectiveCells) +
+           layout.cellCount() * (sizeof(std::uint64_t) + sizeof(CellState));
 }
 
-ReflectiveCells::Owner ReflectiveCells::create(ReflectiveLayout::Handle const& layout)
+ReflectiveCells* ReflectiveCells::create(void* place, ReflectiveLayout::Handle const& layout)
 {
-    std::size_t const slots = layout.get()->slots().size();
-    void* const block = ::operator new(sizeFor(slots));
-    Owner cells(new (block) ReflectiveCells(layout));
-    std::memset(static_cast<void*>(cells.get() + 1), 0, sizeFor(slots) - sizeof(ReflectiveCells));
+    auto* const cells = new (place) ReflectiveCells(layout);
+    std::memset(static_cast<void*>(cells + 1), 0, sizeFor(*layout.get()) - sizeof(ReflectiveCells));
     return cells;
 }
 
-void ReflectiveCells::destroy(ReflectiveCells* cells)
+void ReflectiveCells::destroy()
 {
-    for (ReflectiveSlot const& slot : cells->layout().slots())
-        slot.release(cells->get(slot));
-    cells->~ReflectiveCells();
-    ::operator delete(cells);
+    for (ReflectiveSlot const& slot : layout().slots())
+    {
+        if (slot.kind() != SlotKind::Container)
+            slot.release(get(slot));
+    }
+    this->~ReflectiveCells();
 }
 
 AbstractOwnedCollection* ReflectiveCells::getCollection(ReflectiveSlot const& slot) const
 {
-    std::uint64_t& word = const_cast<ReflectiveCells*>(this)->words()[layout().numberOf(slot)];
+    std::uint64_t& word = const_cast<ReflectiveCells*>(this)->words()[slot.cell()];
     return reinterpret_cast<AbstractOwnedCollection*>(
         std::atomic_ref(word).load(std::memory_order_acquire));
 }
@@ -42,7 +43,7 @@ AbstractOwnedCollection* ReflectiveCells::publish(ReflectiveSlot const& slot,
 {
     std::uint64_t present = 0;
     auto const word = reinterpret_cast<std::uint64_t>(made.get());
-    std::atomic_ref entry(words()[layout().numberOf(slot)]);
+    std::atomic_ref entry(words()[slot.cell()]);
     if (!entry.compare_exchange_strong(present, word, std::memory_order_acq_rel))
         return reinterpret_cast<AbstractOwnedCollection*>(present);
     return made.release();
@@ -50,7 +51,7 @@ AbstractOwnedCollection* ReflectiveCells::publish(ReflectiveSlot const& slot,
 
 bool ReflectiveCells::markLoaded(ReflectiveSlot const& slot)
 {
-    std::atomic_ref state(states()[layout().numberOf(slot)]);
+    std::atomic_ref state(states()[slot.cell()]);
     return state.exchange(CellState::Loaded) != CellState::Loaded;
 }
 }  // namespace tarn::kiln::internal

@@ -9,20 +9,22 @@
 
 namespace tarn::kiln::internal {
 
-/// A block with the layout, a word for each slot, and behind them a byte for the state of each.
+/// The layout, a word for each slot that has a cell, and behind them a byte for the state of each.
+///
+/// Lies in one piece of memory behind the element.
 ///
 /// Threads: as the element; collections may be entered by several threads at once.
 class ReflectiveCells
 {
 public:
-    struct Deleter
-    {
-        void operator()(ReflectiveCells* cells) const { ReflectiveCells::destroy(cells); }
-    };
-    using Owner = std::unique_ptr<ReflectiveCells, Deleter>;
-
+    /// In bytes.
+    static std::size_t sizeFor(ReflectiveLayout const& layout);
     /// All cells are empty.
-    static Owner create(ReflectiveLayout::Handle const& layout);
+    ///
+    /// \param place  of the size for the layout.
+    static ReflectiveCells* create(void* place, ReflectiveLayout::Handle const& layout);
+    /// Frees what the cells hold, and not the place.
+    void destroy();
 
     ReflectiveCells(ReflectiveCells const&) = delete;
     ReflectiveCells& operator=(ReflectiveCells const&) = delete;
@@ -30,22 +32,18 @@ public:
     ReflectiveLayout const& layout() const { return *m_layout.get(); }
     ReflectiveLayout::Handle const& layoutHandle() const { return m_layout; }
 
+    /// Of a slot that has a cell, as in all that follows.
     ReflectiveCell get(ReflectiveSlot const& slot) const
     {
-        std::size_t const number = layout().numberOf(slot);
-        return {words()[number], states()[number]};
+        return {words()[slot.cell()], states()[slot.cell()]};
     }
     /// Where the word of the slot lies, as long as the element lives.
-    std::uint64_t const& word(ReflectiveSlot const& slot) const
-    {
-        return words()[layout().numberOf(slot)];
-    }
+    std::uint64_t const& word(ReflectiveSlot const& slot) const { return words()[slot.cell()]; }
     /// Frees nothing of what was there.
     void set(ReflectiveSlot const& slot, ReflectiveCell cell)
     {
-        std::size_t const number = layout().numberOf(slot);
-        words()[number] = cell.word;
-        states()[number] = cell.state;
+        words()[slot.cell()] = cell.word;
+        states()[slot.cell()] = cell.state;
     }
     /// The collection of the slot; null while there is none.
     AbstractOwnedCollection* getCollection(ReflectiveSlot const& slot) const;
@@ -58,15 +56,13 @@ public:
 private:
     explicit ReflectiveCells(ReflectiveLayout::Handle const& layout) : m_layout(layout) {}
     ~ReflectiveCells() = default;
-    static void destroy(ReflectiveCells* cells);
-    static std::size_t sizeFor(std::size_t slots);
 
     std::uint64_t* words() { return reinterpret_cast<std::uint64_t*>(this + 1); }
     std::uint64_t const* words() const { return reinterpret_cast<std::uint64_t const*>(this + 1); }
-    CellState* states() { return reinterpret_cast<CellState*>(words() + layout().slots().size()); }
+    CellState* states() { return reinterpret_cast<CellState*>(words() + layout().cellCount()); }
     CellState const* states() const
     {
-        return reinterpret_cast<CellState const*>(words() + layout().slots().size());
+        return reinterpret_cast<CellState const*>(words() + layout().cellCount());
     }
 
     ReflectiveLayout::Handle const m_layout;

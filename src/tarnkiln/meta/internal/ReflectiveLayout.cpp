@@ -1,12 +1,16 @@
 #include "tarnkiln/meta/internal/ReflectiveLayout.h"
 
 #include "tarnkiln/Assert.h"
+#include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 
 #include <algorithm>
 #include <limits>
+#include <memory>
+#include <mutex>
 #include <unordered_map>
+#include <utility>
 
 namespace tarn::kiln::internal {
 namespace {
@@ -16,15 +20,24 @@ using Layouts = std::unordered_map<meta::Class::Impl const*, ReflectiveLayout::H
 /// The layouts that this thread made last, by class. A class that is in here can not be freed and
 /// its address not be used again.
 thread_local Layouts latest;
+/// Often the next element is of the same class. One of `latest`, or null.
+thread_local constinit ReflectiveLayout const* last = nullptr;
+
+std::mutex knowing;  ///< Held by the one who remembers facts.
 }  // namespace
 
 ReflectiveLayout::Handle ReflectiveLayout::of(meta::Class const& metaClass)
 {
+    if (last && last->getMetaClass() == metaClass && last->isCurrent())
+        return Handle(last);
     auto const known = latest.find(metaClass.getImpl());
     if (known != latest.end() && known->second.get()->isCurrent())
+    {
+        last = known->second.get();
         return known->second;
-
+    }
     Handle const made(new ReflectiveLayout(metaClass));
+    last = nullptr;
     std::erase_if(latest, [](auto const& entry) { return !entry.second.get()->getMetaClass(); });
     return latest.insert_or_assign(metaClass.getImpl(), made).first->second;
 }
@@ -42,8 +55,62 @@ ReflectiveLayout::ReflectiveLayout(meta::Class const& metaClass) : m_metaClass(m
         if (slot.index() <= std::numeric_limits<int>::max())  // no negative one
             m_recordSize = std::max(m_recordSize, slot.index() + 1);
     }
+    numberSlots();
     tieDependents();
     buildIndex();
+    listModels();
+}
+
+ReflectiveLayout::~ReflectiveLayout()
+{
+    for (Known const* known = m_known.load(); known;)
+        delete std::exchange(known, known->earlier);
+}
+
+void ReflectiveLayout::listModels()
+{
+    auto const add = [this](ModelElement::Impl const* element) {
+        if (!element || !element->getModelImpl())
+            return;
+        auto const& anchor = element->getModelImpl()->getAnchor();
+        if (std::none_of(m_models.begin(), m_models.end(),
+                         [&](auto const& listed) { return listed.get() == anchor.get(); }))
+            m_models.push_back(anchor);
+    };
+    for (meta::Class const& member : m_chain)
+        add(member.getImpl());
+    for (ModelElement const& pinned : m_pins)
+        add(pinned.getImpl());
+    if (m_models.size() == 1)
+        m_onlyModel = m_models.front().get();
+}
+
+/// Remembers only what has not changed while it was asked.
+SlotFacts ReflectiveLayout::askFacts(ReflectiveSlot const& slot) const
+{
+    if (std::uint64_t const version = getSettledVersion())
+        remember(version);
+    return SlotFacts(m_metaClass, slot);
+}
+
+void ReflectiveLayout::remember(std::uint64_t version) const
+{
+    auto made = std::make_unique<Known>();
+    made->version = version;
+    for (ReflectiveSlot const& slot : m_slots)
+        made->facts.emplace_back(m_metaClass, slot);
+    if (getSettledVersion() != version)
+        return;
+
+    std::lock_guard const lock(knowing);
+    Known const* const known = m_known.load(std::memory_order_relaxed);
+    if (known && known->facts == made->facts)
+    {
+        known->version.store(version, std::memory_order_relaxed);
+        return;
+    }
+    made->earlier = known;
+    m_known.store(made.release(), std::memory_order_release);
 }
 
 bool ReflectiveLayout::isOnChain(meta::Class::Impl const* metaClass) const
@@ -72,6 +139,17 @@ void ReflectiveLayout::addSlots(meta::Class const& owner)
     }
 }
 
+void ReflectiveLayout::numberSlots()
+{
+    TARNKILN_ASSERT(m_slots.size() < NONE, "a class has fewer properties", m_slots.size());
+    for (std::size_t number = 0; number < m_slots.size(); ++number)
+    {
+        m_slots[number].setPlaces(number, m_cellCount);
+        if (m_slots[number].kind() != SlotKind::Container)
+            ++m_cellCount;
+    }
+}
+
 /// Enters each slot whose opposite is qualified by a property of the class with that property.
 void ReflectiveLayout::tieDependents()
 {
@@ -90,7 +168,6 @@ void ReflectiveLayout::tieDependents()
 
 void ReflectiveLayout::buildIndex()
 {
-    TARNKILN_ASSERT(m_slots.size() < NONE, "a class has fewer properties", m_slots.size());
     std::size_t size = 4;
     while (size < 2 * m_slots.size())
         size *= 2;
@@ -120,6 +197,17 @@ ReflectiveSlot const* ReflectiveLayout::findByIndex(unsigned long index) const
 
 /// Whether a layout made now would be the same.
 bool ReflectiveLayout::isCurrent() const
+{
+    std::uint64_t const version = getSettledVersion();
+    if (version != 0 && version == m_currentVersion.load(std::memory_order_relaxed))
+        return true;
+    if (!isUnchanged())
+        return false;
+    m_currentVersion.store(version, std::memory_order_relaxed);
+    return true;
+}
+
+bool ReflectiveLayout::isUnchanged() const
 {
     auto known = m_facts.begin();
     meta::Class::Impl const* at = m_metaClass.getImpl();

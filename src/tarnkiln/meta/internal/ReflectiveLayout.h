@@ -5,7 +5,9 @@
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/internal/PropertyFacts.h"
 #include "tarnkiln/meta/internal/ReflectiveSlot.h"
+#include "tarnkiln/meta/internal/SlotFacts.h"
 #include "tarnkiln/support/CountedPointer.h"
+#include "tarnkiln/support/ModelAnchor.h"
 
 #include <atomic>
 #include <cstddef>
@@ -19,7 +21,7 @@ namespace tarn::kiln::internal {
 /// Elements of a class share one layout until the class changes, and each keeps the one it was made
 /// with: a property that the class gains later is none of theirs.
 ///
-/// Threads: immutable; handles to it may be copied and dropped anywhere.
+/// Threads: any; handles to it may be copied and dropped anywhere.
 class ReflectiveLayout
 {
 public:
@@ -36,10 +38,7 @@ public:
 
     meta::Class const& getMetaClass() const { return m_metaClass; }
     std::vector<ReflectiveSlot> const& slots() const { return m_slots; }
-    std::size_t numberOf(ReflectiveSlot const& slot) const
-    {
-        return static_cast<std::size_t>(&slot - m_slots.data());
-    }
+    std::size_t cellCount() const { return m_cellCount; }
     /// Null if the property has no slot.
     ReflectiveSlot const* find(meta::Property::Impl const* property) const
     {
@@ -61,6 +60,19 @@ public:
     std::vector<ReflectiveSlot const*> const& slotsByIndex() const { return m_slotsByIndex; }
     /// The first slot of that property index; null if there is none.
     ReflectiveSlot const* findByIndex(unsigned long index) const;
+    /// What is true of the slot now: asked of the metamodel once, and again when that has changed.
+    SlotFacts factsOf(ReflectiveSlot const& slot) const
+    {
+        SlotFacts const* const known = knownFacts(slot);
+        return known ? *known : askFacts(slot);
+    }
+    /// Whether the property of the slot may be read now.
+    bool mayRead(ReflectiveSlot const& slot,
+                 ModelElement::Impl::ReflectionPrivateTag const& tag) const
+    {
+        SlotFacts const* const known = knownFacts(slot);
+        return known ? known->mayRead(tag) : askFacts(slot).mayRead(tag);
+    }
     /// The slots of the change records of elements.
     unsigned long getRecordSize() const { return m_recordSize; }
 
@@ -74,12 +86,49 @@ public:
 private:
     static constexpr std::uint16_t NONE = 0xFFFF;
 
-    explicit ReflectiveLayout(meta::Class const& metaClass);
-    ~ReflectiveLayout() = default;
+    /// The facts of all slots, and the version of the models for which they hold.
+    struct Known
+    {
+        std::vector<SlotFacts> facts;
+        Known const* earlier = nullptr;  ///< Owned, for a reader may still be at it.
+        mutable std::atomic<std::uint64_t> version;
+    };
 
+    explicit ReflectiveLayout(meta::Class const& metaClass);
+    ~ReflectiveLayout();
+
+    /// As long as it is the same, nothing in the models that the class depends on has changed; 0
+    /// while one of them is being changed.
+    std::uint64_t getSettledVersion() const
+    {
+        if (m_onlyModel)
+            return m_onlyModel->getSettledVersion();
+        std::uint64_t sum = 0;
+        for (auto const& model : m_models)
+        {
+            std::uint64_t const version = model.get()->getSettledVersion();
+            if (version == 0)
+                return 0;
+            sum += version;
+        }
+        return sum;
+    }
+    /// Null if they must be asked.
+    SlotFacts const* knownFacts(ReflectiveSlot const& slot) const
+    {
+        Known const* const known = m_known.load(std::memory_order_acquire);
+        if (!known || known->version.load(std::memory_order_relaxed) != getSettledVersion())
+            return nullptr;
+        return &known->facts[slot.number()];
+    }
+    SlotFacts askFacts(ReflectiveSlot const& slot) const;
+    void remember(std::uint64_t version) const;
+    void listModels();
     bool isCurrent() const;
+    bool isUnchanged() const;
     bool isOnChain(meta::Class::Impl const* metaClass) const;
     void addSlots(meta::Class const& owner);
+    void numberSlots();
     void tieDependents();
     void buildIndex();
     std::size_t hash(meta::Property::Impl const* property) const
@@ -96,7 +145,12 @@ private:
     std::vector<ReflectiveSlot const*> m_slotsByIndex;
     std::vector<std::uint16_t> m_index;  ///< Slot numbers, hashed by the address of the property.
     std::size_t m_indexMask = 0;
+    std::size_t m_cellCount = 0;
     unsigned long m_recordSize = 0;
+    std::vector<support::CountedPointer<support::ModelAnchor>> m_models;  ///< Of all of the above.
+    support::ModelAnchor const* m_onlyModel = nullptr;  ///< Of `m_models`, if it is one.
+    mutable std::atomic<std::uint64_t> m_currentVersion{0};  ///< When the facts were last the same.
+    mutable std::atomic<Known const*> m_known{nullptr};
     mutable std::atomic<std::uint32_t> m_refCount{0};
 };
 }  // namespace tarn::kiln::internal

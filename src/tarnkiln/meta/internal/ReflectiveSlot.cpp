@@ -7,6 +7,8 @@
 #include "tarnkiln/meta/MetaRegistry.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/internal/PackedPayload.h"
+#include "tarnkiln/meta/internal/PayloadAccess.h"
+#include "tarnkiln/support/ValueAccess.h"
 
 #include <exception>
 
@@ -21,6 +23,16 @@ Value initialValueOf(meta::Property const& property)
 {
     boost::optional<Value> const declared = property->defaultValue();
     return declared ? *declared : Value::createEmptyValue(property);
+}
+
+/// What `use` answers for the payload of a value that can be packed.
+template <class T, class Use> auto usePayload(Value const& value, Use const& use)
+{
+    if (T const* const payload = support::PayloadAccess::get<T>(value))
+        return use(*payload);
+    if (value.getFlags() == ValueFlags::Single)
+        return use(value.getValue<T>());
+    return use(*value.getValue<boost::optional<T>>());
 }
 
 boost::optional<Value> emptyValueOf(meta::Property const& property)
@@ -67,10 +79,22 @@ ReflectiveSlot::ReflectiveSlot(meta::Property const& property)
     if (!isPlain(m_kind))
         return;
     Value const initial = initialValueOf(property);
-    if (isInitialShared())
-        m_initial = initial;
     if (property->getLower() != 1)
         m_empty = emptyValueOf(property);
+    if (!isInitialShared())
+        return;
+    m_initial = initial;
+    ReflectiveCell const cell = keep(initial);
+    if (owns(cell))
+        free(cell);
+    else
+        m_initialCell = cell;
+}
+
+void ReflectiveSlot::setPlaces(std::size_t number, std::size_t cell)
+{
+    m_number = static_cast<std::uint16_t>(number);
+    m_cell = static_cast<std::uint16_t>(cell);
 }
 
 /// Whether nothing but the property decides what elements start with: the value of a text may
@@ -85,15 +109,16 @@ bool ReflectiveSlot::isInitialShared() const
 
 ReflectiveCell ReflectiveSlot::keepInitial() const
 {
-    Value const& initial = m_initial ? *m_initial : initialValueOf(m_property);
-    return keep(MetaRegistry::getInstance().convertValueForOwnership(initial));
+    if (m_initialCell && !MetaRegistry::getInstance().hasOwnershipConverters())
+        return *m_initialCell;
+    return keepOwn(m_initial ? *m_initial : initialValueOf(m_property));
 }
 
 // ---------------------------------------------------------------------------- plain values
 
 bool ReflectiveSlot::isEmpty(Value const& value) const
 {
-    return m_empty && value.isAbsent() && value.getFlags() == m_empty->getFlags() &&
+    return value.isAbsent() && m_empty && value.getFlags() == m_empty->getFlags() &&
            value.getType() == m_empty->getType() &&
            value.isReflective() == m_empty->isReflective() &&
            value.isManaged() == m_empty->isManaged();
@@ -106,7 +131,10 @@ bool ReflectiveSlot::isPackable(Value const& value) const
     bool const isShaped = flags == ValueFlags::Single ||
                           (flags == ValueFlags::OptionalSingle && m_kind != SlotKind::Enumeration);
     return m_kind < SlotKind::Other && isShaped && !value.isAbsent() && value.getType() == m_type &&
-           !value.isReflective() && value.isManaged();
+           !value.isReflective() && value.isManaged() && withPayloadType(m_kind, [&]<class T>() {
+               T const* const payload = support::PayloadAccess::get<T>(value);
+               return !payload || Packed<T>::fits(*payload);
+           });
 }
 
 Value ReflectiveSlot::read(ReflectiveCell cell) const
@@ -115,10 +143,17 @@ Value ReflectiveSlot::read(ReflectiveCell cell) const
         return *m_empty;
     if (cell.state == CellState::Boxed)
         return *cell.pointer<Value>();
+    if (m_kind == SlotKind::Enumeration)
+        return cell.state == CellState::Single
+                   ? Value(m_type, Packed<long>::unpack(cell.word))
+                   : Value(m_type, boost::make_optional(Packed<long>::unpack(cell.word)));
     return withPayloadType(m_kind, [&]<class T>() {
+        // The kind was chosen by the type: there is nothing to check.
+        using support::ValueAccess;
         T const payload = Packed<T>::unpack(cell.word);
-        return cell.state == CellState::Single ? Value(m_type, payload)
-                                               : Value(m_type, boost::optional<T>(payload));
+        return cell.state == CellState::Single
+                   ? ValueAccess<T>::make(m_type, payload)
+                   : ValueAccess<boost::optional<T>>::make(m_type, boost::optional<T>(payload));
     });
 }
 
@@ -134,12 +169,35 @@ ReflectiveCell ReflectiveSlot::keep(Value const& value) const
         return cell;
     }
     bool const isSingle = value.getFlags() == ValueFlags::Single;
-    cell.word = withPayloadType(m_kind, [&]<class T>() {
-        return Packed<T>::pack(isSingle ? value.getValue<T>()
-                                        : *value.getValue<boost::optional<T>>());
-    });
+    cell.word =
+        withPayloadType(m_kind, [&]<class T>() { return usePayload<T>(value, Packed<T>::pack); });
     cell.state = isSingle ? CellState::Single : CellState::Optional;
     return cell;
+}
+
+ReflectiveCell ReflectiveSlot::keepOwn(Value const& value) const
+{
+    MetaRegistry& registry = MetaRegistry::getInstance();
+    if (!registry.hasOwnershipConverters())
+        return keep(value);
+    return keep(registry.convertValueForOwnership(value));
+}
+
+/// Whether there is something to be freed behind a cell of a plain value.
+bool ReflectiveSlot::owns(ReflectiveCell cell) const
+{
+    if (cell.state == CellState::Empty || cell.state == CellState::Boxed)
+        return cell.state == CellState::Boxed;
+    return withPayloadType(m_kind,
+                           [&]<class T>() { return !Packed<T>::IN_PLACE && cell.word != 0; });
+}
+
+void ReflectiveSlot::free(ReflectiveCell cell) const noexcept
+{
+    if (cell.state == CellState::Boxed)
+        delete cell.pointer<Value>();
+    else if (cell.state != CellState::Empty)
+        withPayloadType(m_kind, [&]<class T>() { Packed<T>::free(cell.word); });
 }
 
 Value ReflectiveSlot::asRequired(Value const& value) const
@@ -161,9 +219,8 @@ bool ReflectiveSlot::holds(ReflectiveCell cell, Value const& value) const
         return read(cell) == value;
     bool const isSingle = value.getFlags() == ValueFlags::Single;
     return isSingle == (cell.state == CellState::Single) && withPayloadType(m_kind, [&]<class T>() {
-               return Packed<T>::equals(cell.word, isSingle
-                                                       ? value.getValue<T>()
-                                                       : *value.getValue<boost::optional<T>>());
+               return usePayload<T>(
+                   value, [&](T const& payload) { return Packed<T>::equals(cell.word, payload); });
            });
 }
 
@@ -174,7 +231,7 @@ void ReflectiveSlot::release(ReflectiveCell cell) const noexcept
     if (m_kind == SlotKind::Reference)
     {
         if (auto* const target = cell.pointer<ModelElement::Impl>())
-            target->removeRef();
+            target->release();
         return;
     }
     if (isCollection(m_kind))
@@ -187,10 +244,7 @@ void ReflectiveSlot::release(ReflectiveCell cell) const noexcept
     MetaRegistry& registry = MetaRegistry::getInstance();
     if (registry.hasOwnershipConverters())
         registry.releaseOwnedValue(read(cell));
-    if (cell.state == CellState::Boxed)
-        delete cell.pointer<Value>();
-    else
-        withPayloadType(m_kind, [&]<class T>() { Packed<T>::free(cell.word); });
+    free(cell);
 }
 
 ReflectiveCell ReflectiveSlot::copy(ReflectiveCell cell) const
@@ -222,11 +276,12 @@ ReflectiveCell ReflectiveSlot::copyPlain(ReflectiveCell cell) const
 {
     MetaRegistry& registry = MetaRegistry::getInstance();
     if (cell.state == CellState::Boxed || registry.hasOwnershipConverters())
-        return keep(registry.convertValueForOwnership(read(cell)));
+        return keepOwn(read(cell));
     ReflectiveCell result = cell;
     if (cell.state != CellState::Empty)
-        result.word = withPayloadType(
-            m_kind, [&]<class T>() { return Packed<T>::pack(Packed<T>::unpack(cell.word)); });
+        result.word = withPayloadType(m_kind, [&]<class T>() {
+            return Packed<T>::IN_PLACE ? cell.word : Packed<T>::pack(Packed<T>::unpack(cell.word));
+        });
     return result;
 }
 

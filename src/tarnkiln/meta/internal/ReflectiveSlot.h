@@ -35,6 +35,12 @@ public:
     /// Of plain values, as it was when the layout was made.
     meta::Type const& type() const { return m_type; }
     SlotKind kind() const { return m_kind; }
+    /// Its place among the slots of its layout.
+    std::uint16_t number() const { return m_number; }
+    /// Its place among the cells of an element; containers, which the element's link tells, have
+    /// none.
+    std::uint16_t cell() const { return m_cell; }
+    void setPlaces(std::size_t number, std::size_t cell);
     /// The slot in change records: the property's index; `NO_INDEX` for -1.
     unsigned long index() const { return m_index; }
     /// The slots whose elements keep this element by the key that is this slot's value.
@@ -52,6 +58,8 @@ public:
     Value read(ReflectiveCell cell) const;
     /// A copy of `value` as cells hold it.
     ReflectiveCell keep(Value const& value) const;
+    /// The same of what the ownership converter makes of `value`.
+    ReflectiveCell keepOwn(Value const& value) const;
     /// The same value as `value`, with the shape `Single` if it has the shape `OptionalSingle` and
     /// holds something.
     Value asRequired(Value const& value) const;
@@ -74,16 +82,22 @@ private:
     bool isEmpty(Value const& value) const;
     bool isPackable(Value const& value) const;
     bool isInitialShared() const;
+    bool owns(ReflectiveCell cell) const;
+    void free(ReflectiveCell cell) const noexcept;
     ReflectiveCell copyPlain(ReflectiveCell cell) const;
 
     meta::Property m_property;
     meta::Type m_type;  ///< Of the property when the layout was made.
     meta::Property m_oppositeQualifier;
     SlotKind m_kind;
+    std::uint16_t m_number = 0;
+    std::uint16_t m_cell = 0;
     unsigned long m_index;
     boost::optional<ReferenceCollectionRecipe> m_recipe;  ///< Of `References`.
     boost::optional<Value> m_empty;  ///< What `CellState::Empty` stands for; optional values only.
     boost::optional<Value> m_initial;  ///< None, if it is to be found anew for each element.
+    /// `m_initial` as it is kept, where that is nothing but a word.
+    boost::optional<ReflectiveCell> m_initialCell;
     std::vector<std::uint16_t> m_dependents;
 };
 }  // namespace tarn::kiln::internal

@@ -6,8 +6,6 @@
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 
-#include <vector>
-
 namespace tarn::kiln {
 
 /// The old cells of the slots that changed, and of no others. Reports may keep it alive longer than
@@ -32,16 +30,14 @@ public:
     void swapWith(internal::ReflectiveCells& cells) noexcept;
 
 private:
-    struct OldCell
-    {
-        internal::ReflectiveSlot const* slot;
-        internal::ReflectiveCell cell;
-    };
+    using Word = decltype(internal::ReflectiveCell::word);
 
-    OldCell const* find(internal::ReflectiveSlot const& slot) const;
+    /// Under what `oldValues` keeps the word of the cell; the state of the cell goes with it.
+    static unsigned long keyOf(internal::ReflectiveSlot const& slot) { return slot.number() + 1UL; }
+    /// Calls `visit(slot, word, state)` for each cell that is kept.
+    template <class Visit> void forEachCell(Visit const& visit);
     Value oldContainerBy(meta::Property const& property) const;
 
     internal::ReflectiveLayout::Handle const m_layout;
-    std::vector<OldCell> m_old;
 };
 }  // namespace tarn::kiln

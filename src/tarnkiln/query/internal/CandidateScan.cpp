@@ -35,9 +35,11 @@ inline bool CandidateScan::passesAll(std::vector<ElementTest> const& tests,
 {
     for (ElementTest const& test : tests)
     {
-        bool const isPassed = test.isOfField
-                                  ? test.test.compare(test.place.field(element), test.test.other)
-                                  : passes(test, element);
+        bool const isPassed =
+            test.isOfField
+                ? test.test.compare({KeptValue::Shape::Single, test.place.field(element)},
+                                    test.test.other)
+                : passes(test, element);
         if (!isPassed)
             return false;
     }
@@ -98,7 +100,7 @@ bool CandidateScan::passes(ElementTest const& test, ModelElement::Impl& element)
     case ValueTest::Answer::Yes:
         return true;
     case ValueTest::Answer::Compare:
-        return test.test.compare(kept.payload, test.test.other);
+        return test.test.compare(kept, test.test.other);
     case ValueTest::Answer::Ask:
         break;
     }

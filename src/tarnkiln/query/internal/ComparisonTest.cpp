@@ -111,8 +111,8 @@ KeptValue ComparisonTest::keptValueOf(int side, std::size_t row, Reader& reader,
     if (isOdd || (value.getFlags() == ValueFlags::Single && !payload))
         return {};
     if (value.getFlags() == ValueFlags::Single)
-        return {KeptValue::Shape::Single, payload};
-    return {payload ? KeptValue::Shape::Optional : KeptValue::Shape::Absent, payload};
+        return keptValue(KeptValue::Shape::Single, payload);
+    return keptValue(payload ? KeptValue::Shape::Optional : KeptValue::Shape::Absent, payload);
 }
 
 template <class T, class Hash, class Equal>
@@ -136,7 +136,7 @@ std::optional<RowPairs> ComparisonTest::findEqual(SlotKind kind, bool onlySingle
     }
 
     auto const keyOf = [&](KeptValue const& value) {
-        return value.payload ? hash(value.payload) : std::size_t{0};
+        return value.payload ? hash(value) : std::size_t{0};
     };
     std::vector<std::size_t> hashes;
     hashes.reserve(kept[0].size());
@@ -174,14 +174,14 @@ std::optional<RowPairs> ComparisonTest::findMatches()
 
     if (classImpl(type))
     {
-        auto const element = [](void const* payload) {
-            return static_cast<ModelElement const*>(payload)->getElementImpl();
+        auto const element = [](KeptValue const& value) {
+            return payloadOf<ModelElement>(value).getElementImpl();
         };
         return findEqual<ModelElement>(
             SlotKind::Other, /*onlySingle=*/false,
-            [&](void const* payload) { return reinterpret_cast<std::size_t>(element(payload)); },
+            [&](KeptValue const& value) { return reinterpret_cast<std::size_t>(element(value)); },
             [&](KeptValue const& first, KeptValue const& second) {
-                return element(first.payload) == element(second.payload);
+                return element(first) == element(second);
             });
     }
     SlotKind const kind = plainKindOf(type);
@@ -192,12 +192,10 @@ std::optional<RowPairs> ComparisonTest::findMatches()
     return withPayloadType(kind, [&]<class T>() {
         return findEqual<T>(
             kind, /*onlySingle=*/false,
-            [](void const* payload) { return hashOf(*static_cast<T const*>(payload)); },
+            [](KeptValue const& value) { return hashOf(payloadOf<T>(value)); },
             [](KeptValue const& first, KeptValue const& second) {
-                if (first.shape != second.shape)
-                    return false;
-                return !first.payload || *static_cast<T const*>(first.payload) ==
-                                             *static_cast<T const*>(second.payload);
+                return first.shape == second.shape &&
+                       (!first.payload || payloadOf<T>(first) == payloadOf<T>(second));
             });
     });
 }
@@ -211,7 +209,7 @@ std::optional<RowPairs> ComparisonTest::findEqualLiterals(meta::Type const& type
                              ValueMatchRelation::equal, type, /*required=*/true);
     return findEqual<unsigned long>(
         SlotKind::Enumeration, /*onlySingle=*/required,
-        [](void const* payload) { return static_cast<std::size_t>(literalAt(payload)); },
+        [](KeptValue const& value) { return static_cast<std::size_t>(literalAt(value.payload)); },
         [](KeptValue const& first, KeptValue const& second) {
             if (!first.payload || !second.payload)
                 return first.payload == second.payload;

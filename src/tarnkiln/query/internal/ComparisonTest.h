@@ -2,8 +2,8 @@
 /// Which elements have values that compare.
 #pragma once
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/meta/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/PairTest.h"
-#include "tarnkiln/query/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/PropertyRelationPropertyJoinConstraint.h"
 #include "tarnkiln/query/internal/RegexCache.h"
 

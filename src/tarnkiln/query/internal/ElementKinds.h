@@ -1,8 +1,8 @@
 /// \file
 /// What a run knows about the elements of one kind.
 #pragma once
+#include "tarnkiln/meta/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/NativeQueryState.h"
-#include "tarnkiln/query/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/ValueTest.h"
 
 #include <array>

@@ -5,7 +5,7 @@
 #include "tarnkiln/kernel/internal/TypeKind.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
-#include "tarnkiln/query/internal/PlainPlace.h"
+#include "tarnkiln/meta/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/RowIndex.h"
 
 #include <algorithm>

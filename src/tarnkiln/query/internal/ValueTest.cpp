@@ -14,15 +14,15 @@ namespace {
 using Answer = ValueTest::Answer;
 using support::PayloadAccess;
 
-template <class T, class Compare> bool comparePayloads(void const* payload, void const* other)
+template <class T, class Compare> bool comparePayloads(KeptValue const& value, void const* other)
 {
-    return Compare()(*static_cast<T const*>(payload), *static_cast<T const*>(other));
+    return Compare()(payloadOf<T>(value), *static_cast<T const*>(other));
 }
 
-template <class Compare> bool compareLiterals(void const* payload, void const* other)
+template <class Compare> bool compareLiterals(KeptValue const& value, void const* other)
 {
     int number = 0;
-    std::memcpy(&number, payload, sizeof number);
+    std::memcpy(&number, value.payload, sizeof number);
     return Compare()(number, *static_cast<int const*>(other));
 }
 
@@ -71,7 +71,7 @@ template <class T> ValueTest makeEquality(Value const& other, meta::Type const& 
 
 template <class T>
 ValueTest ValueTests::makeOrdering(PropertyRelationValueConstraint const& constraint, bool required,
-                                   bool (*compare)(void const*, void const*))
+                                   bool (*compare)(KeptValue const&, void const*))
 {
     ValueTest test;
     Value const& other = constraint.getValue();
@@ -99,9 +99,8 @@ ValueTest ValueTests::makeRegexp(PropertyRelationValueConstraint const& constrai
     test.single = Answer::Compare;
     auto& regexes = std::get<std::deque<LazyRegex<Text>>>(m_lazyRegexes);
     test.other = &regexes.emplace_back(LazyRegex<Text>{m_regexes, *pattern});
-    test.compare = [](void const* payload, void const* other) {
-        return static_cast<LazyRegex<Text> const*>(other)->matches(
-            *static_cast<Text const*>(payload));
+    test.compare = [](KeptValue const& value, void const* other) {
+        return static_cast<LazyRegex<Text> const*>(other)->matches(Text(payloadOf<Text>(value)));
     };
     return test;
 }

@@ -1,7 +1,7 @@
 /// \file
 /// A value constraint as a test of what elements keep.
 #pragma once
-#include "tarnkiln/query/internal/PlainPlace.h"
+#include "tarnkiln/meta/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/PropertyRelationValueConstraint.h"
 #include "tarnkiln/query/internal/RegexCache.h"
 
@@ -25,8 +25,8 @@ struct ValueTest
     Answer single = Answer::Ask;
     Answer optional = Answer::Ask;
     Answer absent = Answer::Ask;
-    /// Whether the payload of a kept value passes.
-    bool (*compare)(void const* payload, void const* other) = nullptr;
+    /// Whether a kept value passes that has a payload.
+    bool (*compare)(KeptValue const& value, void const* other) = nullptr;
     void const* other = nullptr;
 
     Answer answerFor(KeptValue::Shape shape) const
@@ -77,7 +77,7 @@ private:
     ValueTest makeFor(PropertyRelationValueConstraint const& constraint, meta::Type const& type);
     template <class T>
     ValueTest makeOrdering(PropertyRelationValueConstraint const& constraint, bool required,
-                           bool (*compare)(void const*, void const*));
+                           bool (*compare)(KeptValue const&, void const*));
     template <class Text> ValueTest makeRegexp(PropertyRelationValueConstraint const& constraint);
     ValueTest makeForLiteral(PropertyRelationValueConstraint const& constraint, bool required);
 

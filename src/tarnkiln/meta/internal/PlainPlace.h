@@ -7,8 +7,10 @@
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 #include "tarnkiln/meta/internal/SlotKind.h"
 
+#include <concepts>
 #include <cstddef>
 #include <cstdint>
+#include <string_view>
 
 namespace tarn::kiln::internal {
 
@@ -24,10 +26,33 @@ struct KeptValue
     };
 
     Shape shape = Shape::Unknown;
-    /// Of the C++ type of the place's kind; a literal's is its number, of which 32 bits count. Lies
-    /// in the element. Null if there is none.
+    /// Of the C++ type of the place's kind, but the characters of a text; a literal's is its
+    /// number, of which 32 bits count. Lies in the element. Null if there is none.
     void const* payload = nullptr;
+    std::size_t length = 0;  ///< Of a text.
 };
+
+template <class T>
+concept TextPayload = std::same_as<T, string> || std::same_as<T, ustring>;
+
+/// The payload, which is there, of a place whose kind has the C++ type `T`; a view of a text.
+template <class T> decltype(auto) payloadOf(KeptValue const& value)
+{
+    if constexpr (TextPayload<T>)
+        return std::basic_string_view<typename T::value_type>(
+            static_cast<typename T::value_type const*>(value.payload), value.length);
+    else
+        return *static_cast<T const*>(value.payload);
+}
+
+/// \param payload  null if there is none.
+template <class T> KeptValue keptValue(KeptValue::Shape shape, T const* payload)
+{
+    if constexpr (TextPayload<T>)
+        return payload ? KeptValue{shape, payload->data(), payload->size()} : KeptValue{shape};
+    else
+        return {shape, payload};
+}
 
 /// How elements may be told apart so that those of one kind keep their values alike.
 enum class KeptBy : std::uint8_t
@@ -60,7 +85,7 @@ public:
 
     bool isKnown() const { return m_form != Form::None; }
     SlotKind kind() const { return m_kind; }
-    /// Whether it is a field that always has a value.
+    /// Whether it is a field that always has a value, and no text.
     bool isField() const { return m_form == Form::Field; }
     /// In an element of a generated class.
     void const* field(ModelElement::Impl const& element) const
@@ -74,10 +99,8 @@ public:
         {
         case Form::Field:
             return {KeptValue::Shape::Single, field(element)};
-        case Form::OptionalField: {
-            void const* const payload = m_payload(field(element));
-            return {payload ? KeptValue::Shape::Optional : KeptValue::Shape::Absent, payload};
-        }
+        case Form::OtherField:
+            return m_look(field(element));
         case Form::Cell:
             return readCell(element);
         case Form::None:
@@ -90,8 +113,8 @@ private:
     enum class Form : std::uint8_t
     {
         None,
-        Field,
-        OptionalField,
+        Field,       ///< Of a payload that always is there.
+        OtherField,  ///< Of a text, or an optional one.
         Cell
     };
 
@@ -105,20 +128,18 @@ private:
             return {KeptValue::Shape::Absent, nullptr};
         if (state != CellState::Single && state != CellState::Optional)
             return {};
+        KeptValue::Shape const shape =
+            state == CellState::Single ? KeptValue::Shape::Single : KeptValue::Shape::Optional;
         std::uint64_t const& word = cells.word(*m_slot);
-        void const* payload = &word;
-        if (!m_isInPlace)
-            payload = word ? reinterpret_cast<void const*>(word) : m_default;
-        return {state == CellState::Single ? KeptValue::Shape::Single : KeptValue::Shape::Optional,
-                payload};
+        return m_isInPlace ? KeptValue{shape, &word} : m_unpack(shape, word);
     }
 
     Form m_form = Form::None;
     SlotKind m_kind = SlotKind::Other;
-    bool m_isInPlace = false;     ///< The word of the cell is the payload.
-    std::ptrdiff_t m_offset = 0;  ///< Of a field, from where the element begins.
-    void const* (*m_payload)(void const*) = nullptr;  ///< Looks into an optional field.
-    ReflectiveSlot const* m_slot = nullptr;           ///< Of a cell.
-    void const* m_default = nullptr;                  ///< What a null word of a cell points to.
+    bool m_isInPlace = false;                ///< The word of the cell is the payload.
+    std::ptrdiff_t m_offset = 0;             ///< Of a field, from where the element begins.
+    ReflectiveSlot const* m_slot = nullptr;  ///< Of a cell.
+    KeptValue (*m_look)(void const* field) = nullptr;
+    KeptValue (*m_unpack)(KeptValue::Shape shape, std::uint64_t word) = nullptr;
 };
 }  // namespace tarn::kiln::internal

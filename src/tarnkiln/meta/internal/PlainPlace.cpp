@@ -1,4 +1,4 @@
-#include "tarnkiln/query/internal/PlainPlace.h"
+#include "tarnkiln/meta/internal/PlainPlace.h"
 
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
@@ -18,6 +18,29 @@ bool suits(SlotKind kind, meta::Type const& type)
     if (kind == SlotKind::Enumeration)
         return plainKindOf(type) == kind;
     return withPayloadType(kind, [&]<class T>() { return type == meta::standardTypeOf<T>(); });
+}
+
+template <class T> KeptValue lookAt(void const* field)
+{
+    return keptValue(KeptValue::Shape::Single, static_cast<T const*>(field));
+}
+
+template <class T> KeptValue lookIntoOptional(void const* field)
+{
+    T const* const payload = static_cast<boost::optional<T> const*>(field)->get_ptr();
+    return keptValue(payload ? KeptValue::Shape::Optional : KeptValue::Shape::Absent, payload);
+}
+
+template <class T> KeptValue unpack(KeptValue::Shape shape, std::uint64_t word)
+{
+    static T const defaultPayload{};
+    if constexpr (TextPayload<T>)
+    {
+        auto const text = PackedText<typename T::value_type>::view(word);
+        return {shape, text.empty() ? defaultPayload.data() : text.data(), text.size()};
+    }
+    else
+        return {shape, word ? reinterpret_cast<void const*>(word) : &defaultPayload};
 }
 }  // namespace
 
@@ -67,12 +90,12 @@ bool PlainPlace::useField(StoredField const& field)
     {
         m_kind = static_cast<SlotKind>(number);
         bool const found = withPayloadType(m_kind, [&]<class T>() {
-            if (*field.type != typeid(boost::optional<T>))
-                return *field.type == typeid(T);
-            m_form = Form::OptionalField;
-            m_payload = [](void const* optional) -> void const* {
-                return static_cast<boost::optional<T> const*>(optional)->get_ptr();
-            };
+            bool const isOptional = *field.type == typeid(boost::optional<T>);
+            if (!isOptional && *field.type != typeid(T))
+                return false;
+            if (isOptional || TextPayload<T>)
+                m_form = Form::OtherField;
+            m_look = isOptional ? lookIntoOptional<T> : lookAt<T>;
             return true;
         });
         if (found)
@@ -87,9 +110,8 @@ void PlainPlace::useCell(ReflectiveSlot const& slot)
     m_kind = slot.kind();
     m_slot = &slot;
     withPayloadType(m_kind, [&]<class T>() {
-        static T const defaultPayload{};
         m_isInPlace = Packed<T>::IN_PLACE;
-        m_default = &defaultPayload;
+        m_unpack = unpack<T>;
     });
 }
 }  // namespace tarn::kiln::internal

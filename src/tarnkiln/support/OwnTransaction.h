@@ -1,0 +1,28 @@
+/// \file
+/// The transaction that a change opens when none is open.
+#pragma once
+#include "tarnkiln/Export.h"
+#include "tarnkiln/kernel/Model.h"
+#include "tarnkiln/kernel/Transaction.h"
+
+namespace tarn::kiln::support {
+
+/// A transaction for one change alone; nothing if one is open.
+///
+/// Where nobody would hear of it and nothing could be taken back, the change goes without.
+class TARNKILN_EXPORT OwnTransaction
+{
+public:
+    /// \param model  none for null.
+    explicit OwnTransaction(Model::Impl* model);
+
+    /// Whether the change is made without any transaction.
+    bool isSkipped() const { return m_skipped != nullptr; }
+    /// `NotCompleted` if there is an outer transaction or no model.
+    TransactionResult commit();
+
+private:
+    Transaction m_transaction;         ///< Empty unless opened here.
+    Model::Impl* m_skipped = nullptr;  ///< The model of a change without one.
+};
+}  // namespace tarn::kiln::support
