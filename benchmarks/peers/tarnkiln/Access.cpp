@@ -1,35 +1,65 @@
 #include "benchmarks/peers/tarnkiln/Workloads.h"
+#include "tarnkiln/meta/PropertyReader.h"
 
 namespace peers {
 namespace {
 
-void measureReading(Measure const& measure, FullLibraries& libraries)
+/// Reads pages in the way of all properties.
+class ByValue
 {
-    measure.ours("read in order, Value", [&] {
-        Library const& library = libraries.ours();
-        long sum = 0;
-        return measure.timeEach([&] {
-            for (ModelElement const& book : library.books)
-                sum += book->getPropertyValue(library.classes.pages, ACCESS).getValue<int>();
-            Measure::keep(sum);
-        });
-    });
-    measure.ours("read at random, Value", [&] {
-        Library const& library = libraries.ours();
-        long sum = 0;
-        return measure.timeEach([&] {
-            for (std::size_t const i : measure.order())
-                sum += library.books[i]
-                           ->getPropertyValue(library.classes.pages, ACCESS)
-                           .getValue<int>();
-            Measure::keep(sum);
-        });
-    });
-}
+public:
+    static constexpr char const* IN_ORDER = "read in order, Value";
+    static constexpr char const* AT_RANDOM = "read at random, Value";
 
-void measurePlainReading(Measure const& measure, FullLibraries& libraries)
+    explicit ByValue(LibraryClasses const& classes) : m_pages(classes.pages) {}
+
+    int read(ModelElement const& book) const
+    {
+        return book->getPropertyValue(m_pages, ACCESS).getValue<int>();
+    }
+
+private:
+    meta::Property const& m_pages;
+};
+
+/// Reads pages without a `Value`.
+class ByReader
 {
-    auto const inOrder = [&] {
+public:
+    static constexpr char const* IN_ORDER = "read in order, typed accessor";
+    static constexpr char const* AT_RANDOM = "read at random, typed accessor";
+
+    explicit ByReader(LibraryClasses const& classes) : m_pages(classes.pages) {}
+
+    int read(ModelElement const& book) { return m_pages.read(book); }
+
+private:
+    meta::PropertyReader<int> m_pages;
+};
+
+template <class Way> void measureReading(Measure const& measure, FullLibraries& libraries)
+{
+    measure.ours(Way::IN_ORDER, [&] {
+        Library const& library = libraries.ours();
+        long sum = 0;
+        return measure.timeEach([&] {
+            Way way(library.classes);
+            for (ModelElement const& book : library.books)
+                sum += way.read(book);
+            Measure::keep(sum);
+        });
+    });
+    measure.ours(Way::AT_RANDOM, [&] {
+        Library const& library = libraries.ours();
+        long sum = 0;
+        return measure.timeEach([&] {
+            Way way(library.classes);
+            for (std::size_t const i : measure.order())
+                sum += way.read(library.books[i]);
+            Measure::keep(sum);
+        });
+    });
+    measure.floor(Way::IN_ORDER, [&] {
         std::vector<WithPages*> const books = libraries.plain().booksWithPages();
         long sum = 0;
         return measure.timeEach([&] {
@@ -37,8 +67,8 @@ void measurePlainReading(Measure const& measure, FullLibraries& libraries)
                 sum += book->getPages();
             Measure::keep(sum);
         });
-    };
-    auto const atRandom = [&] {
+    });
+    measure.floor(Way::AT_RANDOM, [&] {
         std::vector<WithPages*> const books = libraries.plain().booksWithPages();
         long sum = 0;
         return measure.timeEach([&] {
@@ -46,9 +76,7 @@ void measurePlainReading(Measure const& measure, FullLibraries& libraries)
                 sum += books[i]->getPages();
             Measure::keep(sum);
         });
-    };
-    measure.floor("read in order, Value", inOrder);
-    measure.floor("read at random, Value", atRandom);
+    });
 }
 
 void measureSetting(Measure const& measure, FullLibraries& libraries)
@@ -107,8 +135,8 @@ void measureFinding(Measure const& measure, FullLibraries& libraries)
 
 void measureAccess(Measure const& measure, FullLibraries& libraries)
 {
-    measureReading(measure, libraries);
-    measurePlainReading(measure, libraries);
+    measureReading<ByValue>(measure, libraries);
+    measureReading<ByReader>(measure, libraries);
     measureSetting(measure, libraries);
     measureFinding(measure, libraries);
 }
