@@ -1,5 +1,6 @@
 // What queries cost, beside the plain engine and beside loops that a person would write.
 #include "benchmarks/query/Workloads.h"
+#include "tests/support/PlainEngine.h"
 
 #include <benchmark/benchmark.h>
 
@@ -34,12 +35,12 @@ template <class Workload> void runQuery(benchmark::State& state, Engine engine)
 
 template <class Workload> void BM_Query(benchmark::State& state)
 {
-    runQuery<Workload>(state, Engine::Fast);
+    runQuery<Workload>(state, nullptr);
 }
 
 template <class Workload> void BM_PlainQuery(benchmark::State& state)
 {
-    runQuery<Workload>(state, Engine::Plain);
+    runQuery<Workload>(state, &testkit::runPlainly);
 }
 
 template <class Workload> void BM_QueryLoop(benchmark::State& state)

@@ -9,7 +9,6 @@
 #include "tarnkiln/query/internal/FastEngine.h"
 #include "tarnkiln/query/internal/NativeQueryState.h"
 #include "tarnkiln/query/internal/NativeResultIterator.h"
-#include "tarnkiln/query/internal/PlainEngine.h"
 #include "tarnkiln/query/internal/PropertyRelationPropertyJoinConstraint.h"
 #include "tarnkiln/query/internal/PropertyRelationPropertySingleObjectConstraint.h"
 #include "tarnkiln/query/internal/PropertyRelationValueConstraint.h"
@@ -136,8 +135,7 @@ NativeTarnkilnQuery::getResultIterator(std::vector<std::size_t> const& columns)
 std::size_t NativeTarnkilnQuery::getResultCount()
 {
     requireRunnable();
-    return m_engine == Engine::Plain ? internal::runPlainly(*m_state, {}).getRowCount()
-                                     : internal::countFast(*m_state);
+    return m_engine ? m_engine(*m_state, {}).getRowCount() : internal::countFast(*m_state);
 }
 
 void NativeTarnkilnQuery::setModel(Model const& model)
@@ -176,8 +174,7 @@ void NativeTarnkilnQuery::useEngine(Engine engine)
 internal::NativeResultSet NativeTarnkilnQuery::run(std::vector<std::size_t> const& columns,
                                                    std::size_t most) const
 {
-    return m_engine == Engine::Plain ? internal::runPlainly(*m_state, columns)
-                                     : internal::runFast(*m_state, columns, most);
+    return m_engine ? m_engine(*m_state, columns) : internal::runFast(*m_state, columns, most);
 }
 
 void NativeTarnkilnQuery::requireRunnable() const

@@ -21,18 +21,16 @@ class TARNKILN_EXPORT NativeTarnkilnQuery final : public RetargetableQuery
 public:
     class NativeResultIterator;  // internal/NativeResultIterator.h
 
-    /// How rows are found. The rows, their order and the failures are the same.
-    enum class Engine
-    {
-        Fast,
-        Plain  ///< Tries all combinations; what `Fast` is measured by.
-    };
+    /// Gives the rows of a query, of the columns asked for or of all.
+    using Engine = internal::NativeResultSet (*)(internal::NativeQueryState const& query,
+                                                 std::vector<std::size_t> const& columns);
 
     /// \param model  may be empty, until `setModel`.
     explicit NativeTarnkilnQuery(Model const& model);
     ~NativeTarnkilnQuery() override;
 
-    /// For comparing the engines; a new query has the fast one.
+    /// Lets `engine` find the rows; null stands for the library's own. For tests, which compare the
+    /// two.
     void useEngine(Engine engine);
 
     // ReflectiveQuery
@@ -63,7 +61,7 @@ private:
     internal::NativeResultSet run(std::vector<std::size_t> const& columns, std::size_t most) const;
 
     std::unique_ptr<internal::NativeQueryState> const m_state;
-    Engine m_engine = Engine::Fast;
+    Engine m_engine = nullptr;
 };
 
 /// A query without a model.

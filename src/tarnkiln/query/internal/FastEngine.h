@@ -1,5 +1,5 @@
 /// \file
-/// The engine that users get: the rows of the plain one, without its cost.
+/// How the rows of a query are found.
 #pragma once
 #include "tarnkiln/query/internal/NativeQueryState.h"
 #include "tarnkiln/query/internal/NativeResultSet.h"
@@ -10,7 +10,8 @@ namespace tarn::kiln::internal {
 
 /// Runs `query`, which must have an instance and a live model.
 ///
-/// Gives the rows of `runPlainly`, in its order, and fails with what that fails with. Values are
+/// Gives the rows that a scan of all elements and then a trial of all combinations would give, in
+/// that order, and fails with what that would fail with; the tests have such an engine. Values are
 /// compared where they lie, references are followed, and equal values are found by their hash, so
 /// that a join costs its rows. What has to be read through virtual functions is read once for each
 /// element.

@@ -4,11 +4,6 @@
 
 namespace tarn::kiln::internal {
 
-NativeResultSet::NativeResultSet(std::size_t instances, std::size_t width)
-    : m_instances(instances),
-      m_width(width)
-{}
-
 void NativeResultSet::takeRow(std::size_t number, std::vector<ModelElement>& row)
 {
     auto const first = m_cells.begin() + static_cast<std::ptrdiff_t>(number * m_width);

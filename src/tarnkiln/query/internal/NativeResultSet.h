@@ -14,7 +14,10 @@ class NativeResultSet
 public:
     /// \param instances  the search instances of the query.
     /// \param width      the columns of a row; not 0.
-    NativeResultSet(std::size_t instances, std::size_t width);
+    NativeResultSet(std::size_t instances, std::size_t width)
+        : m_instances(instances),
+          m_width(width)
+    {}
 
     void reserve(std::size_t rows) { m_cells.reserve(rows * m_width); }
     /// Rows are given cell by cell.

@@ -1,4 +1,4 @@
-#include "tarnkiln/query/internal/PlainEngine.h"
+#include "tests/support/PlainEngine.h"
 
 #include "tarnkiln/kernel/ModelImpl.h"
 
@@ -6,8 +6,14 @@
 #include <list>
 #include <numeric>
 
-namespace tarn::kiln::internal {
+namespace testkit {
 namespace {
+
+using namespace tarn::kiln;
+using internal::JoinConstraint;
+using internal::NativeQueryState;
+using internal::NativeResultSet;
+using internal::SearchInstance;
 
 using Ids = std::vector<std::size_t>;
 using Row = std::vector<ModelElement>;
@@ -191,4 +197,4 @@ NativeResultSet runPlainly(NativeQueryState const& query, std::vector<std::size_
     }
     return result;
 }
-}  // namespace tarn::kiln::internal
+}  // namespace testkit
