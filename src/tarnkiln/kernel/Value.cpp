@@ -32,8 +32,7 @@ namespace {
 
 bool isInRegistry(meta::Type const& type)
 {
-    meta::MetaRegistry::LockedConstModel const locked(meta::MetaRegistry::getInstance());
-    return type->getModelImpl() == locked.getModel().getImpl();
+    return type->getModelImpl() == meta::MetaRegistry::getInstance().getModel().getImpl();
 }
 }  // namespace
 

@@ -10,11 +10,13 @@ namespace tarn::kiln::meta {
 
 namespace {
 
+/// Up to here nothing is remembered that would tell a ring.
+constexpr int USUAL_DEPTH = 64;
+
 /// Whether `wanted` is `from` or above it. A description may close the superclasses to a ring,
 /// which holds nothing more after one round.
 bool isOnChain(Class::Impl const* from, Type::Impl const* wanted)
 {
-    constexpr int USUAL_DEPTH = 64;
     Class::Impl const* at = from;
     for (int depth = 0; at && depth < USUAL_DEPTH; ++depth, at = at->getSuperclassImpl())
     {
@@ -35,8 +37,11 @@ template <class Ask> auto firstOnChain(Class::Impl const* from, Ask ask) -> decl
 {
     std::unordered_set<Class::Impl const*> seen;
     Class above;
-    for (Class::Impl const* at = from; at && seen.insert(at).second; at = above.getImpl())
+    int depth = 0;
+    for (Class::Impl const* at = from; at; at = above.getImpl())
     {
+        if (++depth > USUAL_DEPTH && !seen.insert(at).second)
+            break;
         if (auto answer = ask(*at); answer != decltype(answer)())
             return answer;
         above = at->getSuperclass();

@@ -7,6 +7,7 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tarnkiln/meta/internal/MetaRegistryUsageProvider.h"
+#include "tarnkiln/meta/internal/RegistryReading.h"
 #include "tarnkiln/meta/internal/UnregisterDestroyedTypes.h"
 
 #include <atomic>
@@ -18,6 +19,9 @@ std::atomic<MetaRegistry*> startedRegistry{nullptr};
 
 /// Guarded by the start-up lock: the registry that a thread is making, seen by that thread only.
 MetaRegistry* startingRegistry = nullptr;
+
+/// How many `LockedModel`s this thread holds.
+constinit thread_local int changersHere = 0;
 
 /// Recursive, so that what runs at the start may ask for the registry that is being made. A thread
 /// that holds the registry's own lock finds the registry started and never waits for this one.
@@ -64,7 +68,8 @@ bool MetaRegistry::isStarted()
 
 MetaRegistry::MetaRegistry()
     : m_model(Model::createRegistryModel(MetaRegistryModelID)),
-      m_freezer(m_model->freeze())
+      m_freezer(m_model->freeze()),
+      m_published(std::make_unique<internal::Published<Directory>>())
 {
     StartScope const scope(this);
     m_model->setUsageProvider(std::make_unique<internal::MetaRegistryUsageProvider>());
@@ -87,19 +92,30 @@ void MetaRegistry::initialize()
     m_initialised = true;
 }
 
+bool MetaRegistry::isChangedHere()
+{
+    return changersHere != 0;
+}
+
 MetaRegistry::LockedModel::LockedModel(MetaRegistry& registry)
     : m_registry(registry),
       m_lock(registry.m_mutex),
       m_model(registry.m_model),
       m_thawer(registry.m_freezer.thaw())
 {
-    ++m_registry.m_lockDepth;
+    ++m_registry.m_changers;
+    ++changersHere;
 }
 
 MetaRegistry::LockedModel::~LockedModel()
 {
-    if (--m_registry.m_lockDepth == 0)
+    if (m_registry.m_changers == 1)
+    {
         m_registry.publish();
+        m_registry.shareDirectory();
+    }
+    --changersHere;
+    --m_registry.m_changers;
 }
 
 MetaRegistry::LockedConstModel::LockedConstModel(MetaRegistry const& registry)

@@ -21,7 +21,7 @@
 #include "tarnkiln/meta/Type.h"
 #include "tarnkiln/meta/ValueOwnershipConverter.h"
 
-#include <map>
+#include <atomic>
 #include <memory>
 #include <mutex>
 #include <unordered_map>
@@ -30,7 +30,8 @@
 
 namespace tarn::kiln::internal {
 class UnregisterDestroyedTypes;
-}
+template <class Table> class Published;
+}  // namespace tarn::kiln::internal
 
 namespace tarn::kiln::meta {
 
@@ -39,6 +40,9 @@ namespace tarn::kiln::meta {
 ///
 /// The registry model is frozen except while a `LockedModel` lives; its elements may therefore be
 /// read on any thread without a lock.
+///
+/// Look-ups take no lock either. While one thread holds a `LockedModel`, the others find what was
+/// there before it; what they do not find they wait for.
 ///
 /// Threads: may be used from all threads. Functions that say "the caller holds a `LockedModel`"
 /// take no lock of their own.
@@ -184,6 +188,8 @@ public:
     /// @}
 
 private:
+    friend class PackageDefinition;
+
     struct TypeEntry
     {
         BuilderInstantiator builderInstantiator;
@@ -191,26 +197,50 @@ private:
         Type type;
         bool isReflective = false;  ///< A class whose elements have no generated code.
     };
+    /// What look-ups go through.
+    struct Directory
+    {
+        TypeEntry const* findEntry(Type const& type) const;
+
+        std::unordered_map<ustring, TypeEntry> types;       ///< By qualified name.
+        std::unordered_map<ustring, Package> rootPackages;  ///< By URI; all versions.
+        std::unordered_map<ustring, Package> families;  ///< The package registered last for each.
+    };
+    class Reading;
+    /// The entries of a root package, before they are entered.
+    struct RootPackageEntries
+    {
+        std::unordered_map<ustring, Package> ofUri;
+        std::unordered_map<ustring, Package> ofFamily;
+    };
 
     MetaRegistry();
     ~MetaRegistry();
 
     void initialize();
-    TypeEntry const* findEntry(Type const& type) const;
+    /// Whether this thread holds a `LockedModel`.
+    static bool isChangedHere();
+    /// The two steps of `registerRootPackage`; the second allocates nothing.
+    RootPackageEntries prepareRootPackage(Package const& package);
+    void enterRootPackage(RootPackageEntries& made) noexcept;
+    void directoryChanged();
+    /// Lets look-ups on other threads see what was changed.
+    void shareDirectory() noexcept;
     /// Ends the counting of handles of the types that were registered since the last call.
     void publish() noexcept;
     ValueOwnershipConverter* findConverter(Value const& value) const;
 
     Model m_model;
-    std::map<ustring, TypeEntry> m_types;  ///< By qualified name.
+    Directory m_directory;
     Model::Freezer m_freezer;
-    std::map<ustring, Package> m_rootPackages;  ///< By URI; all versions.
-    std::map<ustring, Package> m_families;      ///< The package registered last for each.
     std::unordered_map<Type, std::unique_ptr<ValueOwnershipConverter>, std::hash<ModelElement>>
         m_converters;
     std::vector<Type> m_unpublished;  ///< Registered under the lock that is held.
-    unsigned m_lockDepth = 0;         ///< Of `LockedModel`s inside one another.
     mutable std::recursive_mutex m_mutex;  ///< Guards all of the above.
+    /// How many `LockedModel`s the one thread holds that holds any.
+    std::atomic<int> m_changers{0};
+    bool m_directoryChanged = false;  ///< Since the first of them.
+    std::unique_ptr<internal::Published<Directory>> m_published;
     bool m_initialised = false;
     std::unique_ptr<internal::UnregisterDestroyedTypes> m_unregisterDestroyedTypes;
 };

@@ -9,6 +9,8 @@
 #include "tarnkiln/meta/MetaRegistry.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
+#include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/meta/internal/RegistryReading.h"
 
 namespace tarn::kiln::meta {
 namespace {
@@ -60,7 +62,6 @@ bool isUsableKey(Property const& qualifier)
 AbstractOwnedCollection* MetaRegistry::instantiateDynamicCollection(ModelElement const& owner,
                                                                     Property const& property) const
 {
-    LockedConstModel const locked(*this);
     Type const type = property->getType();
     if (!type)
         return nullptr;
@@ -74,9 +75,13 @@ AbstractOwnedCollection* MetaRegistry::instantiateDynamicCollection(ModelElement
                    : nullptr;
     if (dataType && type->getModelImpl() != m_model.getImpl())
         return new ReflectiveDataTypeSequence(dataType, owner, property);
-    TypeEntry const* const entry = findEntry(type);
-    return entry && entry->collectionInstantiator ? entry->collectionInstantiator(owner, property)
-                                                  : nullptr;
+    CollectionInstantiator instantiator = nullptr;
+    {
+        Reading const directory(*this);
+        if (TypeEntry const* const entry = directory->findEntry(type))
+            instantiator = entry->collectionInstantiator;
+    }
+    return instantiator ? instantiator(owner, property) : nullptr;
 }
 
 AbstractOwnedCollection* MetaRegistry::createReflectiveDataTypeAssociative(

@@ -13,6 +13,7 @@
 #include "tarnkiln/meta/ReflectiveBuilder.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
 #include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/meta/internal/RegistryReading.h"
 
 #include <algorithm>
 
@@ -74,7 +75,8 @@ void MetaRegistry::registerType(Type const& type, ustring const& name,
     LockedModel const locked(*this);
     m_unpublished.push_back(type);
     TypeEntry const entry{builder, collection, type};
-    auto const [position, inserted] = m_types.emplace(name, entry);
+    auto const [position, inserted] = m_directory.types.emplace(name, entry);
+    directoryChanged();
     if (!inserted)
     {
         // What a rolled back metamodel leaves behind must not keep it from being built again.
@@ -101,35 +103,41 @@ void MetaRegistry::registerReflectiveClass(Class const& metaClass)
 {
     LockedModel const locked(*this);
     registerType(metaClass, /*builder=*/nullptr);
-    m_types.find(metaClass->getQualifiedName())->second.isReflective = true;
+    m_directory.types.find(metaClass->getQualifiedName())->second.isReflective = true;
 }
 
 void MetaRegistry::unregisterType(Type const& type, ustring const& name)
 {
-    auto const position = m_types.find(name);
-    if (position != m_types.end() && position->second.type == type)
-        m_types.erase(position);
+    auto const position = m_directory.types.find(name);
+    if (position == m_directory.types.end() || position->second.type != type)
+        return;
+    m_directory.types.erase(position);
+    directoryChanged();
 }
 
 void MetaRegistry::updateCollectionInstantiator(Type const& type, CollectionInstantiator collection)
 {
     LockedModel const locked(*this);
-    auto const position = m_types.find(type->getQualifiedName());
-    TARNKILN_ASSERT(position != m_types.end(), "only a registered type can be updated");
+    auto const position = m_directory.types.find(type->getQualifiedName());
+    TARNKILN_ASSERT(position != m_directory.types.end(), "only a registered type can be updated");
     position->second.collectionInstantiator = collection;
+    directoryChanged();
 }
 
 Type MetaRegistry::getType(ustring const& name) const
 {
-    LockedConstModel const locked(*this);
-    auto position = m_types.find(name);
-    if (position == m_types.end() && name.starts_with(u"tarn.kiln."))
+    auto const find = [&](Directory const& directory) {
+        auto const position = directory.types.find(name);
+        return position != directory.types.end() ? &position->second.type : nullptr;
+    };
+    std::optional<Type> found = Reading::find(*this, find);
+    if (!found && name.starts_with(u"tarn.kiln."))
     {
         MetaPackageMeta::getInstance();
-        position = m_types.find(name);
+        found = Reading::find(*this, find);
     }
-    if (position != m_types.end())
-        return position->second.type;
+    if (found)
+        return *found;
     // Metamodels of old spell these two names so.
     if (name == u"meta.Model")
         return Model::metaClass();
@@ -151,19 +159,24 @@ PrimitiveType MetaRegistry::getPrimitiveType(ustring const& name) const
 std::unique_ptr<ModelElement::Builder> MetaRegistry::instantiateBuilder(Class const& metaClass,
                                                                         Model const& model) const
 {
-    LockedConstModel const locked(*this);
     if (!metaClass)
         return nullptr;
-    TypeEntry const* const entry = findEntry(metaClass);
-    if (entry && entry->isReflective)
-        return std::make_unique<ReflectiveBuilder>(model, metaClass);
-    return entry && entry->builderInstantiator ? entry->builderInstantiator(model) : nullptr;
+    BuilderInstantiator instantiator = nullptr;
+    {
+        Reading const directory(*this);
+        TypeEntry const* const entry = directory->findEntry(metaClass);
+        if (entry && entry->isReflective)
+            return std::make_unique<ReflectiveBuilder>(model, metaClass);
+        if (entry)
+            instantiator = entry->builderInstantiator;
+    }
+    return instantiator ? instantiator(model) : nullptr;
 }
 
-MetaRegistry::TypeEntry const* MetaRegistry::findEntry(Type const& type) const
+MetaRegistry::TypeEntry const* MetaRegistry::Directory::findEntry(Type const& type) const
 {
-    auto const position = m_types.find(type->getQualifiedName());
-    bool const found = position != m_types.end() && position->second.type == type;
+    auto const position = types.find(type->getQualifiedName());
+    bool const found = position != types.end() && position->second.type == type;
     return found ? &position->second : nullptr;
 }
 }  // namespace tarn::kiln::meta

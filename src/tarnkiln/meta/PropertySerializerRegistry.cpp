@@ -16,12 +16,12 @@
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tarnkiln/meta/StringPropertySerializer.h"
 #include "tarnkiln/meta/TypeImpl.h"
+#include "tarnkiln/meta/internal/Published.h"
 
 #include <algorithm>
 #include <exception>
 #include <map>
 #include <mutex>
-#include <shared_mutex>
 #include <unordered_map>
 
 namespace tarn::kiln::meta {
@@ -46,8 +46,21 @@ struct DatatypeEntry
 template <class AnyEntries> auto findFlavour(AnyEntries& entries, string const& flavour)
 {
     return std::find_if(entries.begin(), entries.end(),
-                        [&](Entry const& entry) { return entry.flavour == flavour; });
+                        [&](auto const& entry) { return entry.flavour == flavour; });
 }
+
+/// What look-ups go through: the serializers, which others own, and no types.
+struct Directory
+{
+    struct Entry
+    {
+        string flavour;
+        PropertySerializer* serializer;
+    };
+
+    std::unordered_map<UUID, std::vector<Entry>, internal::UUIDHasher> byType;
+    std::unordered_map<UUID, DatatypeSerializer*, internal::UUIDHasher> byDataType;
+};
 
 /// The registered type with the qualified name of `type`; empty if that is `type` itself.
 Type namesakeOf(Type const& type)
@@ -58,7 +71,8 @@ Type namesakeOf(Type const& type)
 }  // namespace
 
 /// The lock is held only while the tables are used, never while a serializer or another registry
-/// is asked: it is not recursive, and the lock of `MetaRegistry` is taken before it.
+/// is asked: it is not recursive, and the lock of `MetaRegistry` is taken before it. Look-ups take
+/// it only after a change, to make a copy of what they need.
 struct PropertySerializerRegistry::Tables
 {
     template <class Serializer> void add(Type const& type, char const* flavour)
@@ -66,10 +80,37 @@ struct PropertySerializerRegistry::Tables
         byType[type.getElementImpl()->getUuid()].push_back(
             {type, flavour, std::make_unique<Serializer>(type)});
     }
+    Directory copy() const
+    {
+        Directory result;
+        for (auto const& [type, entries] : byType)
+        {
+            for (Entry const& entry : entries)
+                result.byType[type].push_back({entry.flavour, entry.serializer.get()});
+        }
+        for (auto const& [type, entry] : byDataType)
+            result.byDataType.emplace(type, entry.serializer.get());
+        return result;
+    }
+    /// The latest directory, which stays good until this thread's next call; where the thread ends
+    /// and can keep none, it is moved to `own`.
+    Directory const& latest(Directory& own)
+    {
+        if (Directory const* const found = published.find())
+            return *found;
+        std::lock_guard const lock(mutex);
+        auto made = std::make_shared<Directory const>(copy());
+        published.publish(made);
+        if (Directory const* const found = published.find())
+            return *found;
+        own = *made;
+        return own;
+    }
 
     std::unordered_map<UUID, Entries, internal::UUIDHasher> byType;
     std::unordered_map<UUID, DatatypeEntry, internal::UUIDHasher> byDataType;
-    mutable std::shared_mutex mutex;
+    std::mutex mutex;
+    internal::Published<Directory> published;
     /// By flavour; for enumerations without a serializer of their own.
     std::map<string, std::unique_ptr<PropertySerializer>> ofEnumerations;
 };
@@ -123,7 +164,8 @@ void PropertySerializerRegistry::registerPropertySerializer(
     Type const& type, std::unique_ptr<PropertySerializer> serializer, string const& flavour)
 {
     {
-        std::unique_lock const lock(m_tables->mutex);
+        std::lock_guard const lock(m_tables->mutex);
+        m_tables->published.publish(nullptr);
         Entries& entries = m_tables->byType[type->getUuid()];
         auto const place = findFlavour(entries, flavour);
         if (place == entries.end())
@@ -145,7 +187,8 @@ void PropertySerializerRegistry::registerDatatypeSerializer(
     DataType const& type, std::unique_ptr<DatatypeSerializer> serializer)
 {
     {
-        std::unique_lock const lock(m_tables->mutex);
+        std::lock_guard const lock(m_tables->mutex);
+        m_tables->published.publish(nullptr);
         DatatypeEntry& entry = m_tables->byDataType[type.getElementImpl()->getUuid()];
         if (!entry.type)
         {
@@ -159,10 +202,11 @@ void PropertySerializerRegistry::registerDatatypeSerializer(
 void PropertySerializerRegistry::unregisterPropertySerializer(Type const& type,
                                                               string const& flavour)
 {
-    std::unique_lock const lock(m_tables->mutex);
+    std::lock_guard const lock(m_tables->mutex);
     auto const position = m_tables->byType.find(type->getUuid());
     if (position == m_tables->byType.end())
         return;
+    m_tables->published.publish(nullptr);
     std::erase_if(position->second, [&](Entry const& entry) { return entry.flavour == flavour; });
     if (position->second.empty())
         m_tables->byType.erase(position);
@@ -170,7 +214,8 @@ void PropertySerializerRegistry::unregisterPropertySerializer(Type const& type,
 
 void PropertySerializerRegistry::unregisterSerializers(Type const& type)
 {
-    std::unique_lock const lock(m_tables->mutex);
+    std::lock_guard const lock(m_tables->mutex);
+    m_tables->published.publish(nullptr);
     m_tables->byType.erase(type->getUuid());
     m_tables->byDataType.erase(type->getUuid());
 }
@@ -191,16 +236,16 @@ PropertySerializerRegistry::getPropertySerializerForTypeOnly(Type const& type,
 {
     if (!type.getElementImpl())
         return nullptr;
-    std::shared_lock const lock(m_tables->mutex);
-    auto const position = m_tables->byType.find(type->getUuid());
-    if (position != m_tables->byType.end())
+    Directory own;
+    Directory const& directory = m_tables->latest(own);
+    auto const position = directory.byType.find(type->getUuid());
+    if (position != directory.byType.end())
     {
         auto const place = findFlavour(position->second, flavour);
         if (place != position->second.end())
-            return place->serializer.get();
+            return place->serializer;
     }
-    // Tells the kind of type by its C++ class: to ask for a metaclass may build metamodels, whose
-    // serializers are then entered, under this lock.
+    // Tells the kind of type by its C++ class: to ask for a metaclass may build metamodels.
     if (!internal::isEnumType(type))
         return nullptr;
     auto const shared = m_tables->ofEnumerations.find(flavour);
@@ -211,9 +256,10 @@ DatatypeSerializer* PropertySerializerRegistry::getDatatypeSerializer(DataType c
 {
     if (!type.getElementImpl())
         return nullptr;
-    std::shared_lock const lock(m_tables->mutex);
-    auto const position = m_tables->byDataType.find(type.getElementImpl()->getUuid());
-    return position != m_tables->byDataType.end() ? position->second.serializer.get() : nullptr;
+    Directory own;
+    Directory const& directory = m_tables->latest(own);
+    auto const position = directory.byDataType.find(type.getElementImpl()->getUuid());
+    return position != directory.byDataType.end() ? position->second : nullptr;
 }
 
 boost::optional<std::pair<Value, PropertySerializer*>>
@@ -240,13 +286,14 @@ PropertySerializerRegistry::parseInAnyFlavour(ustring const& text, Type const& t
 std::vector<PropertySerializer*> PropertySerializerRegistry::getAllFlavours(Type const& type) const
 {
     std::vector<PropertySerializer*> result;
-    std::shared_lock const lock(m_tables->mutex);
-    auto const position = m_tables->byType.find(type->getUuid());
-    if (position == m_tables->byType.end())
+    Directory own;
+    Directory const& directory = m_tables->latest(own);
+    auto const position = directory.byType.find(type->getUuid());
+    if (position == directory.byType.end())
         return result;
     result.reserve(position->second.size());
-    for (Entry const& entry : position->second)
-        result.push_back(entry.serializer.get());
+    for (Directory::Entry const& entry : position->second)
+        result.push_back(entry.serializer);
     return result;
 }
 }  // namespace tarn::kiln::meta
