@@ -9,6 +9,7 @@
 #include <cstring>
 #include <memory>
 #include <mutex>
+#include <new>
 #include <system_error>
 #include <vector>
 
@@ -42,6 +43,22 @@ void deleteWaiting(Deletions& all)
         delete next;
     }
     all.waiting = nullptr;
+}
+
+/// False if there is no memory for it, and what can't wait is deleted at once.
+bool waitsForOutermost(Deletions& all, ElementImpl* element)
+{
+    try
+    {
+        if (!all.waiting)
+            all.waiting = new std::vector<ElementImpl*>;
+        all.waiting->push_back(element);
+        return true;
+    }
+    catch (std::bad_alloc const&)
+    {
+        return false;
+    }
 }
 
 /// All of the state from the system's source of randomness. `std::random_device` would ask the
@@ -82,13 +99,8 @@ void ElementImpl::removeRef()
 void ElementImpl::deleteThis()
 {
     Deletions& ofThread = deletions;  // found once, which takes a call in a shared library
-    if (ofThread.depth == MAX_DELETION_DEPTH)
-    {
-        if (!ofThread.waiting)
-            ofThread.waiting = new std::vector<ElementImpl*>;
-        ofThread.waiting->push_back(this);
+    if (ofThread.depth >= MAX_DELETION_DEPTH && waitsForOutermost(ofThread, this))
         return;
-    }
     ++ofThread.depth;
     delete this;
     if (ofThread.depth == 1 && ofThread.waiting)

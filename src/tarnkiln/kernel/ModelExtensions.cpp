@@ -70,6 +70,36 @@ meta::Extension makeExtension(meta::DynamicExtensions const& owner, meta::Type c
     extension->setIsPublicMutator(true);
     return extension;
 }
+
+/// The record of an extension, entered until the end of the block or for good.
+class EnteredRecord
+{
+public:
+    using Records = internal::DeclaredExtensions;
+
+    EnteredRecord(Records& records, ustring const& name, Records::Record const& record)
+        : m_records(records),
+          m_name(name),
+          m_extension(record.extension)
+    {
+        m_records.add(name, record);
+    }
+    EnteredRecord(EnteredRecord const&) = delete;
+    EnteredRecord& operator=(EnteredRecord const&) = delete;
+    ~EnteredRecord()
+    {
+        if (!m_isKept)
+            m_records.remove(m_name, m_extension);
+    }
+
+    void keep() { m_isKept = true; }
+
+private:
+    Records& m_records;
+    ustring const m_name;
+    meta::Extension const m_extension;
+    bool m_isKept = false;
+};
 }  // namespace
 
 void Model::Impl::extendMetaclass(meta::Class const& extended,
@@ -98,18 +128,19 @@ void Model::Impl::extendMetaclass(meta::Class const& extended,
         defaultValue->checkCompatibleWithProperty(extension);
     if (!isSingle)
         requireCollection(extension);
+    // A reference is never stored as a default: it could keep an element of another model.
+    bool const isEmptyByDefault = isSingle && isReference;
+    EnteredRecord entered(*m_extensions, name,
+                          {extension,
+                           isEmptyByDefault ? Value::createEmptyValue(type, true) : defaultValue,
+                           extended});
     // Another transaction is open and may end as it likes.
     if (transaction.commit() != TransactionResult::Committed)
     {
         m_extensions->markIncomplete();
         reportException(messages::NoOpenTransaction());
     }
-
-    // A reference is never stored as a default: it could keep an element of another model.
-    bool const isEmptyByDefault = isSingle && isReference;
-    m_extensions->add(name, {extension,
-                             isEmptyByDefault ? Value::createEmptyValue(type, true) : defaultValue,
-                             extended});
+    entered.keep();
     notifyExtensionAdded(extension);
 }
 

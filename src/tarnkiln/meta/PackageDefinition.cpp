@@ -11,6 +11,7 @@
 
 #include <algorithm>
 #include <stdexcept>
+#include <utility>
 
 namespace tarn::kiln::meta {
 namespace {
@@ -32,6 +33,28 @@ int highestSlot(Class const& type)
         highest = std::max(highest, highestOwnSlot(here));
     return highest;
 }
+
+/// The types that were registered, which are taken out again unless they are kept.
+class Registered
+{
+public:
+    explicit Registered(MetaRegistry& registry) : m_registry(registry) {}
+    Registered(Registered const&) = delete;
+    Registered& operator=(Registered const&) = delete;
+    ~Registered()
+    {
+        for (auto const& [type, name] : m_types)
+            m_registry.unregisterType(type, name);
+    }
+
+    /// To be called before the type is registered.
+    void add(Type const& type) { m_types.emplace_back(type, type->getQualifiedName()); }
+    void keep() { m_types.clear(); }
+
+private:
+    MetaRegistry& m_registry;
+    std::vector<std::pair<Type, ustring>> m_types;
+};
 }  // namespace
 
 PackageDefinition::PackageDefinition(ustring const& name, ustring const& uri)
@@ -84,13 +107,22 @@ Package PackageDefinition::finish()
 {
     for (Class const& defined : m_classes)
         numberSlots(defined);
+    Registered registered(m_registry);
     for (Enum const& defined : m_enums)
+    {
+        registered.add(defined);
         m_registry.registerType(defined, &makeReflectiveEnumCollection, /*builder=*/nullptr);
+    }
     for (Class const& defined : m_classes)
+    {
+        registered.add(defined);
         m_registry.registerReflectiveClass(defined);
+    }
+    auto entries = m_registry.prepareRootPackage(m_package);
     if (m_transaction.commit() == TransactionResult::RolledBack)
         throw std::runtime_error("a listener refused the definition of a package");
-    m_registry.registerRootPackage(m_package);
+    registered.keep();
+    m_registry.enterRootPackage(entries);
     m_locked.reset();
     return m_package;
 }
