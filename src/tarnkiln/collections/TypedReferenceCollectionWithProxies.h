@@ -67,8 +67,6 @@ protected:
     virtual bool insertResolved(ModelElement const& element) = 0;
 
     bool hasProxies() const { return m_proxies && !m_proxies->empty(); }
-    /// Whether there is or was a proxy.
-    bool hasProxyTable() const { return m_proxies != nullptr; }
     void clearProxies();
 
     using Base::m_entries;

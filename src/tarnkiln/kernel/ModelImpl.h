@@ -305,8 +305,8 @@ public:
     /// \returns a sentence for each violation; empty if all is well.
     std::vector<string> checkInvariants() const;
     /// Runs `checkInvariants` and asserts on it, in checked builds, unless this is in the middle of
-    /// a change: fully up to 2000 elements,
-    /// above that when the number of ended transactions is a power of two.
+    /// a change: always up to 2000 elements, above that when the number of ended transactions is a
+    /// power of two.
     void checkInvariantsAtEnd();
 
     /// Tells of the model when it is gone, and whether it has changed.

@@ -14,8 +14,8 @@ namespace tarn::kiln {
 /// written there is announced or kept in step.
 struct StoredField
 {
-    /// Of a plain field: a scalar, or a `boost::optional` of one. An enumeration is given by the
-    /// integer type behind it. Null for everything else.
+    /// Of a plain field: a scalar, a value of a data type, or a `boost::optional` of one of these.
+    /// An enumeration is given by the integer type behind it. Null for everything else.
     std::type_info const* type = nullptr;
     bool isLiteral = false;     ///< Whether `type` stands for an enumeration.
     std::ptrdiff_t offset = 0;  ///< Of a plain field: bytes from the `ModelElement::Impl`.

@@ -5,9 +5,8 @@
 ///     title.getValue<ustring>();                      // u"Emma"
 ///     title.getValue<int>();                          // raises CannotCastIncompatibleTypes
 ///
-///     Value const author = book->getPropertyValue(authorOfBook,
-///     ModelElement::Impl::PUBLIC_ACCESS); author.getValue<ModelElement>();                // the
-///     element, or an empty handle
+///     Value const author = book->getPropertyValue(authorOfBook, ModelElement::Impl::PUBLIC_ACCESS);
+///     author.getValue<ModelElement>();                // the element, or an empty handle
 #pragma once
 #include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ValueMeta.h"
