@@ -3,8 +3,7 @@
 #pragma once
 #include "tarnkiln/kernel/ChangesHolder.h"
 #include "tarnkiln/kernel/UUIDHasher.h"
-
-#include <boost/container/deque.hpp>
+#include "tarnkiln/support/BlockList.h"
 
 #include <unordered_map>
 
@@ -71,10 +70,8 @@ public:
 private:
     /// So many records before its turn an element is fetched into the cache.
     static constexpr std::size_t AHEAD = 8;
-    using Blocks = boost::container::deque_options_t<boost::container::block_size<128u>>;
 
-    /// Null where one was let go.
-    boost::container::deque<ChangesHolder, void, Blocks> m_records;
+    support::BlockList<ChangesHolder> m_records;  ///< Null where one was let go.
     /// Of the first so many records, by UUID; made when a report first needs it.
     mutable std::unordered_multimap<UUID, ModelElement::Impl::Changes*, internal::UUIDHasher>
         m_byUuid;

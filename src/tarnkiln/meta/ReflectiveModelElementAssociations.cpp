@@ -183,29 +183,38 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
 void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
                                                             boost::optional<ProxyId>& cachedId)
 {
-    auto const leaveProxy = [&](ModelElement const& target, Feature const& opposite) {
-        if (!multiModel || !opposite || !isDying(*this, target))
-            return;
-        if (!cachedId)
-            cachedId = _getPersistentProxyId();
-        _convertToProxy(target.getImpl(), opposite, *cachedId);
-    };
     for (ReflectiveSlot const& slot : layout().slots())
     {
         if (!isPlainReference(slot))
             continue;
-        Feature const opposite = layout().factsOf(slot).opposite;
+        if (multiModel)
+            leaveProxies(slot, cachedId);
         if (slot.kind() == SlotKind::Reference)
-        {
-            leaveProxy(ModelElement(basicTarget(slot)), opposite);
             basicSetTarget(slot, ModelElement());
+        else if (AbstractOwnedCollection* const present = cells().getCollection(slot))
+            _basicClear(static_cast<ReferenceCollection*>(present));
+    }
+}
+
+/// Puts a proxy for this element into those of other models that refer to it by the slot's
+/// opposite.
+void ReflectiveModelElementImpl::leaveProxies(ReflectiveSlot const& slot,
+                                              boost::optional<ProxyId>& cachedId)
+{
+    Feature const opposite = layout().factsOf(slot).opposite;
+    if (!opposite)
+        return;
+    std::vector<ModelElement> const targets =
+        slot.kind() == SlotKind::Reference
+            ? std::vector<ModelElement>(1, ModelElement(basicTarget(slot)))
+            : members(slot);
+    for (ModelElement const& target : targets)
+    {
+        if (!isDying(*this, target))
             continue;
-        }
-        std::vector<ModelElement> const present = members(slot);
-        for (ModelElement const& member : present)
-            leaveProxy(member, opposite);
-        if (!present.empty())
-            _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
+        if (!cachedId)
+            cachedId = _getPersistentProxyId();
+        _convertToProxy(target.getImpl(), opposite, *cachedId);
     }
 }
 

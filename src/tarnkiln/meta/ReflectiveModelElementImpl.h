@@ -182,6 +182,8 @@ private:
     /// What the slot, of whatever kind, refers to now.
     std::vector<ModelElement> referred(ReflectiveSlot const& slot) const;
 
+    void leaveProxies(ReflectiveSlot const& slot, boost::optional<ProxyId>& cachedId);
+
     // Writing
     ReflectiveSlot const* settableSlot(meta::Property const& property,
                                        ReflectionPrivateTag const& tag) const;

@@ -20,7 +20,7 @@ Transaction joinOpen(Model::Impl& model)
 JoiningTransaction::JoiningTransaction(ModelElement::Impl const& element)
     : m_outer(joinOpen(*element.getModelImpl())),
       m_isNested(m_outer && element.getModelImpl()->isFactoryLocal()),
-      m_own(element.getModelImpl()),
+      m_own(m_outer ? nullptr : element.getModelImpl()),
       m_step(element.getModelImpl())
 {}
 
@@ -41,7 +41,9 @@ void JoiningTransaction::commit()
     m_isCommitted = true;
     if (!m_outer)
         m_own.commit();
-    else if (!m_isNested || !static_cast<internal::TransactionImpl&>(*m_outer.getImpl()).hasEnded())
+    else if (m_isNested)
+        static_cast<internal::TransactionImpl&>(*m_outer.getImpl()).nestedCommitted();
+    else
         m_outer.commit();
 }
 }  // namespace tarn::kiln::support

@@ -39,6 +39,7 @@ public:
     TransactionResult commitIfComplete(boost::optional<Value> const& message);
     TransactionResult rollBack();
     void markRollBackOnly();
+    bool anyRollBackOnly() const;
 
 private:
     class Ended;
@@ -46,7 +47,6 @@ private:
     using Pins = boost::container::small_vector<Transaction, 2>;
 
     bool allReady() const;
-    bool anyRollBackOnly() const;
     bool anyInStep() const;
     TransactionResult finishCommit(boost::optional<Value> const& message);
     bool prepareAll(boost::optional<Value> const& message);

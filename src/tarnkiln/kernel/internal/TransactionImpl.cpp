@@ -282,6 +282,19 @@ void TransactionImpl::removeRef()
     delete this;
 }
 
+void TransactionImpl::nestedCommitted()
+{
+    if (has(ROLLED_BACK) || has(ENDED))
+        return;
+    // Nearly always the outer one goes on, and there is nothing more to do.
+    bool const goesOn = m_handleCount > m_commitCount + 1 && !has(ROLL_BACK_ONLY) &&
+                        !(m_group && m_group->anyRollBackOnly());
+    if (goesOn)
+        ++m_commitCount;
+    else
+        commit(boost::none);
+}
+
 void TransactionImpl::markRollBackOnly()
 {
     if (has(ROLL_BACK_ONLY) || has(ENDED))

@@ -88,6 +88,8 @@ public:
     /// \name Steps of nested transactions
     /// @{
     TransactionResult nestedFailed();
+    /// One that was counted as a handle is committed; to be followed by `forgetCommit`.
+    void nestedCommitted();
     void forgetCommit() { --m_commitCount; }
     /// @}
 

@@ -10,8 +10,8 @@ namespace tarn::kiln::internal {
 
 std::size_t ReflectiveCells::sizeFor(ReflectiveLayout const& layout)
 {
-    return sizeof(ReflectiveCells) +
-           layout.cellCount() * (sizeof(std::uint64_t) + sizeof(CellState));
+    return sizeof(ReflectiveCells) + bytesForStates(layout) +
+           layout.cellCount() * sizeof(std::uint64_t);
 }
 
 ReflectiveCells* ReflectiveCells::create(void* place, ReflectiveLayout::Handle const& layout)

@@ -9,7 +9,7 @@
 
 namespace tarn::kiln::internal {
 
-/// The layout, a word for each slot that has a cell, and behind them a byte for the state of each.
+/// The layout, a byte for the state of each slot that has a cell, and behind them a word for each.
 ///
 /// Lies in one piece of memory behind the element.
 ///
@@ -57,12 +57,18 @@ private:
     explicit ReflectiveCells(ReflectiveLayout::Handle const& layout) : m_layout(layout) {}
     ~ReflectiveCells() = default;
 
-    std::uint64_t* words() { return reinterpret_cast<std::uint64_t*>(this + 1); }
-    std::uint64_t const* words() const { return reinterpret_cast<std::uint64_t const*>(this + 1); }
-    CellState* states() { return reinterpret_cast<CellState*>(words() + layout().cellCount()); }
-    CellState const* states() const
+    CellState* states() { return reinterpret_cast<CellState*>(this + 1); }
+    CellState const* states() const { return reinterpret_cast<CellState const*>(this + 1); }
+    std::uint64_t* words()
     {
-        return reinterpret_cast<CellState const*>(words() + layout().cellCount());
+        return reinterpret_cast<std::uint64_t*>(states() + bytesForStates(layout()));
+    }
+    std::uint64_t const* words() const { return const_cast<ReflectiveCells*>(this)->words(); }
+    /// Up to where words may lie.
+    static std::size_t bytesForStates(ReflectiveLayout const& layout)
+    {
+        constexpr std::size_t WORD = sizeof(std::uint64_t);
+        return (layout.cellCount() * sizeof(CellState) + WORD - 1) / WORD * WORD;
     }
 
     ReflectiveLayout::Handle const m_layout;
