@@ -126,8 +126,10 @@ void ModelElement::Impl::pinContainer()
 
 void ModelElement::Impl::unpinContainer()
 {
-    if (std::exchange(m_containerPinned, false))
+    if (m_containerPinned) {
+        m_containerPinned = false;
         m_container->removeRef();
+    }
 }
 
 void ModelElement::Impl::storeLink(Impl* container, Feature const& feature)
@@ -135,6 +137,8 @@ void ModelElement::Impl::storeLink(Impl* container, Feature const& feature)
     unpinContainer();
     m_container = container;
     m_containmentFeature = feature;
+    if (container)
+        container->m_everContainer = true;
 }
 
 void ModelElement::Impl::announceContainerChange()
@@ -214,6 +218,8 @@ void ModelElement::Impl::checkCircularContainment(ModelElement const& candidate)
     for (Impl const* above = candidate.getImpl(); above; above = above->basicContainer()) {
         if (above == this)
             reportException(tarnkiln::messages::CircularContainment());
+        if (!m_everContainer)
+            return; // above nothing, however deep the candidate lies
     }
 }
 

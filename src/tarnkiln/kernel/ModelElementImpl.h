@@ -326,7 +326,8 @@ private:
         Extensions ///< Of an element that was given any, dead or not; with the anchor.
     };
 
-    bool m_containerPinned = false; ///< A dead element keeps its container in memory.
+    bool m_containerPinned : 1 = false; ///< A dead element keeps its container in memory.
+    bool m_everContainer : 1 = false;   ///< Some element was in it once.
     mutable Aside m_aside = Aside::Nothing; ///< Reading an extension may make its collection.
     std::uint32_t m_topLevelIndex = NOT_TOP_LEVEL;
     std::uint32_t m_recordPlace = NOT_RECORDED; ///< In the last transaction that recorded it.
