@@ -1,6 +1,7 @@
 /// \file
 /// What must hold between the elements of two search instances.
 #pragma once
+#include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ModelElement.h"
 #include "tarnkiln/query/RetargetableQuery.h"
 
@@ -13,7 +14,7 @@ using query::RetargetableQuery;
 using query::ValueMatchRelation;
 
 /// A constraint that ties two instances, which may be the same.
-class JoinConstraint
+class TARNKILN_TESTED JoinConstraint
 {
 public:
     JoinConstraint(JoinConstraint const&) = delete;

@@ -1,6 +1,7 @@
 /// \file
 /// What must hold for one element, and the two constraints that ask for no property.
 #pragma once
+#include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ModelElement.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/query/RetargetableQuery.h"
@@ -14,7 +15,7 @@ using query::SearchClassMatchMode;
 using query::ValueMatchRelation;
 
 /// A constraint on the elements of one search instance.
-class SingleObjectConstraint
+class TARNKILN_TESTED SingleObjectConstraint
 {
 public:
     SingleObjectConstraint(SingleObjectConstraint const&) = delete;
