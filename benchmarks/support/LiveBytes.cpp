@@ -2,13 +2,13 @@
 
 #include <malloc.h>
 
-#include <atomic>
 #include <cstdlib>
 #include <new>
 
 namespace {
 
-std::atomic<std::size_t> bytesInUse{0};
+/// Each thread counts for itself: one count for all would be what threads wait for.
+thread_local constinit std::size_t bytesInUse = 0;
 
 }  // namespace
 
@@ -22,14 +22,14 @@ void* operator new(std::size_t size)
     void* const block = std::malloc(size != 0 ? size : 1);
     if (!block)
         throw std::bad_alloc();
-    bytesInUse.fetch_add(malloc_usable_size(block), std::memory_order_relaxed);
+    bytesInUse += malloc_usable_size(block);
     return block;
 }
 
 void operator delete(void* block) noexcept
 {
     if (block)
-        bytesInUse.fetch_sub(malloc_usable_size(block), std::memory_order_relaxed);
+        bytesInUse -= malloc_usable_size(block);
     std::free(block);
 }
 

@@ -5,7 +5,8 @@
 
 namespace benchkit {
 
-/// The bytes of all live allocations of the program, as the allocator rounds them.
+/// The bytes that this thread has allocated less those that it has freed, as the allocator rounds
+/// them.
 ///
 /// Counted by the replaced `operator new` and `operator delete` of LiveBytes.cpp.
 std::size_t liveBytes();

@@ -15,6 +15,8 @@
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tests/support/ExpectRaises.h"
 
+#include <cstdint>
+
 namespace tarn::kiln::meta {
 namespace {
 
@@ -38,6 +40,26 @@ TEST(PackageDefinition, MakesAPackageThatTheRegistryFinds)
     EXPECT_EQ(package, MetaRegistry::getInstance().getRootPackage(uri));
     EXPECT_EQ(book, MetaRegistry::getInstance().getClass(u"first.Book"));
     EXPECT_EQ(book, package->getOwnedTypes().find(u"Book"));
+}
+
+TEST(PackageDefinition, MakesWhatThreadsShareWithoutCountingIt)
+{
+    ustring const uri = freshUri();
+    PackageDefinition definition(u"shared", uri);
+    ClassDefinition newBook = definition.defineClass(u"Book");
+    Property const title = newBook.attribute(u"title", StandardTypes::stringMeta);
+    Class const book = newBook;
+    EXPECT_FALSE(book->isPermanent());
+
+    Package const package = definition.finish();
+
+    EXPECT_TRUE(book->isPermanent());
+    EXPECT_TRUE(title->isPermanent());
+    EXPECT_TRUE(package->isPermanent());
+    EXPECT_TRUE(StandardTypes::stringMeta.getElementImpl()->isPermanent());
+    std::uint32_t const count = book->getRefCount();
+    Class const copy = book;
+    EXPECT_EQ(copy->getRefCount(), count);
 }
 
 TEST(PackageDefinition, LeavesNothingIfItIsNotFinished)

@@ -92,6 +92,23 @@ TEST_F(PropertyReaders, AskForTheRightToReadEachTime)
     EXPECT_EQ(numbers.read(emma), 474);
 }
 
+TEST_F(PropertyReaders, ReadALiteralAsItsNumber)
+{
+    meta::Enum const colour = metamodel.makeEnum(u"Colour", {u"red", u"green"});
+    meta::Property const tint = metamodel.property(book, u"tint", colour).required();
+    ModelElement const tinted = make(book);
+    meta::PropertyReader<long> tints(tint);
+    EXPECT_EQ(tints.read(tinted), 1);  // the first one by name
+    Transaction const transaction = begin();
+    tinted->setPropertyValue(tint, Value(colour, 0L), ModelElement::Impl::PUBLIC_ACCESS);
+    EXPECT_EQ(tints.read(tinted), 0);
+
+    EXPECT_EQ(transaction.rollBack(), TransactionResult::RolledBack);
+
+    EXPECT_EQ(tints.read(tinted), 1);
+    EXPECT_RAISES(messages::NoSuchProperty, tints.read(emma));
+}
+
 TEST_F(PropertyReaders, ReadElementsWithGeneratedCodeToo)
 {
     meta::Property const property = meta::PrimitiveType::metaClass()->getPropertyByName(u"name");

@@ -258,6 +258,8 @@ WorldOperation<World> const OPERATIONS[] = {
      [](World& w) {
          w.store(Kinds::get().place, Value::createReflectiveDataTypeValue(pointOf(3)));
      }},
+    {"SetALiteral",  // another one than the first by name, which is there from the start
+     [](World& w) { w.store(Kinds::get().tint, Value(Kinds::get().colour, 0L)); }},
     {"SetAnOptionalText", [](World& w) { w.store(Kinds::get().maybeText, some(LONG_TEXT)); }},
     {"SetAnOptionalInteger", [](World& w) { w.store(Kinds::get().maybeInteger, some(7)); }},
     {"SetAnOptionalWideInteger", [](World& w) { w.store(Kinds::get().maybeWide, some(7L)); }},

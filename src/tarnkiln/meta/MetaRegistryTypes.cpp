@@ -9,6 +9,7 @@
 #include "tarnkiln/meta/EnumImpl.h"
 #include "tarnkiln/meta/MetaPackageMeta.h"
 #include "tarnkiln/meta/MetaRegistry.h"
+#include "tarnkiln/meta/PackageImpl.h"
 #include "tarnkiln/meta/PrimitiveType.h"
 #include "tarnkiln/meta/ReflectiveBuilder.h"
 #include "tarnkiln/meta/StructuredTypeImpl.h"
@@ -36,7 +37,8 @@ void materialise(Type const& type)
         enumeration->getLiterals();
 }
 
-/// Types and what they own are asked by all threads, which would contend for the counts.
+/// Types, what they own and the packages that own them are asked by all threads, which would
+/// contend for the counts.
 void makePermanent(Type const& type)
 {
     if (!type)
@@ -46,6 +48,9 @@ void makePermanent(Type const& type)
             member.getElementImpl()->makePermanent();
     };
     type.getElementImpl()->makePermanent();
+    for (Package::Impl* owner = type->getOwningPackageImpl(); owner;
+         owner = owner->getParentPackageImpl())
+        owner->makePermanent();
     if (StructuredType const structured = StructuredType::cast(type))
     {
         makeAll(structured->getOwnedAttributes());
