@@ -3,6 +3,7 @@
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/services/datasource/DataSource.h"
 #include "tarnkiln/support/OpenStep.h"
@@ -229,7 +230,7 @@ void ModelElement::Impl::checkCompatibleModel(Impl* other, Feature const& featur
         return;
     bool const sameModel = other->m_model == m_model;
     if (feature.isComposite()) {
-        bool const elsewhere = other->isProxy() ? other->m_proxyId->getModelId().has_value()
+        bool const elsewhere = other->isProxy() ? other->m_standIn->getModelName() != nullptr
                                                 : !sameModel;
         if (elsewhere)
             reportException(tarnkiln::messages::CannotCreateCrossModelAssociation());

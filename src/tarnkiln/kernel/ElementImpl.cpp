@@ -61,6 +61,19 @@ bool waitsForOutermost(Deletions& all, ElementImpl* element)
     }
 }
 
+/// Not part of its caller, so that the deletions of the thread are found once: in a shared library
+/// that takes a call.
+[[gnu::noinline]] void deleteIn(Deletions& all, ElementImpl* element)
+{
+    if (all.depth >= MAX_DELETION_DEPTH && waitsForOutermost(all, element))
+        return;
+    ++all.depth;
+    delete element;
+    if (all.depth == 1 && all.waiting)
+        deleteWaiting(all);
+    --all.depth;
+}
+
 /// All of the state from the system's source of randomness. `std::random_device` would ask the
 /// processor for each word, which takes milliseconds on a virtual machine, and that in each thread.
 using Generator = boost::random::mt19937_64;
@@ -98,14 +111,7 @@ void ElementImpl::removeRef()
 
 void ElementImpl::deleteThis()
 {
-    Deletions& ofThread = deletions;  // found once, which takes a call in a shared library
-    if (ofThread.depth >= MAX_DELETION_DEPTH && waitsForOutermost(ofThread, this))
-        return;
-    ++ofThread.depth;
-    delete this;
-    if (ofThread.depth == 1 && ofThread.waiting)
-        deleteWaiting(ofThread);
-    --ofThread.depth;
+    deleteIn(deletions, this);
 }
 
 void ElementImpl::invalidate()

@@ -9,6 +9,7 @@
 #include "tarnkiln/services/ModelIdNormalizer.h"
 
 #include <algorithm>
+#include <atomic>
 #include <utility>
 #include <vector>
 
@@ -150,6 +151,7 @@ void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)
         reportException(tarnkiln::messages::CannotJoinShallowTransaction());
     if (!m_models.emplace(model->getLocationModelId(), model).second)
         reportException(tarnkiln::messages::UniquenessConstraint());
+    namesChanged();
     model->basicSetModelConstellation(this);
     ModelConstellation const self(this);
     forEachListener([&](ConstellationListener& listener) {
@@ -158,6 +160,7 @@ void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)
     if (m_group && !model->getCurrentTransaction())
         model->doBeginTransaction(m_group.get(), m_group->getOrigin());
     m_uriHistory[model->getModelURI()] = UriRecord{model, ustring()};
+    namesChanged();
 }
 
 void ModelConstellation::Impl::modelIsDestroyed(Model::Impl* model)
@@ -169,6 +172,7 @@ void ModelConstellation::Impl::modelIsDestroyed(Model::Impl* model)
     auto const found = m_models.find(model->getLocationModelId());
     if (found != m_models.end() && found->second == model)
         m_models.erase(found);
+    namesChanged();
     bool const inMemory = model->getModelURI().find(u"memory://") == 0;
     for (auto record = m_uriHistory.begin(); record != m_uriHistory.end();) {
         if (record->second.model != model) {
@@ -198,16 +202,34 @@ void ModelConstellation::Impl::modelURIAboutToChange(ustring const& oldId, ustri
     Model::Impl* const model = node.mapped();
     node.key() = newId;
     m_models.insert(std::move(node));
+    namesChanged();
     m_uriHistory[model->getModelURI()] = UriRecord{model, ustring()};
 }
 
-ustring ModelConstellation::Impl::getLatestModelURI(ustring const& uri) const
+std::uint64_t ModelConstellation::Impl::nextNamesVersion()
+{
+    static std::atomic<std::uint64_t> last{0};
+    return ++last;
+}
+
+ustring const& ModelConstellation::Impl::latestModelURI(ustring const& uri) const
 {
     auto const found = m_uriHistory.find(uri);
     if (found == m_uriHistory.end())
         return uri;
     UriRecord const& record = found->second;
     return record.model ? record.model->getModelURI() : record.forwardingUri;
+}
+
+ustring ModelConstellation::Impl::getLatestModelURI(ustring const& uri) const
+{
+    return latestModelURI(uri);
+}
+
+Model::Impl* ModelConstellation::Impl::findListed(ustring const& uri) const
+{
+    auto const found = m_models.find(latestModelURI(uri));
+    return found == m_models.end() ? nullptr : found->second;
 }
 
 ModelElement ModelConstellation::Impl::resolveProxy(ModelElement const& proxy)

@@ -6,6 +6,7 @@
 #include "tarnkiln/kernel/ModelConstellation.h"
 #include "tarnkiln/kernel/ModelElement.h"
 
+#include <cstdint>
 #include <map>
 #include <memory>
 #include <vector>
@@ -68,6 +69,13 @@ public:
     void modelURIAboutToChange(ustring const& oldId, ustring const& newId);
     /// Where a model that once had the URI is now, or would be reloaded from.
     ustring getLatestModelURI(ustring const& uri) const;
+    /// The model that has the URI or once had it, if no normalizer needs to be asked; else null. May
+    /// be dead.
+    Model::Impl* findListed(ustring const& uri) const;
+    /// As long as it is the same, each model of this constellation has the URIs that it had; no two
+    /// constellations have the same one.
+    std::uint64_t getNamesVersion() const { return m_namesVersion; }
+    void namesChanged() { m_namesVersion = nextNamesVersion(); }
     ModelElement resolveProxy(ModelElement const& proxy);
     /// @}
 
@@ -97,6 +105,9 @@ private:
 
     class ListenerWalk;
 
+    static std::uint64_t nextNamesVersion();
+    ustring const& latestModelURI(ustring const& uri) const;
+
     /// Calls `tell(listener)` for each; listeners may come and go meanwhile.
     template <class Tell>
     void forEachListener(Tell const& tell);
@@ -104,6 +115,7 @@ private:
     std::map<ustring, Model::Impl*> m_models; ///< By location.
     std::unique_ptr<internal::TransactionGroup> m_group;
     std::map<ustring, UriRecord> m_uriHistory; ///< Where a URI has gone.
+    std::uint64_t m_namesVersion = nextNamesVersion();
     std::vector<std::unique_ptr<ConstellationListenerHolder>> m_listeners;
     int m_listenerWalks = 0; ///< Under way: who is removed meanwhile leaves a null.
 };

@@ -23,8 +23,7 @@ ModelElement ModelElement::createProxy(Model const& model, meta::Class const& me
         if (isRegistered || metaClass->isAbstract())
             reportException(tarnkiln::messages::NoSuchType(internal::qualifiedName(metaClass)));
     }
-    ModelElement const proxy(
-        ReflectiveModelElementImpl::create(model, metaClass, ElementImpl::generateNewUuid()));
+    ModelElement const proxy(ReflectiveModelElementImpl::createForProxy(model, metaClass));
     proxy->_becomeProxy(id, ElementImpl::ElementValidity::Constructing);
     return proxy;
 }

@@ -7,7 +7,9 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/ExtensionValues.h"
+#include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
+#include "tarnkiln/kernel/internal/uuidText.h"
 #include "tarnkiln/meta/AbstractMethodInvoker.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/ExtensionImpl.h"
@@ -15,10 +17,6 @@
 #include "tarnkiln/meta/OperationImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/services/datasource/DataSource.h"
-
-#include "sill/i18n/StringConversion.h"
-
-#include <boost/uuid/uuid_io.hpp>
 
 namespace tarn::kiln {
 
@@ -53,9 +51,10 @@ ModelElement::Impl::~Impl()
     if (isHeld) // by an orchestrator: the constructor of a derived class has failed
         Builder::Orchestrator::constructionFailed(this);
     if (isProxy()) {
-        if (m_model)
-            m_model->m_proxies.erase(this);
-        delete m_proxyId;
+        if (m_isStandInInside)
+            std::destroy_at(m_standIn);
+        else
+            delete m_standIn;
     }
     else if (static_cast<signed char>(m_validity) > 0) {
         m_model->remove(this);
@@ -285,25 +284,35 @@ void ModelElement::Impl::notifyCreated()
 
 boost::optional<ProxyId> ModelElement::Impl::getProxyId() const
 {
-    return isProxy() ? boost::optional<ProxyId>(*m_proxyId) : boost::none;
+    return isProxy() ? boost::optional<ProxyId>(m_standIn->getId()) : boost::none;
+}
+
+ProxyId const* ModelElement::Impl::getProxyIdImpl() const
+{
+    return isProxy() ? &m_standIn->getId() : nullptr;
 }
 
 ProxyId ModelElement::Impl::getPersistentProxyId(bool omitModel) const
 {
     if (isProxy())
-        return *m_proxyId;
+        return m_standIn->getId();
     Model::Impl const* const model = getModelImpl();
     return model ? model->getPersistentProxyId(this, omitModel)
-                 : ProxyId(ElementId::UUID_TYPE,
-                           sill::i18n::to_ustring(boost::uuids::to_string(getUuid())));
+                 : ProxyId(ElementId::UUID_TYPE, internal::uuidText(getUuid()));
+}
+
+void ModelElement::Impl::offerRoom(void* room)
+{
+    m_standIn = static_cast<internal::StandIn*>(room);
+    m_aside = Aside::Room;
 }
 
 void ModelElement::Impl::_becomeProxy(ProxyId const& id, ElementValidity validity)
 {
-    auto proxyId = std::make_unique<ProxyId>(id);
-    m_model->m_proxies.insert(this);
-    m_proxyId = proxyId.release();
-    m_aside = Aside::ProxyId;
+    m_isStandInInside = m_aside == Aside::Room;
+    m_standIn = m_isStandInInside ? new (m_standIn) internal::StandIn(*this, id, *m_model->m_proxies)
+                                  : new internal::StandIn(*this, id, *m_model->m_proxies);
+    m_aside = Aside::StandIn;
     m_validity = validity;
 }
 

@@ -22,6 +22,7 @@ namespace tarn::kiln {
 namespace internal {
 class ExtensionValues;
 class InvariantChecker;
+class StandIn;
 }
 namespace support {
 class TopLevelElements;
@@ -238,9 +239,12 @@ public:
 
     /// \name Proxies
     /// @{
-    bool isProxy() const { return m_aside == Aside::ProxyId; }
+    bool isProxy() const { return m_aside == Aside::StandIn; }
     boost::optional<ProxyId> getProxyId() const;
-    ProxyId const* getProxyIdImpl() const { return isProxy() ? m_proxyId : nullptr; }
+    /// Null unless this is a proxy; lives as long as that.
+    ProxyId const* getProxyIdImpl() const;
+    /// The same as it is kept; takes less to ask.
+    internal::StandIn const* getStandIn() const { return isProxy() ? m_standIn : nullptr; }
     /// The id by which a proxy would name this element; a proxy's own id.
     ProxyId getPersistentProxyId(bool omitModel) const;
     ProxyId _getPersistentProxyId() const { return getPersistentProxyId(/*omitModel=*/false); }
@@ -282,6 +286,9 @@ public:
 protected:
     /// Tells the invalidate callback, if there is one, that `collection` dies with this element.
     void collectionInvalidated(AbstractOwnedCollection* collection);
+    /// Gives an element that is about to become a proxy room for what makes it one, in its own memory
+    /// and for as long as that lasts.
+    void offerRoom(void* room);
 
 private:
     friend class ChangeRecords;
@@ -321,13 +328,15 @@ private:
     enum class Aside : unsigned char
     {
         Nothing,
-        ProxyId, ///< Of a proxy, dead or not.
+        Room,    ///< Where the stand-in may be made.
+        StandIn, ///< Of a proxy, dead or not.
         Anchor,  ///< Of any other dead element.
         Extensions ///< Of an element that was given any, dead or not; with the anchor.
     };
 
     bool m_containerPinned : 1 = false; ///< A dead element keeps its container in memory.
     bool m_everContainer : 1 = false;   ///< Some element was in it once.
+    bool m_isStandInInside : 1 = false; ///< In memory of the element's own.
     mutable Aside m_aside = Aside::Nothing; ///< Reading an extension may make its collection.
     std::uint32_t m_topLevelIndex = NOT_TOP_LEVEL;
     std::uint32_t m_recordPlace = NOT_RECORDED; ///< In the last transaction that recorded it.
@@ -336,7 +345,7 @@ private:
     Model::Impl* m_model; ///< Not to be followed in a dead element, which has an anchor.
     union
     {
-        tarn::kiln::ProxyId* m_proxyId = nullptr;             ///< Owned.
+        internal::StandIn* m_standIn = nullptr;               ///< Owned.
         support::ModelAnchor* m_anchor;                       ///< Counted.
         mutable internal::ExtensionValues* m_extensionValues; ///< Owned.
     };

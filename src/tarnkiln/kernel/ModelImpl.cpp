@@ -10,8 +10,10 @@
 #include "tarnkiln/kernel/ProxyId.h"
 #include "tarnkiln/kernel/internal/DeclaredExtensions.h"
 #include "tarnkiln/kernel/internal/LocalTransactionFactoryImpl.h"
+#include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/kernel/internal/sortByAddress.h"
+#include "tarnkiln/kernel/internal/uuidText.h"
 #include "tarnkiln/meta/Package.h"
 #include "tarnkiln/services/ElementIdResolver.h"
 #include "tarnkiln/services/ModelIdNormalizer.h"
@@ -19,8 +21,6 @@
 #include "tarnkiln/support/OpenStep.h"
 
 #include "sill/i18n/StringConversion.h"
-
-#include <boost/uuid/uuid_io.hpp>
 
 #include <algorithm>
 
@@ -34,6 +34,7 @@ std::atomic<unsigned long> modelsCreated{0};
 
 Model::Impl::Impl(UUID const& id, ModelConstellation const& constellation)
     : ElementImpl(id, ElementValidity::Valid)
+    , m_proxies(std::make_unique<internal::StandIns>())
     , m_modelCounter(++modelsCreated)
     , m_anchor(new support::ModelAnchor(this))
     , m_extensions(std::make_unique<internal::DeclaredExtensions>(m_modelCounter))
@@ -273,6 +274,7 @@ void Model::Impl::setModelURI(ustring const& uri)
         m_locationModelId = location; // at once: what follows may fail
     }
     m_modelURI = services::ModelIdNormalizer::convertToExternalModelId(location);
+    m_constellation->namesChanged();
 }
 
 ModelConstellation Model::Impl::getModelConstellation() const
@@ -352,10 +354,44 @@ void Model::Impl::resetDataSource()
 
 // ---------------------------------------------------------------------------- proxies
 
+/// The model that is meant by the model part of an id, null for none; null if normalizers have to be
+/// asked. May be dead.
+Model::Impl const* Model::Impl::findNamedModel(internal::ModelName const* name) const
+{
+    if (!name)
+        return this;
+    if (!m_constellation)
+        return name->text() == m_modelURI ? this : nullptr;
+    std::uint64_t const version = m_constellation->getNamesVersion();
+    Impl const* model = name->getModel(this, version);
+    if (!model) {
+        model = name->text() == m_modelURI ? this : m_constellation->findListed(name->text());
+        name->remember(this, version, model);
+    }
+    return model;
+}
+
+ModelElement::Impl* Model::Impl::findKnownTarget(ModelElement::Impl const& proxy) const
+{
+    internal::StandIn const& standIn = *proxy.getStandIn();
+    UUID const* const uuid = standIn.getUuid();
+    if (!uuid || m_validity == ElementValidity::ModelDestroying)
+        return nullptr;
+    Impl const* const model = findNamedModel(standIn.getModelName());
+    if (!model || !model->isLive())
+        return nullptr;
+    ModelElement::Impl* const found = model->m_elements.find(*uuid);
+    bool const isAnswer =
+        found && found->isLive() && found->getMetaClass() == proxy.getMetaClass();
+    return isAnswer ? found : nullptr;
+}
+
 ModelElement Model::Impl::resolveProxy(ModelElement::Impl const*, ModelElement const& proxy) const
 {
     if (m_validity == ElementValidity::ModelDestroying)
         return ModelElement();
+    if (ModelElement::Impl* const known = findKnownTarget(*proxy.getImpl()))
+        return ModelElement(known);
     ProxyId const& id = *proxy->getProxyIdImpl();
     ModelElement result;
     if (!id.getModelId() || *id.getModelId() == m_modelURI)
@@ -383,8 +419,7 @@ ModelElement Model::Impl::peekResolveProxy(ModelElement::Impl const*,
 
 ProxyId Model::Impl::getPersistentProxyId(ModelElement::Impl const* element, bool omitModel) const
 {
-    return ProxyId(ElementId::UUID_TYPE,
-                   sill::i18n::to_ustring(boost::uuids::to_string(element->getUuid())),
+    return ProxyId(ElementId::UUID_TYPE, internal::uuidText(element->getUuid()),
                    omitModel ? boost::optional<ustring>() : m_modelURI);
 }
 
@@ -456,9 +491,7 @@ void Model::Impl::destroy()
     for (ModelElement const& element : getAllElements())
         element->invalidate();
     m_elements.clear();
-    for (ModelElement::Impl* const proxy : m_proxies)
-        proxy->m_model = nullptr;
-    m_proxies.clear();
+    m_proxies->clear([](ModelElement::Impl& proxy) { proxy.m_model = nullptr; });
     destroyExtensions();
     if (m_currentTransaction)
         m_currentTransaction->abandon();

@@ -29,6 +29,8 @@ namespace internal {
 class DeclaredExtensions;
 struct DeclaredExtensionRecord;
 class LocalTransactionFactoryImpl;
+class ModelName;
+class StandIns;
 }
 
 /// The registry of a model's elements, its transaction, its listeners and its place in a
@@ -278,7 +280,10 @@ public:
     /// @{
     /// The element that `proxy` names, loading what is needed; the proxy itself if there is none.
     ModelElement resolveProxy(ModelElement::Impl const* source, ModelElement const& proxy) const;
-    /// The same among what is in memory.
+    /// The same, if the registries of models and elements are all that has to be asked; else null.
+    /// Takes no reference.
+    ModelElement::Impl* findKnownTarget(ModelElement::Impl const& proxy) const;
+    /// The same as `resolveProxy` among what is in memory.
     ModelElement peekResolveProxy(ModelElement::Impl const* source,
                                   ModelElement const& proxy) const;
     ProxyId getPersistentProxyId(ModelElement::Impl const* element, bool omitModel) const;
@@ -335,11 +340,12 @@ private:
     void destroyExtensions();
     void convertAllReferencesToProxies(bool multiModel);
     void destroyElements(bool multiModel);
+    Impl const* findNamedModel(internal::ModelName const* name) const;
     bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
 
     support::TopLevelElements m_topLevelElements; ///< Strong: keeps top-level elements alive.
     support::ElementRegistry m_elements;          ///< Everything the model holds, by UUID; weak.
-    std::unordered_set<ModelElement::Impl*> m_proxies; ///< Stand-ins that point to this model.
+    std::unique_ptr<internal::StandIns> const m_proxies; ///< Proxies that point to this model.
     internal::TransactionImpl* m_currentTransaction = nullptr;
     internal::TransactionImpl* m_telling = nullptr; ///< The last to end of those telling listeners.
     std::vector<std::unique_ptr<ListenerHolderBase>> m_listeners;

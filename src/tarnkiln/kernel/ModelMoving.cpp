@@ -6,6 +6,7 @@
 #include "tarnkiln/kernel/internal/DeclaredExtensions.h"
 #include "tarnkiln/kernel/internal/ExtensionGroups.h"
 #include "tarnkiln/kernel/internal/ExtensionValues.h"
+#include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/kernel/internal/TypeKind.h"
 #include "tarnkiln/meta/ClassImpl.h"
@@ -235,7 +236,6 @@ void Model::Impl::ContentsMove::endMatchedExtensions()
 void Model::Impl::ContentsMove::moveElements()
 {
     m_elements = m_source.getElementsInOrder();
-    m_target.m_proxies.reserve(m_target.m_proxies.size() + m_source.m_proxies.size());
     Transaction const transaction = m_target.beginTransaction(/*revertible=*/false);
     support::OpenStep step(&m_target);
     try
@@ -249,9 +249,8 @@ void Model::Impl::ContentsMove::moveElements()
         throw;
     }
     m_elementsMoved = true;
-    for (ModelElement::Impl* const proxy : m_source.m_proxies)
-        proxy->m_model = &m_target;
-    m_target.m_proxies.merge(m_source.m_proxies);
+    m_target.m_proxies->takeOver(
+        *m_source.m_proxies, [this](ModelElement::Impl& proxy) { proxy.m_model = &m_target; });
     m_source.m_elements.clear();
     m_source.m_anchor.get()->changed();
     m_source.m_topLevelElements.abandon();

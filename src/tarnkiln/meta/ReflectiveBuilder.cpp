@@ -95,7 +95,10 @@ void ReflectiveBuilder::give(Given given)
 ModelElement ReflectiveBuilder::doCreate(bool proxy, UUID const& id)
 {
     if (proxy)
-        return construct(id);
+    {
+        checkConcrete();
+        return ModelElement(ReflectiveModelElementImpl::createForProxy(getModel(), m_metaClass));
+    }
     if (getOrchestrator())
         return build(id);
     Orchestrator orchestrator(this);
@@ -104,11 +107,16 @@ ModelElement ReflectiveBuilder::doCreate(bool proxy, UUID const& id)
     return made;
 }
 
-ModelElement ReflectiveBuilder::construct(UUID const& id) const
+void ReflectiveBuilder::checkConcrete() const
 {
     if (m_metaClass && m_metaClass->isAbstract())
         reportException(
             tarnkiln::messages::NoSuchOperation(u"create", internal::qualifiedName(m_metaClass)));
+}
+
+ModelElement ReflectiveBuilder::construct(UUID const& id) const
+{
+    checkConcrete();
     return ModelElement(ReflectiveModelElementImpl::create(
         getModel(), m_metaClass, id.is_nil() ? ElementImpl::generateNewUuid() : id));
 }

@@ -54,6 +54,7 @@ private:
 
     bool isStored(meta::Property const& property) const;
     void give(Given given);
+    void checkConcrete() const;
     ModelElement construct(UUID const& id) const;
     ModelElement build(UUID const& id);
     Value valueOf(Given const& given);

@@ -1,6 +1,7 @@
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 
 #include "tarnkiln/kernel/Messages.h"
+#include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 
@@ -17,15 +18,31 @@ ReflectiveModelElementImpl::create(Model const& model, meta::Class const& metaCl
     if (!model)
         reportException(tarnkiln::messages::CannotCreateWithoutModel());
     LayoutHandle const layout = ReflectiveLayout::of(metaClass);
-    return new (layout) ReflectiveModelElementImpl(model, layout, id);
+    return new (layout, /*more=*/0) ReflectiveModelElementImpl(model, layout, id);
 }
 
-void* ReflectiveModelElementImpl::operator new(std::size_t size, LayoutHandle const& layout)
+ReflectiveModelElementImpl* ReflectiveModelElementImpl::createForProxy(Model const& model,
+                                                                       meta::Class const& metaClass)
 {
-    return ::operator new(size + ReflectiveCells::sizeFor(*layout.get()));
+    if (!model)
+        reportException(tarnkiln::messages::CannotCreateWithoutModel());
+    LayoutHandle const layout = ReflectiveLayout::of(metaClass);
+    auto* const made = new (layout, sizeof(internal::StandIn))
+        ReflectiveModelElementImpl(model, layout, ElementImpl::generateNewUuid());
+    static_assert(alignof(internal::StandIn) <= alignof(ReflectiveCells));
+    made->offerRoom(reinterpret_cast<std::byte*>(&made->cells()) +
+                    ReflectiveCells::sizeFor(*layout.get()));
+    return made;
 }
 
-void ReflectiveModelElementImpl::operator delete(void* element, LayoutHandle const& /*layout*/)
+void* ReflectiveModelElementImpl::operator new(std::size_t size, LayoutHandle const& layout,
+                                               std::size_t more)
+{
+    return ::operator new(size + ReflectiveCells::sizeFor(*layout.get()) + more);
+}
+
+void ReflectiveModelElementImpl::operator delete(void* element, LayoutHandle const& /*layout*/,
+                                                 std::size_t /*more*/)
 {
     ::operator delete(element);
 }

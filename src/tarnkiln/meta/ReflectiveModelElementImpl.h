@@ -46,6 +46,9 @@ public:
     /// \throws tarnkiln::messages::InvalidValue  if a single property has a type without values.
     static ReflectiveModelElementImpl* create(Model const& model, meta::Class const& metaClass,
                                               UUID const& id);
+    /// The same with an id of its own and with room for what is to make it a proxy.
+    static ReflectiveModelElementImpl* createForProxy(Model const& model,
+                                                      meta::Class const& metaClass);
     ~ReflectiveModelElementImpl() override;
 
     // ElementImpl
@@ -149,9 +152,9 @@ private:
     using LayoutHandle = support::CountedPointer<Layout const>;
 
     ReflectiveModelElementImpl(Model const& model, LayoutHandle const& layout, UUID const& id);
-    /// Room for the cells too, which lie behind the element.
-    static void* operator new(std::size_t size, LayoutHandle const& layout);
-    static void operator delete(void* element, LayoutHandle const& layout);
+    /// Room for the cells too, which lie behind the element, and for more behind them.
+    static void* operator new(std::size_t size, LayoutHandle const& layout, std::size_t more);
+    static void operator delete(void* element, LayoutHandle const& layout, std::size_t more);
     static void operator delete(void* element);
     internal::ReflectiveCells& cells() const
     {

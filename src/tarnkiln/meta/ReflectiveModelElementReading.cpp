@@ -114,19 +114,24 @@ ModelElement::Impl* ReflectiveModelElementImpl::target(ReflectiveSlot const& slo
                                                        ReflectionPrivateTag const& tag) const
 {
     ModelElement::Impl* const present = basicTarget(slot);
-    if (!present || !present->isProxy() || !getModelImpl() || tag == NO_PROXY_RESOLVE)
+    Model::Impl const* const model = present && present->isProxy() ? getModelImpl() : nullptr;
+    if (!model || tag == NO_PROXY_RESOLVE)
         return present;
+    bool const mayLoad = !(tag == IN_MEMORY_ONLY);
     ModelElement const proxy(present);
-    ModelElement const found = tag == IN_MEMORY_ONLY ? getModelImpl()->peekResolveProxy(this, proxy)
-                                                     : getModelImpl()->resolveProxy(this, proxy);
+    ModelElement found(mayLoad ? model->findKnownTarget(*present) : nullptr);
+    if (!found.getImpl())
+        found = mayLoad ? model->resolveProxy(this, proxy) : model->peekResolveProxy(this, proxy);
     if (!found || found->isProxy())
         return basicTarget(slot);
+    internal::SlotFacts const facts = layout().factsOf(slot);
     meta::Class const& metaClass = found->getMetaClass();
-    if (!metaClass || !metaClass->isA(slot.property()->getType()))
+    bool const isOfType =
+        metaClass && metaClass->isA(facts.isTypeKept ? slot.type() : slot.property()->getType());
+    if (!isOfType)
         return basicTarget(slot);
-    Feature const feature = slot.property();
-    Feature const opposite = feature.opposite();
-    if (opposite && !feature.isComposite() && !_inverseContainsThis(found.getImpl(), opposite))
+    if (facts.opposite && !facts.isComposite &&
+        !_inverseContainsThis(found.getImpl(), facts.opposite))
         return basicTarget(slot);
     if (basicTarget(slot) == present)  // loading may have changed it
         basicSetTarget(slot, found);

@@ -1,12 +1,17 @@
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 
 #include "tarnkiln/collections/AbstractOwnedCollection.h"
+#include "tarnkiln/meta/MetaRegistry.h"
+#include "tarnkiln/meta/internal/PackedPayload.h"
 
 #include <atomic>
 #include <cstring>
 #include <new>
 
 namespace tarn::kiln::internal {
+
+static_assert(isInPlace(SlotKind::DateTime) && Packed<boost::posix_time::ptime>::IN_PLACE);
+static_assert(!isInPlace(SlotKind::Uuid) && !Packed<UUID>::IN_PLACE);
 
 std::size_t ReflectiveCells::sizeFor(ReflectiveLayout const& layout)
 {
@@ -23,10 +28,16 @@ ReflectiveCells* ReflectiveCells::create(void* place, ReflectiveLayout::Handle c
 
 void ReflectiveCells::destroy()
 {
+    bool const isTold = meta::MetaRegistry::getInstance().hasOwnershipConverters();
     for (ReflectiveSlot const& slot : layout().slots())
     {
-        if (slot.kind() != SlotKind::Container)
-            slot.release(get(slot));
+        if (slot.kind() == SlotKind::Container)
+            continue;
+        ReflectiveCell const cell = get(slot);
+        bool const isBehind =
+            cell.word != 0 && (!isInPlace(slot.kind()) || cell.state == CellState::Boxed);
+        if (isBehind || isTold)
+            slot.release(cell);
     }
     this->~ReflectiveCells();
 }

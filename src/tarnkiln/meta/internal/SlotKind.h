@@ -38,6 +38,11 @@ constexpr bool isPlain(SlotKind kind)
 {
     return kind <= SlotKind::Other;
 }
+/// Whether the word is all there is to a packed value.
+constexpr bool isInPlace(SlotKind kind)
+{
+    return kind < SlotKind::String || kind == SlotKind::Enumeration;
+}
 constexpr bool isCollection(SlotKind kind)
 {
     return kind >= SlotKind::Annotations && kind <= SlotKind::References;

@@ -1,0 +1,68 @@
+#include "tarnkiln/kernel/internal/StandIn.h"
+
+#include "tarnkiln/kernel/internal/uuidText.h"
+
+#include <memory>
+
+namespace tarn::kiln::internal {
+namespace {
+
+/// Whether the text of `uuid` is all that there is to say.
+bool isPlainUuid(ElementId const& id, UUID& uuid)
+{
+    return id.getType() == ElementId::UUID_TYPE && parseUuidText(id.getId(), uuid) &&
+           uuidText(uuid) == id.getId();
+}
+}  // namespace
+
+StandIn::StandIn(ModelElement::Impl& proxy, ProxyId const& id, StandIns& all)
+    : m_proxy(proxy),
+      m_all(&all),
+      m_isUuid(isPlainUuid(id, m_uuid)),
+      m_modelName(id.getModelId() ? all.names().get(*id.getModelId()) : ModelNames::Handle())
+{
+    if (!m_isUuid)
+        m_id = new ProxyId(id);
+    all.insert(*this);
+}
+
+StandIn::~StandIn()
+{
+    if (m_all)
+        m_all->erase(*this);
+    delete m_id.load();
+}
+
+ProxyId const& StandIn::getId() const
+{
+    if (ProxyId const* const known = m_id.load(std::memory_order_acquire))
+        return *known;
+    boost::optional<ustring> model;
+    if (m_modelName)
+        model = m_modelName.get()->text();
+    auto made = std::make_unique<ProxyId const>(ElementId(ElementId::UUID_TYPE, uuidText(m_uuid)),
+                                                std::move(model));
+    ProxyId const* present = nullptr;
+    if (!m_id.compare_exchange_strong(present, made.get(), std::memory_order_acq_rel))
+        return *present;
+    return *made.release();
+}
+
+void StandIns::insert(StandIn& one)
+{
+    one.m_all = this;
+    one.m_previous = nullptr;
+    one.m_next = m_first;
+    if (m_first)
+        m_first->m_previous = &one;
+    m_first = &one;
+}
+
+void StandIns::erase(StandIn& one)
+{
+    (one.m_previous ? one.m_previous->m_next : m_first) = one.m_next;
+    if (one.m_next)
+        one.m_next->m_previous = one.m_previous;
+    one.m_all = nullptr;
+}
+}  // namespace tarn::kiln::internal
