@@ -5,6 +5,7 @@
 #include "tarnkiln/collections/GenericMultimapInterface.h"
 #include "tarnkiln/collections/GenericSequenceInterface.h"
 #include "tarnkiln/collections/ReferenceCollection.h"
+#include "tarnkiln/kernel/ProxyId.h"
 #include "tarnkiln/kernel/Text.h"
 #include "tarnkiln/meta/ReflectiveDataType.h"
 #include "tests/stress/OutOfMemoryRounds.h"
@@ -284,6 +285,13 @@ WorldOperation<World> const OPERATIONS[] = {
     {"RenameAKeyedElement", [](World& w) { set(w.named, of(N::NAME), LONG_TEXT); }},
     {"RenameAGroupedElement", [](World& w) { set(w.b, of(N::NAME), LONG_TEXT); }},
     {"SetAReference", [](World& w) { set(w.a, of(N::BUDDY), w.other); }},
+    {"ReferByAProxyAndReadThat",
+     [](World& w) {
+         ProxyId const id(ElementId::UUID_TYPE, u"40000000-0000-0000-0000-000000000007",
+                          w.model->getModelURI());
+         set(w.a, of(N::BUDDY), ModelElement::createProxy(w.model, NodeMetamodel::get().node, id));
+         valueOf(w.a, of(N::BUDDY), ModelElement::Impl::PRIVILEGED_ACCESS);
+     }},
     {"SetOneToOne", [](World& w) { set(w.a, of(N::LEFT), w.d); }},
     {"SetOneToOneFromTheOtherEnd", [](World& w) { set(w.b, of(N::RIGHT), w.c); }},
     {"ClearOneToOne", [](World& w) { set(w.a, of(N::LEFT), ModelElement()); }},

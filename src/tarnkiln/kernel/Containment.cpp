@@ -38,6 +38,12 @@ struct Destructions
 /// Holds no object, so that it is found without a test whether it has been made.
 constinit thread_local Destructions destructions;
 
+/// A function of its own, so that they are found once: in a shared library that takes a call.
+[[gnu::noinline]] Destructions& destructionsOfThread()
+{
+    return destructions;
+}
+
 /// One level.
 class DestructionLevel
 {
@@ -273,7 +279,7 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
 {
     if (!isLive())
         return;
-    Destructions& ofThread = destructions; // found once, which takes a call in a shared library
+    Destructions& ofThread = destructionsOfThread();
     if (ofThread.depth == MAX_DESTRUCTION_DEPTH && !isProxy() && !removeFromContainer) {
         postpone(ofThread, {ModelElement(this), container(), keepIncoming, multiModel});
         return;

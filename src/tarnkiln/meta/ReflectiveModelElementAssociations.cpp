@@ -7,8 +7,6 @@
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 
 #include <algorithm>
-#include <ranges>
-#include <span>
 
 namespace tarn::kiln {
 
@@ -22,10 +20,12 @@ bool holdsElements(internal::ReflectiveSlot const& slot)
     return slot.kind() == SlotKind::Reference || slot.kind() == SlotKind::References;
 }
 
-/// Whether the slot refers to elements that neither are contained by this one nor contain it.
-bool isPlainReference(internal::ReflectiveSlot const& slot)
+/// Whether it is a reference that is not empty, or a collection of references that is there.
+bool isInUse(internal::ReflectiveCells const& cells, internal::ReflectiveSlot const& slot)
 {
-    return holdsElements(slot) && !Feature(slot.property()).isComposite();
+    return holdsElements(slot) && (slot.kind() == SlotKind::Reference
+                                       ? cells.get(slot).word != 0
+                                       : cells.getCollection(slot) != nullptr);
 }
 
 bool isDying(ModelElement::Impl const& source, ModelElement const& target)
@@ -128,27 +128,31 @@ void ReflectiveModelElementImpl::disassociateIncoming()
         if (slot.kind() == SlotKind::Reference && !slot.dependents().empty())
             DependentCollections(*this, slot).leave();
     }
-    for (ReflectiveSlot const& slot : layout().slots() | std::views::filter(holdsElements))
+    for (ReflectiveSlot const& slot : layout().slots())
     {
-        Feature const opposite = layout().factsOf(slot).opposite;
-        if (!isPlainReference(slot) || !opposite)
+        if (!isInUse(getCells(), slot))
             continue;
-        bool const isSingle = slot.kind() == SlotKind::Reference;
-        ModelElement const single(isSingle ? basicTarget(slot) : nullptr);
-        std::vector<ModelElement> const several = members(slot);
-        std::span const targets = single.getImpl() ? std::span(&single, 1) : std::span(several);
+        internal::SlotFacts const facts = layout().factsOf(slot);
+        if (facts.isComposite || !facts.opposite)
+            continue;
+        auto const leave = [&](ModelElement const& target) {
+            if (target)
+                _inverseRemoveThis(target.getImpl(), facts.opposite);
+        };
+        if (slot.kind() == SlotKind::Reference)
+        {
+            ModelElement const target(basicTarget(slot));
+            notifyModifying(slot.index());
+            leave(target);
+            basicSetTarget(slot, ModelElement());
+            continue;
+        }
+        std::vector<ModelElement> const targets = members(slot);
         if (targets.empty())
             continue;
         notifyModifying(slot.index());
-        for (ModelElement const& target : targets)
-        {
-            if (target)
-                _inverseRemoveThis(target.getImpl(), opposite);
-        }
-        if (isSingle)
-            basicSetTarget(slot, ModelElement());
-        else
-            _basicClear(&loaded(slot));
+        std::for_each(targets.begin(), targets.end(), leave);
+        _basicClear(&loaded(slot));
     }
 }
 
@@ -157,19 +161,18 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
     auto const destroyChild = [&](ModelElement const& child) {
         child->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
     };
-    auto const isInUse = [&](ReflectiveSlot const& slot) {
-        return slot.kind() == SlotKind::Reference ? basicTarget(slot) != nullptr
-                                                  : slot.kind() == SlotKind::References;
-    };
-    for (ReflectiveSlot const& slot : layout().slots() | std::views::filter(isInUse))
+    for (ReflectiveSlot const& slot : layout().slots())
     {
+        if (!isInUse(getCells(), slot))
+            continue;
         bool const isComposite = layout().factsOf(slot).isComposite;
-        if (slot.kind() == SlotKind::Reference && basicTarget(slot))
+        if (slot.kind() == SlotKind::Reference)
         {
             if (isComposite)
                 destroyChild(ModelElement(basicTarget(slot)));
             notifyModifying(slot.index());
             basicSetTarget(slot, ModelElement());
+            continue;
         }
         std::vector<ModelElement> const children = members(slot);
         if (children.empty())
@@ -185,14 +188,14 @@ void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
 {
     for (ReflectiveSlot const& slot : layout().slots())
     {
-        if (!isPlainReference(slot))
+        if (!isInUse(getCells(), slot) || layout().factsOf(slot).isComposite)
             continue;
         if (multiModel)
             leaveProxies(slot, cachedId);
         if (slot.kind() == SlotKind::Reference)
             basicSetTarget(slot, ModelElement());
-        else if (AbstractOwnedCollection* const present = cells().getCollection(slot))
-            _basicClear(static_cast<ReferenceCollection*>(present));
+        else
+            _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
     }
 }
 

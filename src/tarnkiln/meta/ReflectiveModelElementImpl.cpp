@@ -90,12 +90,15 @@ meta::Class const& ReflectiveModelElementImpl::getMetaClass() const
 
 void ReflectiveModelElementImpl::invalidate()
 {
-    for (ReflectiveSlot const* slot : layout().slotsByIndex())
+    if (m_callback)
     {
-        if (!isCollection(slot->kind()))
-            continue;
-        if (AbstractOwnedCollection* const present = cells().getCollection(*slot))
-            collectionInvalidated(present);
+        for (ReflectiveSlot const* slot : layout().slotsByIndex())
+        {
+            if (!isCollection(slot->kind()))
+                continue;
+            if (AbstractOwnedCollection* const present = cells().getCollection(*slot))
+                collectionInvalidated(present);
+        }
     }
     ModelElement::Impl::invalidate();
 }
