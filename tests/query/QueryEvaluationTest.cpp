@@ -231,6 +231,60 @@ TEST_F(QueryEvaluation, KeepsRowsThatWereFound)
     EXPECT_FALSE(iterator->next(row));
 }
 
+TEST_F(QueryEvaluation, KeepsElementsOfItsRowsInMemory)
+{
+    for (int number = 0; number < 100; ++number)
+        makeBook(u"book");
+    auto const query = makeQuery();
+    query->addSearchClass(book, EXACTLY);
+    auto const iterator = query->getResultIterator({});
+    auto const narrower = query->getResultIterator({0, 0});
+    for (ModelElement const& element : model->getAllElements())
+        element->destroy();
+    for (int number = 0; number < 100; ++number)
+        makeBook(u"another");
+
+    for (auto const* const rows : {&iterator, &narrower})
+    {
+        std::size_t found = 0;
+        for (Row row; (*rows)->next(row); ++found)
+        {
+            EXPECT_FALSE(row.front());
+            EXPECT_EQ(row.front()->getMetaClass(), book);
+        }
+        EXPECT_EQ(found, 100u);
+    }
+}
+
+TEST_F(QueryEvaluation, GivesPartsOfManyRowsInTheirOrder)
+{
+    Rows expected;
+    for (int number = 0; number < 300; ++number)
+        set(make(number % 3 == 0 ? novel : book), pages, number);
+    for (ModelElement const& element : model->getAllElements())
+    {
+        if (valueOf(element, pages).getValue<int>() > 150)
+            expected.push_back({element});
+    }
+    auto const query = makeQuery();
+    query->addSearchClass(book, WITH_SUBCLASSES);
+    query->addValueConstraint(pages, greater, integer(150), 0);
+    EXPECT_EQ(rowsOf(*query), expected);
+    EXPECT_EQ(query->getResultCount(), 149u);
+    EXPECT_EQ(query->getFirstResult({0, 0}), Row(2, expected[0][0]));
+
+    query->setResultOffset(20);
+    query->setResultLimit(100);
+    EXPECT_EQ(rowsOf(*query), Rows(expected.begin() + 20, expected.begin() + 120));
+    EXPECT_EQ(query->getResultCount(), 100u);
+    query->setResultOffset(140);
+    EXPECT_EQ(rowsOf(*query), Rows(expected.begin() + 140, expected.end()));
+    EXPECT_EQ(query->getResultCount(), 9u);
+    query->setResultOffset(149);
+    EXPECT_EQ(rowsOf(*query), Rows());
+    EXPECT_EQ(query->getResultCount(), 0u);
+}
+
 TEST_F(QueryEvaluation, OpensNoTransaction)
 {
     makeBook(u"Emma");

@@ -2,14 +2,40 @@
 #include "tests/support/FakeDataSource.h"
 #include "tests/support/NodeImpl.h"
 #include "tests/support/NodeMetamodel.h"
+#include "tests/support/PlainEngine.h"
 
 #include <boost/uuid/uuid_io.hpp>
 #include <gtest/gtest.h>
+
+#include <functional>
+#include <utility>
 
 namespace testkit {
 namespace {
 
 using enum ValueMatchRelation;
+
+meta::Property const& countOfNodes()
+{
+    return NodeMetamodel::get().properties[Node::Impl::COUNT.index];
+}
+
+/// An element of a client that does something when it is asked for its count.
+class Meddler : public Node::Impl
+{
+public:
+    using Node::Impl::Impl;
+
+    Value getPropertyValue(meta::Property const& property,
+                           ReflectionPrivateTag const& tag) const override
+    {
+        if (property == countOfNodes())
+            meddle();
+        return Node::Impl::getPropertyValue(property, tag);
+    }
+
+    std::function<void()> meddle = [] {};
+};
 
 class QueryJoin : public QueryFixture
 {
@@ -29,6 +55,24 @@ protected:
         auto const query = makeQuery();
         query->addSearchClass(searched, EXACTLY);
         return elementsOf(*query);
+    }
+    /// The rows of the plain engine, which must be those of the library's.
+    static Rows rowsOfBoth(NativeTarnkilnQuery& query)
+    {
+        Rows rows = rowsOf(query);
+        query.useEngine(&runPlainly);
+        EXPECT_EQ(rows, rowsOf(query));
+        query.useEngine(nullptr);
+        EXPECT_EQ(query.getResultCount(), rows.size());
+        return rows;
+    }
+    Meddler& makeMeddler(std::function<void()> meddle) const
+    {
+        auto* const made = new Meddler(model, UUID());
+        ModelElement const handle(made);
+        made->notifyCreated();
+        made->meddle = std::move(meddle);
+        return *made;
     }
     static ustring uuidText(ModelElement const& element)
     {
@@ -365,6 +409,127 @@ TEST_F(QueryJoin, FollowsReferencesOfGeneratedClasses)
     EXPECT_THAT(tied(Node::Impl::LINKS), ElementsAre(ElementsAre(first, second)));
     EXPECT_THAT(tied(Node::Impl::BACKLINKS), ElementsAre(ElementsAre(second, first)));
     EXPECT_THAT(tied(Node::Impl::MARKS), ElementsAre(ElementsAre(first, first)));
+}
+
+TEST_F(QueryJoin, FollowsReferencesOfManyElementsOfSeveralClasses)
+{
+    meta::Property const special = metamodel.property(novel, u"special", author);
+    Row authors;
+    for (int number = 0; number < 20; ++number)
+        authors.push_back(makeAuthor(u"author", number));
+    for (int number = 0; number < 300; ++number)
+    {
+        ModelElement const element = make(number % 3 == 0 ? novel : book);
+        ModelElement const& written = authors[static_cast<std::size_t>(number) % authors.size()];
+        set(element, pages, number);
+        if (number % 7 != 0)
+            set(element, writer, number % 5 == 0 ? proxyOf(written) : written);
+        if (number % 3 == 0)
+            set(element, special, authors.front());
+    }
+    for (std::size_t const first : {0u, 1u})
+    {
+        std::size_t const second = 1 - first;
+        auto const query = makeQuery();
+        query->addSearchClass(first == 0 ? book : author, WITH_SUBCLASSES);
+        query->addSearchClass(first == 0 ? author : book, WITH_SUBCLASSES);
+        query->addAssociatedObjectConstraint(writer, first, second);
+        EXPECT_EQ(rowsOfBoth(*query).size(), 257u);
+
+        query->addValueConstraint(pages, less, integer(150), first);
+        EXPECT_EQ(rowsOfBoth(*query).size(), 128u);
+        query->addValueConstraint(born, equal, integer(1), second);
+        EXPECT_EQ(rowsOfBoth(*query).size(), 7u);
+    }
+    auto const query = makeQuery();
+    query->addSearchClass(novel, EXACTLY);
+    query->addSearchClass(author, EXACTLY);
+    query->addAssociatedObjectConstraint(special, 0, 1);
+    EXPECT_EQ(rowsOfBoth(*query).size(), 100u);
+}
+
+TEST_F(QueryJoin, FollowsReferencesAsCodeOfClientsLeavesThemInTheScan)
+{
+    ModelElement const jane = makeAuthor(u"Jane");
+    ModelElement const mary = makeAuthor(u"Mary");
+    Row books;
+    for (int number = 0; number < 50; ++number)
+        books.push_back(makeBook(u"book"));
+    auto const writeAll = [&](ModelElement const& element) {
+        for (ModelElement const& written : books)
+            set(written, writer, element);
+    };
+    makeMeddler([&] { writeAll(mary); });
+    auto const query = makeQuery();
+    query->addSearchClass(book, EXACTLY);
+    query->addSearchClass(author, EXACTLY);
+    query->addSearchClass(Node::metaClass(), EXACTLY);
+    query->addAssociatedObjectConstraint(writer, 0, 1);
+    query->addValueConstraint(countOfNodes(), less, integer(5), 2);
+
+    writeAll(jane);
+    Rows const rows = rowsOf(*query);
+    EXPECT_EQ(rows.size(), books.size());
+    for (Row const& row : rows)
+        EXPECT_EQ(row[1], mary);
+}
+
+TEST_F(QueryJoin, FollowsReferencesAsCodeOfClientsLeavesThemInAnotherJoin)
+{
+    ModelElement const jane = makeAuthor(u"Jane");
+    ModelElement const mary = makeAuthor(u"Mary");
+    ModelElement const emma = makeBook(u"Emma");
+    meta::Property const count = countOfNodes();
+    makeMeddler([&] { set(emma, writer, mary); });
+    // Which join comes first depends on the numbers of the instances.
+    for (std::size_t const first : {0u, 2u})
+    {
+        std::size_t const other = 2 - first;
+        auto const query = makeQuery();
+        for (std::size_t id = 0; id < 4; ++id)
+        {
+            bool const isOfBooks = id / 2 == first / 2;
+            query->addSearchClass(!isOfBooks    ? Node::metaClass()
+                                  : id == first ? book
+                                                : author,
+                                  EXACTLY);
+        }
+        query->addAssociatedObjectConstraint(writer, first, first + 1);
+        query->addPropertyRelation(count, equal, count, other, other + 1);
+
+        set(emma, writer, jane);
+        query->useEngine(&runPlainly);
+        Rows const plain = rowsOf(*query);
+        set(emma, writer, jane);
+        query->useEngine(nullptr);
+        EXPECT_EQ(rowsOf(*query), plain);
+        EXPECT_EQ(plain.size(), 1u);
+    }
+}
+
+TEST_F(QueryJoin, KeepsElementsThatCodeOfClientsDestroys)
+{
+    meta::Property const count = countOfNodes();
+    for (int number = 0; number < 20; ++number)
+        makeBook(u"book");
+    makeMeddler([&] {
+        for (ModelElement const& element : all(book))
+            element->destroy();
+    });
+    auto const query = makeQuery();
+    query->addSearchClass(Node::metaClass(), EXACTLY);
+    query->addSearchClass(Node::metaClass(), EXACTLY);
+    query->addSearchClass(book, EXACTLY);
+    query->addPropertyRelation(count, equal, count, 0, 1);
+
+    Rows const rows = rowsOf(*query);
+    EXPECT_EQ(rows.size(), 20u);
+    for (Row const& row : rows)
+    {
+        ASSERT_TRUE(row[2].getImpl());
+        EXPECT_FALSE(row[2]);
+        EXPECT_EQ(row[2]->getMetaClass(), book);
+    }
 }
 }  // namespace
 }  // namespace testkit

@@ -105,9 +105,9 @@ std::vector<ModelElement> Model::Impl::getAllElements() const
 
 std::vector<ModelElement::Impl*> Model::Impl::getAllElementImpls() const
 {
-    std::vector<ModelElement::Impl*> result;
-    result.reserve(m_elements.size());
-    m_elements.forEach([&](ModelElement::Impl* element) { result.push_back(element); });
+    std::vector<ModelElement::Impl*> result(m_elements.size());
+    auto next = result.begin();
+    m_elements.forEach([&](ModelElement::Impl* element) { *next++ = element; });
     return result;
 }
 

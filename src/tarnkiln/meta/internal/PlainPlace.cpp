@@ -70,7 +70,7 @@ PlainPlace PlainPlace::find(ModelElement::Impl const& element, KeptBy by,
         if (!slot || slot->kind() >= SlotKind::Other || slot->type() != type ||
             !element.getMetaClass()->isATypeOf(property))
             return PlainPlace();
-        place.useCell(*slot);
+        place.useCell(element, *slot);
     }
     return suits(place.m_kind, type) ? place : PlainPlace();
 }
@@ -104,11 +104,12 @@ bool PlainPlace::useField(StoredField const& field)
     return false;
 }
 
-void PlainPlace::useCell(ReflectiveSlot const& slot)
+void PlainPlace::useCell(ModelElement::Impl const& element, ReflectiveSlot const& slot)
 {
     m_form = Form::Cell;
     m_kind = slot.kind();
-    m_slot = &slot;
+    m_offset = offsetIn(element, &cellsOf(element).word(slot));
+    m_stateOffset = offsetIn(element, &cellsOf(element).state(slot));
     withPayloadType(m_kind, [&]<class T>() {
         m_isInPlace = Packed<T>::IN_PLACE;
         m_unpack = unpack<T>;

@@ -11,6 +11,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <string_view>
+#include <typeinfo>
 
 namespace tarn::kiln::internal {
 
@@ -70,6 +71,34 @@ inline ReflectiveCells const& cellsOf(ModelElement::Impl const& element)
     return static_cast<ReflectiveModelElementImpl const&>(element).getCells();
 }
 
+/// Tells apart elements that keep their values in different ways.
+class KindKeys
+{
+public:
+    /// The same for elements that keep them alike: the C++ class or the layout. Of elements that
+    /// must be asked, the C++ class.
+    void const* of(ModelElement::Impl const& element)
+    {
+        std::type_info const* const type = &typeid(element);
+        if (type != m_lastType)
+        {
+            m_lastType = type;
+            m_isByLayout = keptBy(element) == KeptBy::Layout;
+        }
+        return m_isByLayout ? static_cast<void const*>(&cellsOf(element).layout()) : type;
+    }
+
+private:
+    std::type_info const* m_lastType = nullptr;
+    bool m_isByLayout = false;
+};
+
+/// How far `place` lies behind where the element begins.
+inline std::ptrdiff_t offsetIn(ModelElement::Impl const& element, void const* place)
+{
+    return static_cast<char const*>(place) - reinterpret_cast<char const*>(&element);
+}
+
 /// The place of one property in the elements of one kind.
 ///
 /// Reading there is reading by `getPropertyValue` with all rights, and never fails.
@@ -85,10 +114,20 @@ public:
 
     bool isKnown() const { return m_form != Form::None; }
     SlotKind kind() const { return m_kind; }
-    /// Whether it is a field that always has a value, and no text.
-    bool isField() const { return m_form == Form::Field; }
-    /// In an element of a generated class.
-    void const* field(ModelElement::Impl const& element) const
+    /// Whether the element itself holds the payload, if there is one, and not only a pointer to it;
+    /// said of no optional field.
+    bool isInPlace() const
+    {
+        return m_form == Form::Field || (m_form == Form::Cell && m_isInPlace);
+    }
+    /// The payload of a place of which that is true; null if `read` must tell the shape.
+    void const* findSingle(ModelElement::Impl const& element) const
+    {
+        bool const isSingle = m_form == Form::Field || stateIn(element) == CellState::Single;
+        return isSingle ? fieldOf(element) : nullptr;
+    }
+    /// The field or the word of the cell; where the element begins, if nothing is known.
+    void const* fieldOf(ModelElement::Impl const& element) const
     {
         return reinterpret_cast<char const*>(&element) + m_offset;
     }
@@ -98,9 +137,9 @@ public:
         switch (m_form)
         {
         case Form::Field:
-            return {KeptValue::Shape::Single, field(element)};
+            return {KeptValue::Shape::Single, fieldOf(element)};
         case Form::OtherField:
-            return m_look(field(element));
+            return m_look(fieldOf(element));
         case Form::Cell:
             return readCell(element);
         case Form::None:
@@ -119,26 +158,31 @@ private:
     };
 
     bool useField(StoredField const& field);
-    void useCell(ReflectiveSlot const& slot);
+    void useCell(ModelElement::Impl const& element, ReflectiveSlot const& slot);
+    CellState stateIn(ModelElement::Impl const& element) const
+    {
+        return *reinterpret_cast<CellState const*>(reinterpret_cast<char const*>(&element) +
+                                                   m_stateOffset);
+    }
     KeptValue readCell(ModelElement::Impl const& element) const
     {
-        ReflectiveCells const& cells = cellsOf(element);
-        CellState const state = cells.get(*m_slot).state;
+        CellState const state = stateIn(element);
         if (state == CellState::Empty)
             return {KeptValue::Shape::Absent, nullptr};
         if (state != CellState::Single && state != CellState::Optional)
             return {};
         KeptValue::Shape const shape =
             state == CellState::Single ? KeptValue::Shape::Single : KeptValue::Shape::Optional;
-        std::uint64_t const& word = cells.word(*m_slot);
-        return m_isInPlace ? KeptValue{shape, &word} : m_unpack(shape, word);
+        void const* const word = fieldOf(element);
+        return m_isInPlace ? KeptValue{shape, word}
+                           : m_unpack(shape, *static_cast<std::uint64_t const*>(word));
     }
 
     Form m_form = Form::None;
     SlotKind m_kind = SlotKind::Other;
-    bool m_isInPlace = false;                ///< The word of the cell is the payload.
-    std::ptrdiff_t m_offset = 0;             ///< Of a field, from where the element begins.
-    ReflectiveSlot const* m_slot = nullptr;  ///< Of a cell.
+    bool m_isInPlace = false;          ///< The word of the cell is the payload.
+    std::ptrdiff_t m_offset = 0;       ///< From where the element begins.
+    std::ptrdiff_t m_stateOffset = 0;  ///< The same of the state of a cell.
     KeptValue (*m_look)(void const* field) = nullptr;
     KeptValue (*m_unpack)(KeptValue::Shape shape, std::uint64_t word) = nullptr;
 };

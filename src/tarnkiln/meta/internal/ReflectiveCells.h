@@ -37,8 +37,11 @@ public:
     {
         return {words()[slot.cell()], states()[slot.cell()]};
     }
-    /// Where the word of the slot lies, as long as the element lives.
+    /// \name Where the two lie: in all elements of the layout as far behind where these begin
+    /// @{
     std::uint64_t const& word(ReflectiveSlot const& slot) const { return words()[slot.cell()]; }
+    CellState const& state(ReflectiveSlot const& slot) const { return states()[slot.cell()]; }
+    /// @}
     /// Frees nothing of what was there.
     void set(ReflectiveSlot const& slot, ReflectiveCell cell)
     {

@@ -4,6 +4,8 @@
 #include "tarnkiln/collections/ReferenceCollection.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/TypeKind.h"
+#include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 
 #include <boost/uuid/uuid_io.hpp>
@@ -54,6 +56,14 @@ AssociatedObjectConstraint::AssociatedObjectConstraint(meta::Property const& pro
 std::vector<std::size_t> AssociatedObjectConstraint::getInstanceIds() const
 {
     return {m_source, m_target};
+}
+
+bool AssociatedObjectConstraint::isOfSingleReference() const
+{
+    if (!m_property || m_property->getUpper() != 1)
+        return false;
+    auto const* const type = classImpl(m_property->getType());
+    return type && type->isLive() && type->isA(ModelElement::metaClass());
 }
 
 std::vector<ModelElement>

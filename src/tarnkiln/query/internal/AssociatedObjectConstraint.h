@@ -24,6 +24,8 @@ public:
     meta::Property const& getProperty() const { return m_property; }
     std::size_t getSource() const { return m_source; }
     std::size_t getTarget() const { return m_target; }
+    /// Whether the property has one value, and that certainly is an element.
+    bool isOfSingleReference() const;
     /// What the property of `source` refers to; stand-ins, empty and dead handles too.
     std::vector<ModelElement> readReferences(ModelElement const& source) const;
     /// The UUID that a stand-in names, as elements write theirs; null if it names none. Any other

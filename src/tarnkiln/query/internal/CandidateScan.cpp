@@ -1,19 +1,11 @@
 #include "tarnkiln/query/internal/CandidateScan.h"
 
 #include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/query/internal/prefetch.h"
 
 #include <algorithm>
-#include <typeinfo>
 
 namespace tarn::kiln::internal {
-namespace {
-
-void touch(void const* place)
-{
-    static_cast<void>(*static_cast<char const volatile*>(place));
-}
-
-}  // namespace
 
 CandidateScan::CandidateScan(NativeQueryState const& query, RegexCache& regexes)
     : m_query(query),
@@ -30,67 +22,121 @@ bool CandidateScan::mayStopEarly() const
            });
 }
 
+void CandidateScan::run(Keeps keeps, std::size_t enough)
+{
+    m_elements = m_query.model->getAllElementImpls();
+    m_candidates.resize(m_query.instances.size());
+    m_followed.resize(m_kinds.getFollowed().size());
+    if (keeps == Keeps::Elements)
+        reserve();
+    constexpr std::size_t ALL = ~std::size_t{0};
+    std::size_t const most = enough != 0 && mayStopEarly() ? enough : ALL;
+    for (std::size_t begin = 0; begin < m_elements.size(); begin += BLOCK)
+    {
+        for (ElementList& candidates : m_candidates)
+            candidates.makeRoom(BLOCK);
+        for (Followed& followed : m_followed)
+            followed.entries.makeRoom(BLOCK);
+        scanBlock(begin, std::min(begin + BLOCK, m_elements.size()));
+        keepCandidates(keeps);
+        if (m_number >= most)
+            return;
+    }
+}
+
+void CandidateScan::reserve()
+{
+    for (ElementList& candidates : m_candidates)
+        candidates.reserve(m_elements.size() + BLOCK);
+    for (Followed& followed : m_followed)
+        followed.entries.reserve(m_elements.size() + BLOCK);
+}
+
 inline bool CandidateScan::passesAll(std::vector<ElementTest> const& tests,
                                      ModelElement::Impl& element)
 {
-    for (ElementTest const& test : tests)
+    if (tests.empty())
+        return true;
+    for (auto test = tests.begin(); test + 1 != tests.end(); ++test)
     {
-        bool const isPassed =
-            test.isOfField
-                ? test.test.compare({KeptValue::Shape::Single, test.place.field(element)},
-                                    test.test.other)
-                : passes(test, element);
-        if (!isPassed)
+        if (!passes(*test, element))
             return false;
     }
-    return true;
+    return passes(tests.back(), element);
 }
 
-void CandidateScan::run(std::size_t enough)
+inline bool CandidateScan::passes(ElementTest const& test, ModelElement::Impl& element)
 {
-    m_candidates.resize(m_query.instances.size());
-    m_elements = m_query.model->getAllElementImpls();
-    constexpr std::size_t ALL = ~std::size_t{0};
-    std::size_t const most = enough != 0 && mayStopEarly() ? enough : ALL;
-    Block block;
-    for (std::size_t begin = 0; begin < m_elements.size(); begin += BLOCK)
+    void const* const payload = test.isInPlace ? test.place.findSingle(element) : nullptr;
+    return payload ? test.test.compare({KeptValue::Shape::Single, payload}, test.test.other)
+                   : passesSlowly(test, element);
+}
+
+inline void CandidateScan::follow(InstanceTests const& instance, ModelElement::Impl const& element)
+{
+    for (auto const& [number, place] : instance.followed)
     {
-        std::size_t const end = std::min(begin + BLOCK, m_elements.size());
-        touchBlock({m_elements.data() + begin, end - begin}, block);
-        for (std::size_t number = begin; number < end; ++number)
-        {
-            ModelElement::Impl& element = *m_elements[number];
-            ElementKind const& kind = m_kinds.kindOf(*block.types[number - begin], element);
-            for (InstanceTests const& instance : kind.instances)
-            {
-                m_usualKind = &kind;
-                if (!passesAll(instance.tests, element))
-                    continue;
-                m_candidates[instance.instance].push_back(&element);
-                if (m_candidates[instance.instance].size() >= most)
-                    return;
-            }
-        }
+        Followed& followed = m_followed[number];
+        followed.isComplete = followed.isComplete && place.isKnown();
+        followed.entries.addIf(true, place.isKnown() ? place.read(element) : nullptr);
     }
 }
 
-/// Reads of each element what will be read of it, one step for all after the other. The elements of
-/// a model lie anywhere, and only so does the processor wait for many of them at a time. Guesses
-/// that most are of the kind of the last one that was tested.
-void CandidateScan::touchBlock(std::span<ModelElement::Impl* const> elements, Block& block) const
+void CandidateScan::scanBlock(std::size_t begin, std::size_t end)
 {
-    for (std::size_t at = 0; at < elements.size(); ++at)
-        block.types[at] = &typeid(*elements[at]);
-    if (!m_usualKind)
+    while (begin < end)
+    {
+        ElementKind const& kind = m_kinds.kindOf(*m_elements[begin]);
+        if (!kind.instances.empty())
+            m_usualKind = &kind;
+        // Where there are several instances, each element is tested for all before the next one.
+        std::size_t const next = endOfRun(kind, begin, kind.instances.size() > 1 ? begin + 1 : end);
+        for (InstanceTests const& instance : kind.instances)
+            scanRun(instance, begin, next);
+        begin = next;
+    }
+}
+
+/// How far elements are of that kind, as that at `begin` is.
+inline std::size_t CandidateScan::endOfRun(ElementKind const& kind, std::size_t begin,
+                                           std::size_t end) const
+{
+    std::size_t number = begin;
+    do
+    {
+        prefetchElement(number + AHEAD);
+        ++number;
+    }
+    while (number < end && kind.isOf(*m_elements[number]));
+    return number;
+}
+
+inline void CandidateScan::scanRun(InstanceTests const& instance, std::size_t begin,
+                                   std::size_t end)
+{
+    ElementList& candidates = m_candidates[instance.instance];
+    for (std::size_t number = begin; number < end; ++number)
+    {
+        ModelElement::Impl& element = *m_elements[number];
+        bool const isCandidate = passesAll(instance.tests, element);
+        candidates.addIf(isCandidate, &element);
+        if (!instance.followed.empty() && isCandidate)
+            follow(instance, element);
+    }
+}
+
+/// Guesses that it is of the kind of the last one that was tested.
+void CandidateScan::prefetchElement(std::size_t number) const
+{
+    if (number >= m_elements.size() || !m_usualKind)
         return;
-    for (std::size_t at = 0; at < elements.size(); ++at)
-    {
-        if (block.types[at] == m_usualKind->type)
-            touch(m_usualKind->touched(*elements[at]));
-    }
+    char const* const element = reinterpret_cast<char const*>(m_elements[number]);
+    prefetch(element);
+    for (std::ptrdiff_t const offset : m_usualKind->places)
+        prefetch(element + offset);
 }
 
-bool CandidateScan::passes(ElementTest const& test, ModelElement::Impl& element)
+bool CandidateScan::passesSlowly(ElementTest const& test, ModelElement::Impl& element)
 {
     KeptValue const kept = test.place.read(element);
     switch (test.test.answerFor(kept.shape))
@@ -123,14 +169,34 @@ bool CandidateScan::ask(ElementTest const& test, ModelElement::Impl& element)
         handle, m_regexes.withCache(test.valueConstraint->getComparator()));
 }
 
-void CandidateScan::holdCandidates()
+/// Handles are made now that the new candidates have just been read.
+void CandidateScan::keepCandidates(Keeps keeps)
 {
-    if (m_holdsAll)
-        return;
-    for (auto const& candidates : m_candidates)
+    ElementList& candidates = m_candidates.front();
+    if (keeps == Keeps::Elements)
     {
-        for (ModelElement::Impl* const candidate : candidates)
-            m_held.emplace_back(candidate);
+        m_number = candidates.size();
+        return;
     }
+    if (keeps == Keeps::Handles)
+    {
+        for (std::size_t number = 0; number < candidates.size(); ++number)
+            m_handles.emplace_back(candidates[number]);
+    }
+    m_number += candidates.size();
+    candidates.clear();
+}
+
+PartialRows CandidateScan::takeCandidates(std::size_t instance)
+{
+    PartialRows rows{{instance}, m_candidates[instance].take(), {}};
+    for (std::size_t number = 0; number < m_followed.size(); ++number)
+    {
+        AssociatedObjectConstraint const* const constraint = m_kinds.getFollowed()[number];
+        // Code of clients may have changed what was read before.
+        if (constraint->getSource() == instance && m_followed[number].isComplete && !m_holdsAll)
+            rows.references.push_back({constraint, m_followed[number].entries.take()});
+    }
+    return rows;
 }
 }  // namespace tarn::kiln::internal

@@ -7,6 +7,7 @@
 #include "tarnkiln/meta/internal/PackedPayload.h"
 #include "tarnkiln/meta/internal/PayloadAccess.h"
 #include "tarnkiln/query/internal/RowIndex.h"
+#include "tarnkiln/query/internal/prefetch.h"
 
 #include <cstring>
 #include <functional>
@@ -44,10 +45,10 @@ int literalAt(void const* payload)
 }  // namespace
 
 ComparisonTest::ComparisonTest(PropertyRelationPropertyJoinConstraint const& constraint,
-                               JoinSides const& sides, RegexCache const& regexes)
-    : PairTest(sides),
+                               JoinSides const& sides, JoinContext const& context)
+    : PairTest(sides, context),
       m_constraint(constraint),
-      m_comparator(regexes.withCache(constraint.getComparator())),
+      m_comparator(context.regexes.withCache(constraint.getComparator())),
       m_leftSide(sides.ids[0] == constraint.getLeftInstance() ? 0 : 1)
 {}
 
@@ -71,6 +72,7 @@ Value const& ComparisonTest::valueOf(int side, std::size_t row)
 
 Value ComparisonTest::read(int side, ModelElement::Impl& element) const
 {
+    m_context.holdElements();
     ModelElement const handle(&element);
     return side == m_leftSide ? m_constraint.readLeft(handle) : m_constraint.readRight(handle);
 }
@@ -78,16 +80,19 @@ Value ComparisonTest::read(int side, ModelElement::Impl& element) const
 /// Unknown unless the element keeps a value of that kind where it can be looked at.
 KeptValue ComparisonTest::Reader::read(ModelElement::Impl const& element, SlotKind kind)
 {
-    std::type_info const& type = typeid(element);
-    bool const isReflective = type == typeid(ReflectiveModelElementImpl);
-    void const* const key =
-        isReflective ? static_cast<void const*>(&cellsOf(element).layout()) : &type;
-    if (key != m_lastKey)
+    void const* const elementKind = m_kinds.of(element);
+    if (elementKind != m_lastKind)
     {
-        m_lastPlace = PlainPlace::find(element, keptBy(element), m_property);
-        m_lastKey = key;
+        m_place = PlainPlace::find(element, keptBy(element), m_property);
+        m_lastKind = elementKind;
     }
-    return m_lastPlace.kind() == kind ? m_lastPlace.read(element) : KeptValue();
+    return m_place.kind() == kind ? m_place.read(element) : KeptValue();
+}
+
+void ComparisonTest::Reader::prefetch(ModelElement::Impl const& element) const
+{
+    internal::prefetch(&element);
+    internal::prefetch(m_place.fieldOf(element));
 }
 
 /// Unknown if the value is not a single one of the kind.
@@ -127,6 +132,8 @@ std::optional<RowPairs> ComparisonTest::findEqual(SlotKind kind, bool onlySingle
         kept[side].reserve(rows);
         for (std::size_t row = 0; row < rows; ++row)
         {
+            if (row + AHEAD < rows)
+                reader.prefetch(*m_sides.elements[side][row + AHEAD]);
             kept[side].push_back(keptValueOf<T>(side, row, reader, kind));
             KeptValue::Shape const shape = kept[side].back().shape;
             if (shape == KeptValue::Shape::Unknown ||

@@ -5,10 +5,8 @@
 #include "tarnkiln/meta/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/PairTest.h"
 #include "tarnkiln/query/internal/PropertyRelationPropertyJoinConstraint.h"
-#include "tarnkiln/query/internal/RegexCache.h"
 
 #include <optional>
-#include <typeinfo>
 #include <vector>
 
 namespace tarn::kiln::internal {
@@ -18,7 +16,7 @@ class ComparisonTest final : public PairTest
 {
 public:
     ComparisonTest(PropertyRelationPropertyJoinConstraint const& constraint, JoinSides const& sides,
-                   RegexCache const& regexes);
+                   JoinContext const& context);
 
     bool matches(std::size_t first, std::size_t second) override;
     std::optional<RowPairs> findMatches() override;
@@ -31,11 +29,14 @@ private:
         explicit Reader(meta::Property const& property) : m_property(property) {}
 
         KeptValue read(ModelElement::Impl const& element, SlotKind kind);
+        /// Guesses that it is of the kind of the last one.
+        void prefetch(ModelElement::Impl const& element) const;
 
     private:
         meta::Property const& m_property;
-        void const* m_lastKey = nullptr;  ///< C++ class or layout of the last element.
-        PlainPlace m_lastPlace;
+        KindKeys m_kinds;
+        void const* m_lastKind = nullptr;
+        PlainPlace m_place;  ///< In elements of that kind.
     };
 
     Value const& valueOf(int side, std::size_t row);

@@ -3,6 +3,7 @@
 #include "tarnkiln/query/internal/CandidateScan.h"
 #include "tarnkiln/query/internal/GroupJoin.h"
 #include "tarnkiln/query/internal/PartialRows.h"
+#include "tarnkiln/query/internal/prefetch.h"
 
 #include <algorithm>
 #include <list>
@@ -19,6 +20,7 @@ struct Window
     std::size_t begin = 0;
     std::size_t size = ALL;  ///< At most.
 
+    bool isAll() const { return begin == 0 && size == ALL; }
     /// The number of rows that must be found.
     std::size_t end() const { return size > ALL - begin ? ALL : begin + size; }
     std::size_t cut(std::size_t rows) const
@@ -46,18 +48,100 @@ public:
         : m_query(query),
           m_window(window),
           m_scan(query, m_regexes)
+    {}
+
+    /// The rows that are wanted.
+    std::size_t count()
     {
-        m_scan.run(window.end() == ALL ? 0 : window.end());
-        if (!query.joins.empty())
-            m_scan.holdCandidates();
-        for (std::size_t id = 0; id < query.instances.size(); ++id)
-            m_sets.push_back({{id}, std::move(m_scan.getCandidates()[id])});
-        for (auto const& [ids, constraints] : query.joins)
+        if (isOfOneInstance())
+        {
+            scan(CandidateScan::Keeps::Number);
+            return m_window.cut(m_scan.getNumber());
+        }
+        findSets();
+        return countRows();
+    }
+
+    NativeResultSet rows(std::vector<std::size_t> const& columns)
+    {
+        NativeResultSet result(m_query.instances.size(), columns.size());
+        if (isOfOneInstance() && columns.size() == 1 && m_window.isAll())
+        {
+            m_query.checkInstance(columns.front());
+            scan(CandidateScan::Keeps::Handles);
+            result.setCells(m_scan.takeHandles());
+            return result;
+        }
+        findSets();
+        std::size_t const wanted = countRows();
+        result.reserve(wanted);
+        std::vector<Wheel> wheels = makeWheels(columns);
+        for (std::size_t row = 0; row < wanted; ++row)
+        {
+            for (Wheel& wheel : wheels)
+                result.addCell(wheel.next());
+        }
+        return result;
+    }
+
+private:
+    /// A column of the result, which comes from the combinations of all sets: the first set's rows
+    /// count fastest.
+    class Wheel
+    {
+    public:
+        /// \param divisor  how many combinations there are before the row of the set changes.
+        Wheel(PartialRows const& set, std::size_t column, std::size_t divisor, std::size_t begin)
+            : m_set(set),
+              m_column(column),
+              m_rows(set.size()),
+              m_divisor(divisor),
+              m_row(m_rows == 0 ? 0 : begin / divisor % m_rows),
+              m_left(divisor - begin % divisor)
+        {}
+
+        /// The element in the present row of the result, which then is the next one.
+        ModelElement::Impl* next()
+        {
+            ModelElement::Impl* const element = m_set.at(m_row, m_column);
+            if (--m_left == 0)
+                turn();
+            return element;
+        }
+
+    private:
+        void turn()
+        {
+            m_left = m_divisor;
+            m_row = m_row + 1 == m_rows ? 0 : m_row + 1;
+            if (m_row + AHEAD < m_rows)
+                prefetch(m_set.at(m_row + AHEAD, m_column));
+        }
+
+        PartialRows const& m_set;
+        std::size_t m_column;
+        std::size_t m_rows;
+        std::size_t m_divisor;
+        std::size_t m_row;
+        std::size_t m_left;  ///< Before `m_row` changes.
+    };
+
+    bool isOfOneInstance() const { return m_query.instances.size() == 1 && m_query.joins.empty(); }
+    void scan(CandidateScan::Keeps keeps)
+    {
+        m_scan.run(keeps, m_window.end() == ALL ? 0 : m_window.end());
+    }
+    void findSets()
+    {
+        scan(CandidateScan::Keeps::Elements);
+        for (std::size_t id = 0; id < m_query.instances.size(); ++id)
+            m_sets.push_back(m_scan.takeCandidates(id));
+        for (auto const& [ids, constraints] : m_query.joins)
             join(ids, constraints);
     }
 
     /// The rows that are wanted; those of sets that nothing ties together are all combinations.
-    std::size_t count() const
+    std::size_t countRows() const
     {
         std::size_t rows = 1;
         for (PartialRows const& set : m_sets)
@@ -67,35 +151,6 @@ public:
         }
         return m_window.cut(hasEmptySet() ? 0 : rows);
     }
-
-    NativeResultSet rows(std::vector<std::size_t> const& columns) const
-    {
-        NativeResultSet result(m_query.instances.size(), columns.size());
-        std::size_t const wanted = count();
-        result.reserve(wanted);
-        std::vector<Wheel> wheels = makeWheels(columns);
-        for (std::size_t row = 0; row < wanted; ++row)
-        {
-            for (Wheel const& wheel : wheels)
-            {
-                std::size_t const number =
-                    (m_window.begin + row) / wheel.divisor % wheel.set->size();
-                result.addCell(wheel.set->at(number, wheel.column));
-            }
-        }
-        return result;
-    }
-
-private:
-    /// Where a column of the result comes from, among the combinations of all sets: the first set's
-    /// rows count fastest.
-    struct Wheel
-    {
-        PartialRows const* set;
-        std::size_t column;
-        std::size_t
-            divisor;  ///< How many combinations there are before the row of the set changes.
-    };
 
     bool hasEmptySet() const
     {
@@ -114,11 +169,11 @@ private:
             {
                 if (std::size_t const column = set.columnOf(id); column < set.width())
                 {
-                    wheels.push_back({&set, column, divisor});
+                    wheels.emplace_back(set, column, divisor, m_window.begin);
                     break;
                 }
-                bool const isTooMany = set.size() != 0 && divisor > ALL / set.size();
-                divisor = isTooMany ? ALL : divisor * set.size();
+                std::size_t const rows = std::max(set.size(), std::size_t{1});
+                divisor = divisor > ALL / rows ? ALL : divisor * rows;
             }
         }
         return wheels;
@@ -140,13 +195,30 @@ private:
         if (second != first)
             m_sets.erase(second);
     }
-    JoinContext context() const { return {m_query.model, m_regexes}; }
+    JoinContext context()
+    {
+        return {m_query.model, m_regexes, [this] { holdElements(); }};
+    }
+    void holdElements()
+    {
+        if (m_holdsElements || m_scan.holdsAll())
+            return;
+        for (PartialRows& set : m_sets)
+        {
+            for (ModelElement::Impl* const element : set.cells)
+                m_held.emplace_back(element);
+            set.references.clear();
+        }
+        m_holdsElements = true;
+    }
 
     NativeQueryState const& m_query;
     Window const m_window;
     RegexCache m_regexes;
     CandidateScan m_scan;
     std::list<PartialRows> m_sets;  ///< One for each group of instances that are not joined yet.
+    std::vector<ModelElement> m_held;
+    bool m_holdsElements = false;
 };
 }  // namespace
 

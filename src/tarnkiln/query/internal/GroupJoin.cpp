@@ -4,18 +4,36 @@
 #include "tarnkiln/query/internal/ReferenceTest.h"
 
 #include <algorithm>
+#include <span>
 
 namespace tarn::kiln::internal {
 namespace {
 
 using Tests = std::vector<std::unique_ptr<PairTest>>;
 
-JoinSides sidesOf(PartialRows const& first, PartialRows const& second,
-                  std::vector<std::size_t> const& ids)
+/// The elements of one instance, row by row.
+class Column
 {
-    return {{ids[0], ids[1]},
-            {first.column(first.columnOf(ids[0])), second.column(second.columnOf(ids[1]))}};
-}
+public:
+    Column(PartialRows const& rows, std::size_t id)
+    {
+        if (rows.width() == 1)
+        {
+            m_elements = rows.cells;
+            return;
+        }
+        m_copy = rows.column(rows.columnOf(id));
+        m_elements = m_copy;
+    }
+    Column(Column const&) = delete;
+    Column& operator=(Column const&) = delete;
+
+    std::span<ModelElement::Impl* const> elements() const { return m_elements; }
+
+private:
+    std::vector<ModelElement::Impl*> m_copy;
+    std::span<ModelElement::Impl* const> m_elements;
+};
 
 Tests makeTests(JoinConstraints const& constraints, JoinSides const& sides,
                 JoinContext const& context)
@@ -25,11 +43,11 @@ Tests makeTests(JoinConstraints const& constraints, JoinSides const& sides,
     {
         if (auto const* const reference =
                 dynamic_cast<AssociatedObjectConstraint const*>(constraint.get()))
-            tests.push_back(std::make_unique<ReferenceTest>(*reference, sides, context.model));
+            tests.push_back(std::make_unique<ReferenceTest>(*reference, sides, context));
         else
             tests.push_back(std::make_unique<ComparisonTest>(
                 static_cast<PropertyRelationPropertyJoinConstraint const&>(*constraint), sides,
-                context.regexes));
+                context));
     }
     return tests;
 }
@@ -58,12 +76,15 @@ PartialRows joinRows(PartialRows const& first, PartialRows const& second,
                      std::vector<std::size_t> const& ids, JoinConstraints const& constraints,
                      JoinContext const& context)
 {
-    PartialRows result{first.columns, {}};
+    PartialRows result{first.columns, {}, {}};
     result.columns.insert(result.columns.end(), second.columns.begin(), second.columns.end());
     if (first.size() == 0 || second.size() == 0)
         return result;
 
-    JoinSides const sides = sidesOf(first, second, ids);
+    Column const firstColumn(first, ids[0]);
+    Column const secondColumn(second, ids[1]);
+    JoinSides const sides{
+        {ids[0], ids[1]}, {&first, &second}, {firstColumn.elements(), secondColumn.elements()}};
     Tests tests = makeTests(constraints, sides, context);
     auto const append = [&](std::size_t firstRow, std::size_t secondRow) {
         result.append(first, firstRow);
@@ -92,10 +113,13 @@ PartialRows joinRows(PartialRows const& first, PartialRows const& second,
 PartialRows filterRows(PartialRows const& rows, std::vector<std::size_t> const& ids,
                        JoinConstraints const& constraints, JoinContext const& context)
 {
-    PartialRows result{rows.columns, {}};
+    PartialRows result{rows.columns, {}, {}};
     if (rows.size() == 0)
         return result;
-    JoinSides const sides = sidesOf(rows, rows, ids);
+    Column const firstColumn(rows, ids[0]);
+    Column const secondColumn(rows, ids[1]);
+    JoinSides const sides{
+        {ids[0], ids[1]}, {&rows, &rows}, {firstColumn.elements(), secondColumn.elements()}};
     Tests tests = makeTests(constraints, sides, context);
     for (std::size_t row = 0; row < rows.size(); ++row)
     {

@@ -1,22 +1,14 @@
 /// \file
 /// The rows that a group of join constraints leaves over.
 #pragma once
-#include "tarnkiln/kernel/Model.h"
 #include "tarnkiln/query/internal/JoinConstraint.h"
+#include "tarnkiln/query/internal/PairTest.h"
 #include "tarnkiln/query/internal/PartialRows.h"
-#include "tarnkiln/query/internal/RegexCache.h"
 
 #include <memory>
 #include <vector>
 
 namespace tarn::kiln::internal {
-
-/// What the joins of a run share.
-struct JoinContext
-{
-    Model const& model;
-    RegexCache const& regexes;
-};
 
 using JoinConstraints = std::vector<std::unique_ptr<JoinConstraint>>;
 

@@ -1,15 +1,17 @@
 /// \file
 /// The rows of a finished run.
 #pragma once
+#include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 
 #include <cstddef>
+#include <utility>
 #include <vector>
 
 namespace tarn::kiln::internal {
 
 /// A table of elements, row after row in one block.
-class NativeResultSet
+class TARNKILN_TESTED NativeResultSet
 {
 public:
     /// \param instances  the search instances of the query.
@@ -18,10 +20,15 @@ public:
         : m_instances(instances),
           m_width(width)
     {}
+    NativeResultSet(NativeResultSet&&) = default;
+    NativeResultSet& operator=(NativeResultSet&&) = delete;
+    ~NativeResultSet();
 
     void reserve(std::size_t rows) { m_cells.reserve(rows * m_width); }
     /// Rows are given cell by cell.
     void addCell(ModelElement::Impl* element) { m_cells.emplace_back(element); }
+    /// All cells at once, where there were none.
+    void setCells(std::vector<ModelElement> cells) { m_cells = std::move(cells); }
 
     std::size_t getInstanceCount() const { return m_instances; }
     std::size_t getRowCount() const { return m_cells.size() / m_width; }

@@ -1,20 +1,36 @@
 /// \file
 /// A join constraint that is asked about the same elements again and again.
 #pragma once
+#include "tarnkiln/kernel/Model.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/query/internal/PartialRows.h"
+#include "tarnkiln/query/internal/RegexCache.h"
 
 #include <cstddef>
+#include <functional>
 #include <optional>
+#include <span>
 #include <utility>
 #include <vector>
 
 namespace tarn::kiln::internal {
 
+/// What the joins of a run share.
+struct JoinContext
+{
+    Model const& model;
+    RegexCache const& regexes;
+    /// Keeps all elements of the rows alive from now on. To be called before an element is asked,
+    /// which may run code of clients.
+    std::function<void()> holdElements;
+};
+
 /// The two columns of elements that a group of joins ties together.
 struct JoinSides
 {
-    std::size_t ids[2];  ///< The instances, ascending.
-    std::vector<ModelElement::Impl*> elements[2];
+    std::size_t ids[2];          ///< The instances, ascending.
+    PartialRows const* rows[2];  ///< Where the columns come from.
+    std::span<ModelElement::Impl* const> elements[2];
 };
 
 /// Pairs of rows, the second ascending and slow, the first ascending and fast.
@@ -53,8 +69,13 @@ public:
     virtual std::optional<RowPairs> findMatches() = 0;
 
 protected:
-    explicit PairTest(JoinSides const& sides) : m_sides(sides) {}
+    /// Both must outlive the test.
+    PairTest(JoinSides const& sides, JoinContext const& context)
+        : m_sides(sides),
+          m_context(context)
+    {}
 
     JoinSides const& m_sides;
+    JoinContext const& m_context;
 };
 }  // namespace tarn::kiln::internal

@@ -2,12 +2,22 @@
 /// The rows that a run has found so far for some of its instances.
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/query/internal/AssociatedObjectConstraint.h"
 
 #include <algorithm>
 #include <cstddef>
+#include <span>
 #include <vector>
 
 namespace tarn::kiln::internal {
+
+/// What the single reference of each element of a column refers to, proxies and dead elements as
+/// they are; null for nothing.
+struct KnownReferences
+{
+    AssociatedObjectConstraint const* constraint;  ///< That asks for them.
+    std::vector<ModelElement::Impl*> entries;      ///< By row.
+};
 
 /// A table of elements, which the run keeps alive; row after row in one block.
 struct PartialRows
@@ -40,7 +50,20 @@ struct PartialRows
         cells.insert(cells.end(), first, first + static_cast<std::ptrdiff_t>(other.width()));
     }
 
+    /// Those that were read with the elements; else empty.
+    std::span<ModelElement::Impl* const>
+    findReferences(AssociatedObjectConstraint const& constraint) const
+    {
+        for (KnownReferences const& known : references)
+        {
+            if (known.constraint == &constraint)
+                return known.entries;
+        }
+        return {};
+    }
+
     std::vector<std::size_t> columns;  ///< The instances; never none.
     std::vector<ModelElement::Impl*> cells;
+    std::vector<KnownReferences> references;  ///< As long as no code of clients may have run.
 };
 }  // namespace tarn::kiln::internal

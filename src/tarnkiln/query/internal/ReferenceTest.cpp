@@ -7,6 +7,7 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/RowIndex.h"
+#include "tarnkiln/query/internal/prefetch.h"
 
 #include <algorithm>
 
@@ -41,29 +42,49 @@ std::optional<UUID> parseUuid(ustring const& text)
     return result;
 }
 
-std::size_t hashOf(ModelElement::Impl const* element)
+/// Finds the rows of elements.
+class ElementIndex
 {
-    return reinterpret_cast<std::uintptr_t>(element) >> 4;
-}
+public:
+    explicit ElementIndex(std::span<ModelElement::Impl* const> elements)
+        : m_elements(elements),
+          m_index(elements.size())
+    {
+        for (std::size_t row = elements.size(); row-- > 0;)
+            m_index.addBefore(row, hashOf(elements[row]));
+    }
 
-/// Whether a single value of the property can be read as an element.
-bool isReference(meta::Property const& property)
-{
-    if (!property || property->getUpper() != 1)
-        return false;
-    auto const* const type = classImpl(property->getType());
-    return type && type->isLive() && type->isA(ModelElement::metaClass());
-}
+    /// Calls `visit(row)` for each, ascending.
+    template <class Visit>
+    void forEachRow(ModelElement::Impl const* element, Visit const& visit) const
+    {
+        for (std::size_t row = m_index.first(hashOf(element)); row != RowIndex::NONE;
+             row = m_index.next(row))
+        {
+            if (m_elements[row] == element)
+                visit(row);
+        }
+    }
+
+private:
+    static std::size_t hashOf(ModelElement::Impl const* element)
+    {
+        return reinterpret_cast<std::uintptr_t>(element) >> 4;
+    }
+
+    std::span<ModelElement::Impl* const> m_elements;
+    RowIndex m_index;
+};
 }  // namespace
 
 ReferenceTest::ReferenceTest(AssociatedObjectConstraint const& constraint, JoinSides const& sides,
-                             Model const& model)
-    : PairTest(sides),
+                             JoinContext const& context)
+    : PairTest(sides, context),
       m_constraint(constraint),
-      m_model(model),
       m_sourceSide(sides.ids[0] == constraint.getSource() ? 0 : 1),
       m_targetSide(sides.ids[0] == constraint.getTarget() ? 0 : 1),
-      m_isSimple(isReference(constraint.getProperty()))
+      m_isSimple(constraint.isOfSingleReference()),
+      m_entries(sides.rows[m_sourceSide]->findReferences(constraint))
 {}
 
 bool ReferenceTest::matches(std::size_t first, std::size_t second)
@@ -88,11 +109,29 @@ ReferenceTest::Targets const& ReferenceTest::targetsOf(std::size_t row)
     return *targets;
 }
 
+bool ReferenceTest::findPlace(ModelElement::Impl const& source)
+{
+    if (!m_isSimple)
+        return false;
+    void const* const kind = m_kinds.of(source);
+    if (kind != m_lastKind)
+    {
+        m_place = ReferencePlace::find(source, m_constraint.getProperty());
+        m_lastKind = kind;
+    }
+    return m_place.isKnown();
+}
+
 void ReferenceTest::readTargets(ModelElement::Impl& source, Targets& targets)
 {
     targets.clear();
-    if (readSingleTarget(source, targets))
+    if (findPlace(source))
+    {
+        if (ModelElement::Impl* const target = meaningOf(m_place.read(source)))
+            targets.push_back(target);
         return;
+    }
+    m_context.holdElements();
     for (ModelElement const& entry : m_constraint.readReferences(ModelElement(&source)))
     {
         if (ModelElement::Impl* const target = meaningOf(entry.getImpl()))
@@ -102,78 +141,55 @@ void ReferenceTest::readTargets(ModelElement::Impl& source, Targets& targets)
     targets.erase(std::unique(targets.begin(), targets.end()), targets.end());
 }
 
-/// False if the source must be asked.
-bool ReferenceTest::readSingleTarget(ModelElement::Impl const& source, Targets& targets)
-{
-    if (!m_isSimple)
-        return false;
-    meta::Property const& property = m_constraint.getProperty();
-    ModelElement::Impl* entry = nullptr;
-    std::type_info const& type = typeid(source);
-    if (type == typeid(ReflectiveModelElementImpl))
-    {
-        ReflectiveCells const& cells = cellsOf(source);
-        ReflectiveSlot const* const slot = cells.layout().find(property);
-        if (!slot || slot->kind() != SlotKind::Reference ||
-            !source.getMetaClass()->isATypeOf(property))
-            return false;
-        entry = cells.get(*slot).pointer<ModelElement::Impl>();
-    }
-    else
-    {
-        if (&type != m_lastType)
-            m_lastField =
-                source.isReadByFields() ? source.findStoredField(property) : StoredField();
-        m_lastType = &type;
-        if (!m_lastField.target)
-            return false;
-        entry = m_lastField.target(source);
-    }
-    if (ModelElement::Impl* const target = meaningOf(entry))
-        targets.push_back(target);
-    return true;
-}
-
 ModelElement::Impl* ReferenceTest::meaningOf(ModelElement::Impl* entry) const
 {
     if (!entry || !entry->isLive() || !entry->isProxy())
         return entry;
     ustring const* const text = AssociatedObjectConstraint::getNamedUuid(ModelElement(entry));
     std::optional<UUID> const id = text ? parseUuid(*text) : std::nullopt;
-    return id ? m_model->findElementImpl(*id) : nullptr;
+    return id ? m_context.model->findElementImpl(*id) : nullptr;
 }
 
 std::optional<RowPairs> ReferenceTest::findMatches()
 {
     auto const& sources = m_sides.elements[m_sourceSide];
     auto const& targets = m_sides.elements[m_targetSide];
-    RowIndex index(targets.size());
-    for (std::size_t row = targets.size(); row-- > 0;)
-        index.addBefore(row, hashOf(targets[row]));
-
+    ElementIndex const index(targets);
     RowPairs pairs;
-    Targets found;
-    std::vector<std::size_t> rows;
-    for (std::size_t source = 0; source < sources.size(); ++source)
-    {
-        rows.clear();
-        readTargets(*sources[source], found);
-        for (ModelElement::Impl* const target : found)
-        {
-            for (std::size_t row = index.first(hashOf(target)); row != RowIndex::NONE;
-                 row = index.next(row))
-            {
-                if (targets[row] == target)
-                    rows.push_back(row);
-            }
-        }
-        if (found.size() > 1)
-            std::sort(rows.begin(), rows.end());
-        for (std::size_t const row : rows)
+    auto const addPairs = [&](std::size_t source, ModelElement::Impl const* target) {
+        if (!target)
+            return;
+        index.forEachRow(target, [&](std::size_t row) {
             pairs.emplace_back(m_sourceSide == 0 ? source : row, m_sourceSide == 0 ? row : source);
+        });
+    };
+    for (std::size_t source = 0; source < m_entries.size(); ++source)
+    {
+        if (source + AHEAD < m_entries.size())
+            prefetch(m_entries[source + AHEAD]);
+        addPairs(source, meaningOf(m_entries[source]));
+    }
+    Targets found;
+    for (std::size_t source = m_entries.size(); source < sources.size(); ++source)
+    {
+        if (source + AHEAD < sources.size())
+            prefetchSource(*sources[source + AHEAD]);
+        readTargets(*sources[source], found);
+        std::size_t const begin = pairs.size();
+        for (ModelElement::Impl const* const target : found)
+            addPairs(source, target);
+        if (found.size() > 1)
+            std::sort(pairs.begin() + static_cast<std::ptrdiff_t>(begin), pairs.end());
     }
     if (m_sourceSide == 0)
         sortBySecond(pairs, targets.size());
     return pairs;
+}
+
+/// Guesses that it is of the kind of the last one.
+void ReferenceTest::prefetchSource(ModelElement::Impl const& source) const
+{
+    prefetch(&source);
+    prefetch(m_place.placeIn(source));
 }
 }  // namespace tarn::kiln::internal

@@ -1,13 +1,13 @@
 /// \file
 /// Which elements refer to which others.
 #pragma once
-#include "tarnkiln/kernel/Model.h"
-#include "tarnkiln/kernel/StoredField.h"
+#include "tarnkiln/meta/internal/PlainPlace.h"
 #include "tarnkiln/query/internal/AssociatedObjectConstraint.h"
 #include "tarnkiln/query/internal/PairTest.h"
+#include "tarnkiln/query/internal/ReferencePlace.h"
 
 #include <optional>
-#include <typeinfo>
+#include <span>
 #include <vector>
 
 namespace tarn::kiln::internal {
@@ -17,7 +17,7 @@ class ReferenceTest final : public PairTest
 {
 public:
     ReferenceTest(AssociatedObjectConstraint const& constraint, JoinSides const& sides,
-                  Model const& model);
+                  JoinContext const& context);
 
     bool matches(std::size_t first, std::size_t second) override;
     std::optional<RowPairs> findMatches() override;
@@ -28,17 +28,20 @@ private:
     /// What the source in that row refers to, sorted, each once.
     Targets const& targetsOf(std::size_t row);
     void readTargets(ModelElement::Impl& source, Targets& targets);
-    bool readSingleTarget(ModelElement::Impl const& source, Targets& targets);
+    /// False if the source must be asked.
+    bool findPlace(ModelElement::Impl const& source);
+    void prefetchSource(ModelElement::Impl const& source) const;
     /// What an entry of the property means: itself, or what it stands in for; null for nothing.
     ModelElement::Impl* meaningOf(ModelElement::Impl* entry) const;
 
     AssociatedObjectConstraint const& m_constraint;
-    Model const m_model;
     int const m_sourceSide;
     int const m_targetSide;
     bool const m_isSimple;  ///< A property with one value, and that certainly an element.
-    std::type_info const* m_lastType = nullptr;
-    StoredField m_lastField;  ///< Where elements of `m_lastType` keep it.
+    std::span<ModelElement::Impl* const> const m_entries;  ///< By row of the source, if known.
+    KindKeys m_kinds;
+    void const* m_lastKind = nullptr;
+    ReferencePlace m_place;  ///< In elements of that kind.
     std::vector<std::optional<Targets>>
         m_targets;  ///< By row of the source; empty before first use.
 };

@@ -1,6 +1,7 @@
 /// \file
 /// Rows by the hash of a key.
 #pragma once
+#include <algorithm>
 #include <bit>
 #include <cstddef>
 #include <vector>
@@ -20,7 +21,7 @@ public:
     static constexpr std::size_t NONE = ~std::size_t{0};
 
     explicit RowIndex(std::size_t rows)
-        : m_firsts(std::bit_ceil(rows + 1), NONE),
+        : m_firsts(std::max(std::bit_ceil(rows + 1), LEAST), NONE),
           m_nexts(rows, NONE)
     {}
 
@@ -35,6 +36,9 @@ public:
     std::size_t next(std::size_t row) const { return m_nexts[row]; }
 
 private:
+    /// So many that few places lead to a row, where few rows are sought for many keys.
+    static constexpr std::size_t LEAST = 256;
+
     /// Spreads hashes that differ in high bits only, as those of addresses and numbers may.
     std::size_t place(std::size_t hash) const
     {

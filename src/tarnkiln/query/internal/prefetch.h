@@ -1,0 +1,17 @@
+/// \file
+/// Fetching memory before it is needed.
+#pragma once
+#include <cstddef>
+
+namespace tarn::kiln::internal {
+
+/// How many elements earlier. Elements lie anywhere in memory, and the processor waits for many at
+/// a time if it is told of them.
+constexpr std::size_t AHEAD = 16;
+
+/// Any address will do, also one where nothing is.
+inline void prefetch(void const* place)
+{
+    __builtin_prefetch(place);
+}
+}  // namespace tarn::kiln::internal
