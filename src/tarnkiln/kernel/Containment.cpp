@@ -6,6 +6,7 @@
 #include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/services/datasource/DataSource.h"
+#include "tarnkiln/support/JoiningTransaction.h"
 #include "tarnkiln/support/OpenStep.h"
 
 #include <utility>
@@ -89,14 +90,16 @@ class SeparateDestruction
 {
 public:
     SeparateDestruction()
-        : m_outer(std::exchange(destructions, {}))
+        : m_all(destructionsOfThread())
+        , m_outer(std::exchange(m_all, {}))
     {
     }
     SeparateDestruction(SeparateDestruction const&) = delete;
     SeparateDestruction& operator=(SeparateDestruction const&) = delete;
-    ~SeparateDestruction() { destructions = m_outer; }
+    ~SeparateDestruction() { m_all = m_outer; }
 
 private:
+    Destructions& m_all;
     Destructions m_outer;
 };
 
@@ -265,6 +268,12 @@ void ModelElement::Impl::destroy()
     }
     bool const multiModel = model->isMultiModel();
     SeparateDestruction const separate;
+    if (model->getCurrentTransaction() && !model->getDataSource()) {
+        support::JoiningTransaction transaction(*this);
+        destroyRecursively(/*keepIncoming=*/false, /*removeFromContainer=*/true, multiModel);
+        transaction.commit();
+        return;
+    }
     Transaction const transaction = model->beginTransaction(/*revertible=*/false);
     if (model->getDataSource())
         model->getDataSource()->loadElementSubtree(keep);

@@ -32,6 +32,12 @@ struct Deletions
 /// Holds no object, so that it is found without a test whether it has been made.
 constinit thread_local Deletions deletions;
 
+/// A function of its own, so that they are found once: in a shared library that takes a call.
+[[gnu::noinline]] Deletions& deletionsOfThread()
+{
+    return deletions;
+}
+
 /// Deletes what waits, and what comes to wait meanwhile.
 void deleteWaiting(Deletions& all)
 {
@@ -59,19 +65,6 @@ bool waitsForOutermost(Deletions& all, ElementImpl* element)
     {
         return false;
     }
-}
-
-/// Not part of its caller, so that the deletions of the thread are found once: in a shared library
-/// that takes a call.
-[[gnu::noinline]] void deleteIn(Deletions& all, ElementImpl* element)
-{
-    if (all.depth >= MAX_DELETION_DEPTH && waitsForOutermost(all, element))
-        return;
-    ++all.depth;
-    delete element;
-    if (all.depth == 1 && all.waiting)
-        deleteWaiting(all);
-    --all.depth;
 }
 
 /// All of the state from the system's source of randomness. `std::random_device` would ask the
@@ -111,7 +104,14 @@ void ElementImpl::removeRef()
 
 void ElementImpl::deleteThis()
 {
-    deleteIn(deletions, this);
+    Deletions& ofThread = deletionsOfThread();
+    if (ofThread.depth >= MAX_DELETION_DEPTH && waitsForOutermost(ofThread, this))
+        return;
+    ++ofThread.depth;
+    delete this;
+    if (ofThread.depth == 1 && ofThread.waiting)
+        deleteWaiting(ofThread);
+    --ofThread.depth;
 }
 
 void ElementImpl::invalidate()

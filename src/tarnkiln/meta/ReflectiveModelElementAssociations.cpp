@@ -21,11 +21,11 @@ bool holdsElements(internal::ReflectiveSlot const& slot)
 }
 
 /// Whether it is a reference that is not empty, or a collection of references that is there.
-bool isInUse(internal::ReflectiveCells const& cells, internal::ReflectiveSlot const& slot)
+inline bool isInUse(internal::ReflectiveCells const& cells, internal::ReflectiveSlot const& slot)
 {
-    return holdsElements(slot) && (slot.kind() == SlotKind::Reference
-                                       ? cells.get(slot).word != 0
-                                       : cells.getCollection(slot) != nullptr);
+    return holdsElements(slot) &&
+           (slot.kind() == SlotKind::Reference ? cells.get(slot).word != 0
+                                               : cells.getCollection(slot) != nullptr);
 }
 
 bool isDying(ModelElement::Impl const& source, ModelElement const& target)
@@ -186,16 +186,17 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
 void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
                                                             boost::optional<ProxyId>& cachedId)
 {
-    for (ReflectiveSlot const& slot : layout().slots())
+    internal::ReflectiveCells& own = cells();
+    for (ReflectiveSlot const& slot : own.layout().slots())
     {
-        if (!isInUse(getCells(), slot) || layout().factsOf(slot).isComposite)
+        if (!isInUse(own, slot) || own.layout().factsOf(slot).isComposite)
             continue;
         if (multiModel)
             leaveProxies(slot, cachedId);
         if (slot.kind() == SlotKind::Reference)
             basicSetTarget(slot, ModelElement());
         else
-            _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
+            _basicClear(static_cast<ReferenceCollection*>(own.getCollection(slot)));
     }
 }
 

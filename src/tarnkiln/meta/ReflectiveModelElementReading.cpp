@@ -107,7 +107,8 @@ void ReflectiveModelElementImpl::basicSetTarget(ReflectiveSlot const& slot,
     if (target.getImpl())
         target.getImpl()->addRef();
     cells().set(slot, cell);
-    slot.release(old);
+    if (auto* const left = old.pointer<ModelElement::Impl>())
+        left->release();
 }
 
 ModelElement::Impl* ReflectiveModelElementImpl::target(ReflectiveSlot const& slot,
