@@ -52,6 +52,17 @@ void CandidateScan::reserve()
         followed.entries.reserve(m_elements.size() + BLOCK);
 }
 
+/// Guesses that it is of the kind of the last one that was tested.
+[[gnu::always_inline]] inline void CandidateScan::prefetchElement(std::size_t number) const
+{
+    if (number >= m_elements.size() || !m_usualKind)
+        return;
+    char const* const element = reinterpret_cast<char const*>(m_elements[number]);
+    prefetch(element);
+    for (std::ptrdiff_t const offset : m_usualKind->places)
+        prefetch(element + offset);
+}
+
 inline bool CandidateScan::passesAll(std::vector<ElementTest> const& tests,
                                      ModelElement::Impl& element)
 {
@@ -89,51 +100,40 @@ void CandidateScan::scanBlock(std::size_t begin, std::size_t end)
         ElementKind const& kind = m_kinds.kindOf(*m_elements[begin]);
         if (!kind.instances.empty())
             m_usualKind = &kind;
-        // Where there are several instances, each element is tested for all before the next one.
-        std::size_t const next = endOfRun(kind, begin, kind.instances.size() > 1 ? begin + 1 : end);
+        if (kind.instances.size() == 1)
+        {
+            begin = scanRun(kind, begin, end);
+            continue;
+        }
+        prefetchElement(begin + AHEAD);
         for (InstanceTests const& instance : kind.instances)
-            scanRun(instance, begin, next);
-        begin = next;
+            testElement(instance, *m_elements[begin]);
+        ++begin;
     }
 }
 
-/// How far elements are of that kind, as that at `begin` is.
-inline std::size_t CandidateScan::endOfRun(ElementKind const& kind, std::size_t begin,
-                                           std::size_t end) const
+/// Tests elements as long as they are of one kind, which can stand for one instance only. Returns
+/// where they end.
+inline std::size_t CandidateScan::scanRun(ElementKind const& kind, std::size_t begin,
+                                          std::size_t end)
 {
     std::size_t number = begin;
     do
     {
         prefetchElement(number + AHEAD);
+        testElement(kind.instances.front(), *m_elements[number]);
         ++number;
     }
     while (number < end && kind.isOf(*m_elements[number]));
     return number;
 }
 
-inline void CandidateScan::scanRun(InstanceTests const& instance, std::size_t begin,
-                                   std::size_t end)
+inline void CandidateScan::testElement(InstanceTests const& instance, ModelElement::Impl& element)
 {
-    ElementList& candidates = m_candidates[instance.instance];
-    for (std::size_t number = begin; number < end; ++number)
-    {
-        ModelElement::Impl& element = *m_elements[number];
-        bool const isCandidate = passesAll(instance.tests, element);
-        candidates.addIf(isCandidate, &element);
-        if (!instance.followed.empty() && isCandidate)
-            follow(instance, element);
-    }
-}
-
-/// Guesses that it is of the kind of the last one that was tested.
-void CandidateScan::prefetchElement(std::size_t number) const
-{
-    if (number >= m_elements.size() || !m_usualKind)
-        return;
-    char const* const element = reinterpret_cast<char const*>(m_elements[number]);
-    prefetch(element);
-    for (std::ptrdiff_t const offset : m_usualKind->places)
-        prefetch(element + offset);
+    bool const isCandidate = passesAll(instance.tests, element);
+    m_candidates[instance.instance].addIf(isCandidate, &element);
+    if (!instance.followed.empty() && isCandidate)
+        follow(instance, element);
 }
 
 bool CandidateScan::passesSlowly(ElementTest const& test, ModelElement::Impl& element)

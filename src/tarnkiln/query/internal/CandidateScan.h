@@ -57,8 +57,8 @@ private:
     bool mayStopEarly() const;
     void reserve();
     void scanBlock(std::size_t begin, std::size_t end);
-    std::size_t endOfRun(ElementKind const& kind, std::size_t begin, std::size_t end) const;
-    void scanRun(InstanceTests const& instance, std::size_t begin, std::size_t end);
+    std::size_t scanRun(ElementKind const& kind, std::size_t begin, std::size_t end);
+    void testElement(InstanceTests const& instance, ModelElement::Impl& element);
     void prefetchElement(std::size_t number) const;
     bool passesAll(std::vector<ElementTest> const& tests, ModelElement::Impl& element);
     bool passes(ElementTest const& test, ModelElement::Impl& element);

@@ -89,7 +89,8 @@ KeptValue ComparisonTest::Reader::read(ModelElement::Impl const& element, SlotKi
     return m_place.kind() == kind ? m_place.read(element) : KeptValue();
 }
 
-void ComparisonTest::Reader::prefetch(ModelElement::Impl const& element) const
+[[gnu::always_inline]] inline void
+ComparisonTest::Reader::prefetch(ModelElement::Impl const& element) const
 {
     internal::prefetch(&element);
     internal::prefetch(m_place.fieldOf(element));

@@ -12,11 +12,8 @@ NativeTarnkilnQuery::NativeResultIterator::~NativeResultIterator() = default;
 
 bool NativeTarnkilnQuery::NativeResultIterator::next(std::vector<ModelElement>& row)
 {
-    if (m_next < m_rows.getRowCount())
-    {
-        m_rows.takeRow(m_next++, row);
+    if (m_rows.takeRow(row))
         return true;
-    }
     row.assign(m_rows.getInstanceCount(), ModelElement());
     return false;
 }

@@ -4,8 +4,6 @@
 #include "tarnkiln/query/NativeTarnkilnQuery.h"
 #include "tarnkiln/query/internal/NativeResultSet.h"
 
-#include <cstddef>
-
 namespace tarn::kiln::query {
 
 class NativeTarnkilnQuery::NativeResultIterator final : public ReflectiveQuery::ResultIterator
@@ -18,6 +16,5 @@ public:
 
 private:
     internal::NativeResultSet m_rows;
-    std::size_t m_next = 0;
 };
 }  // namespace tarn::kiln::query

@@ -2,8 +2,6 @@
 
 #include "tarnkiln/query/internal/prefetch.h"
 
-#include <algorithm>
-
 namespace tarn::kiln::internal {
 
 NativeResultSet::~NativeResultSet()
@@ -14,12 +12,5 @@ NativeResultSet::~NativeResultSet()
             prefetch(m_cells[at + AHEAD].getImpl());
         ModelElement const dropped(std::move(m_cells[at]));
     }
-}
-
-void NativeResultSet::takeRow(std::size_t number, std::vector<ModelElement>& row)
-{
-    auto const first = m_cells.begin() + static_cast<std::ptrdiff_t>(number * m_width);
-    row.resize(m_width);
-    std::move(first, first + static_cast<std::ptrdiff_t>(m_width), row.begin());
 }
 }  // namespace tarn::kiln::internal

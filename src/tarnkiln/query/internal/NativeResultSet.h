@@ -32,12 +32,21 @@ public:
 
     std::size_t getInstanceCount() const { return m_instances; }
     std::size_t getRowCount() const { return m_cells.size() / m_width; }
-    /// Moves the row to `row`, which can be done once.
-    void takeRow(std::size_t number, std::vector<ModelElement>& row);
+    /// Moves the next row, from the first on, to `row`; false if there is none, and `row` stays.
+    bool takeRow(std::vector<ModelElement>& row)
+    {
+        if (m_taken == m_cells.size())
+            return false;
+        row.resize(m_width);
+        for (ModelElement& cell : row)
+            cell = std::move(m_cells[m_taken++]);
+        return true;
+    }
 
 private:
     std::size_t m_instances;
     std::size_t m_width;
     std::vector<ModelElement> m_cells;
+    std::size_t m_taken = 0;  ///< Cells.
 };
 }  // namespace tarn::kiln::internal

@@ -150,6 +150,14 @@ ModelElement::Impl* ReferenceTest::meaningOf(ModelElement::Impl* entry) const
     return id ? m_context.model->findElementImpl(*id) : nullptr;
 }
 
+/// Guesses that it is of the kind of the last one.
+[[gnu::always_inline]] inline void
+ReferenceTest::prefetchSource(ModelElement::Impl const& source) const
+{
+    prefetch(&source);
+    prefetch(m_place.placeIn(source));
+}
+
 std::optional<RowPairs> ReferenceTest::findMatches()
 {
     auto const& sources = m_sides.elements[m_sourceSide];
@@ -186,10 +194,4 @@ std::optional<RowPairs> ReferenceTest::findMatches()
     return pairs;
 }
 
-/// Guesses that it is of the kind of the last one.
-void ReferenceTest::prefetchSource(ModelElement::Impl const& source) const
-{
-    prefetch(&source);
-    prefetch(m_place.placeIn(source));
-}
 }  // namespace tarn::kiln::internal
