@@ -1,8 +1,8 @@
 /// \file
 /// The rows of a finished run.
 #pragma once
-#include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/query/internal/prefetch.h"
 
 #include <cstddef>
 #include <utility>
@@ -11,7 +11,7 @@
 namespace tarn::kiln::internal {
 
 /// A table of elements, row after row in one block.
-class TARNKILN_TESTED NativeResultSet
+class NativeResultSet
 {
 public:
     /// \param instances  the search instances of the query.
@@ -22,7 +22,15 @@ public:
     {}
     NativeResultSet(NativeResultSet&&) = default;
     NativeResultSet& operator=(NativeResultSet&&) = delete;
-    ~NativeResultSet();
+    ~NativeResultSet()
+    {
+        for (std::size_t at = 0; at < m_cells.size(); ++at)
+        {
+            if (at + AHEAD < m_cells.size())
+                prefetch(m_cells[at + AHEAD].getImpl());
+            ModelElement const dropped(std::move(m_cells[at]));
+        }
+    }
 
     void reserve(std::size_t rows) { m_cells.reserve(rows * m_width); }
     /// Rows are given cell by cell.
