@@ -7,6 +7,7 @@
 
 #include <boost/date_time/posix_time/posix_time_types.hpp>
 
+#include <cmath>
 #include <limits>
 
 namespace testkit {
@@ -113,6 +114,78 @@ TYPED_TEST(ReflectiveValueOf, ComesBackWithARollback)
 
     EXPECT_EQ(get<TypeParam>(made, property), this->sample());
     EXPECT_FALSE(has(made, optional));
+}
+
+TYPED_TEST(ReflectiveValueOf, IsTheSameAgainWhereverTheTransactionStands)
+{
+    meta::Property const property = this->plain(u"p", meta::standardTypeOf<TypeParam>()).required();
+    ModelElement const made = this->make(this->book);
+    {
+        Transaction const transaction = this->model->beginTransaction(/*revertible=*/false);
+        set(made, property, this->sample());
+        EXPECT_EQ(get<TypeParam>(made, property), this->sample());
+        set(made, property, TypeParam());
+        set(made, property, this->sample());
+        transaction.commit();
+    }
+    EXPECT_EQ(get<TypeParam>(made, property), this->sample());
+    set(made, property, TypeParam());
+    EXPECT_EQ(get<TypeParam>(made, property), TypeParam());
+}
+
+TEST_F(ReflectiveValue, KeepsItsSign)
+{
+    meta::Property const small = plain(u"small", meta::StandardTypes::integer8Meta).required();
+    meta::Property const number = plain(u"number", meta::StandardTypes::integerMeta).required();
+    ModelElement const made = make(book);
+
+    set(made, small, static_cast<signed char>(-1));
+    set(made, number, -7);
+
+    EXPECT_EQ(get<signed char>(made, small), -1);
+    EXPECT_EQ(get<int>(made, number), -7);
+}
+
+TEST_F(ReflectiveValue, IsUnchangedByAnEqualOne)
+{
+    meta::Property const price = plain(u"price", meta::StandardTypes::realMeta).required();
+    ModelElement const made = make(book);
+    int calls = 0;
+    auto const setAlone = [&](double value) {
+        Transaction const transaction = begin();
+        transaction.addFirstChangeCallback([&] { ++calls; });
+        set(made, price, value);
+        transaction.commit();
+    };
+    setAlone(-0.0);
+    EXPECT_EQ(calls, 0) << "zero has two forms";
+    EXPECT_FALSE(std::signbit(get<double>(made, price)));
+
+    setAlone(2);
+    setAlone(2);
+    EXPECT_EQ(calls, 1);
+
+    setAlone(std::numeric_limits<double>::quiet_NaN());
+    setAlone(std::numeric_limits<double>::quiet_NaN());
+    EXPECT_EQ(calls, 3) << "what is no number equals nothing";
+}
+
+TEST_F(ReflectiveValue, IsReadWithTheMarksThatItWasSetWith)
+{
+    meta::Property const property = plain(u"p", meta::StandardTypes::integerMeta).required();
+    ModelElement const made = make(book);
+    Value marked(meta::StandardTypes::integerMeta, 3);
+    marked.setReflective();
+    marked.setUnmanaged();
+
+    setValue(made, property, marked);
+    EXPECT_TRUE(valueOf(made, property).isReflective());
+    EXPECT_FALSE(valueOf(made, property).isManaged());
+    EXPECT_EQ(get<int>(made, property), 3);
+
+    set(made, property, 4);
+    EXPECT_FALSE(valueOf(made, property).isReflective());
+    EXPECT_EQ(get<int>(made, property), 4);
 }
 
 TEST_F(ReflectiveValue, HoldsWhatIsSetForEnumerations)

@@ -32,13 +32,11 @@ void AbstractOwnedCollection::modifying()
 {
     if (!m_owner || !m_feature)
         return;
-    unsigned long const index = m_feature.index();
-    meta::Extension const extension =
-        index == 0 ? meta::Extension::cast(m_property) : meta::Extension();
-    if (extension)
-        m_owner->notifyModifying(extension);
-    else
-        m_owner->notifyModifying(index);
+    if (unsigned long const index = m_feature.index())
+        return m_owner->notifyModifying(index);
+    if (meta::Extension const extension = meta::Extension::cast(m_property))
+        return m_owner->notifyModifying(extension);
+    m_owner->notifyModifying(0);
 }
 
 namespace {

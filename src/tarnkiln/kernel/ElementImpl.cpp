@@ -98,7 +98,7 @@ ElementImpl::~ElementImpl() = default;
 
 void ElementImpl::removeRef()
 {
-    if (!isPermanent() && m_refCount.fetch_sub(1) == 1)
+    if (!isPermanent() && m_refCount.decrement())
         deleteThis();
 }
 
@@ -131,7 +131,7 @@ void ElementImpl::makePermanent()
     if (isPermanent())
         return;
     permanents->push_back(this);
-    m_refCount.fetch_add(1);  // for those who count on meanwhile
+    m_refCount.increment();  // for those who count on meanwhile
     m_isPermanent.store(true, std::memory_order_relaxed);
 }
 

@@ -6,6 +6,7 @@
 #include "tarnkiln/kernel/Fwd.h"
 #include "tarnkiln/kernel/Types.h"
 #include "tarnkiln/meta/Fwd.h"
+#include "tarnkiln/support/SharedCount.h"
 
 #include <atomic>
 #include <cstdint>
@@ -54,7 +55,7 @@ public:
     void addRef()
     {
         if (!isPermanent())
-            m_refCount.fetch_add(1);
+            m_refCount.increment();
     }
     /// The same as `removeRef`, without a call where nothing is counted.
     void release()
@@ -63,7 +64,7 @@ public:
             removeRef();
     }
     /// Of a permanent object: some count from before it became one.
-    std::uint32_t getRefCount() const { return m_refCount.load(); }
+    std::uint32_t getRefCount() const { return m_refCount.get(); }
 
     /// \name Permanent objects
     /// Types that all threads share are not counted: the count would be the one word that all of
@@ -98,7 +99,7 @@ protected:
     static InvalidateCallback m_callback;
 
     UUID m_uuid;
-    std::atomic<std::uint32_t> m_refCount{0};
+    support::SharedCount m_refCount;
     ElementValidity m_validity;
 
 private:

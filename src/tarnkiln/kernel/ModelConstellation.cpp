@@ -48,7 +48,7 @@ ModelConstellation::Impl::Impl()
 
 ModelConstellation::Impl::~Impl()
 {
-    m_refCount = REFCOUNT_DELETING;
+    m_refCount.set(REFCOUNT_DELETING);
     destroy();
 }
 
@@ -64,7 +64,7 @@ meta::Class const& ModelConstellation::Impl::getMetaClass() const
 
 void ModelConstellation::Impl::removeRef()
 {
-    if (m_refCount.fetch_sub(1) == 1 && !hasAliveModels())
+    if (m_refCount.decrement() && !hasAliveModels())
         delete this;
 }
 

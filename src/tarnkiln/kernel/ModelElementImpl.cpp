@@ -47,7 +47,8 @@ ModelElement::Impl::Impl(Model const& model, UUID const& id)
 
 ModelElement::Impl::~Impl()
 {
-    bool const isHeld = m_refCount.exchange(REFCOUNT_DELETING) != 0;
+    bool const isHeld = m_refCount.get() != 0;
+    m_refCount.set(REFCOUNT_DELETING);
     if (isHeld) // by an orchestrator: the constructor of a derived class has failed
         Builder::Orchestrator::constructionFailed(this);
     if (isProxy()) {

@@ -49,7 +49,7 @@ Model::Impl::Impl(UUID const& id, ModelConstellation const& constellation)
 
 Model::Impl::~Impl()
 {
-    m_refCount = REFCOUNT_DELETING;
+    m_refCount.set(REFCOUNT_DELETING);
     destroy();
     m_anchor.get()->modelIsGone();
 }
@@ -66,7 +66,7 @@ meta::Class const& Model::Impl::getMetaClass() const
 
 void Model::Impl::removeRef()
 {
-    if (m_refCount.fetch_sub(1) != 1)
+    if (!m_refCount.decrement())
         return;
     if (m_constellation)
         m_constellation->modelIsNotExternallyReferenced(this); // may delete this
@@ -164,7 +164,7 @@ void Model::Impl::elementModifying(ModelElement::Impl* element, unsigned long in
 {
     validateTransaction();
     m_anchor.get()->changed();
-    if (isRecording())
+    if (isRecording() && m_currentTransaction->isHeard())
         m_currentTransaction->elementModifying(element, index);
 }
 

@@ -89,7 +89,14 @@ public:
     /// \throws tarnkiln::messages::ModelFrozen        if the model is frozen.
     /// \throws tarnkiln::messages::NoOpenTransaction  if none is open and the model has a listener
     ///     or shares its constellation with others.
-    void validateTransaction() const;
+    void validateTransaction() const
+    {
+        if (!m_currentTransaction || m_freezeCount != 0)
+            refuseInvalidChange();
+    }
+    /// Whether a change that is made now could neither fail nor be heard of, kept or taken back;
+    /// then it need not be announced. Never so outside a transaction.
+    bool isChangedInSilence() const;
     void transactionEnded();
     internal::TransactionImpl* getCurrentTransaction() const { return m_currentTransaction; }
     AbstractTransactionFactoryImpl& getDefaultTransactionFactory() const;
@@ -342,6 +349,7 @@ private:
     void destroyElements(bool multiModel);
     Impl const* findNamedModel(internal::ModelName const* name) const;
     bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
+    void refuseInvalidChange() const;
 
     support::TopLevelElements m_topLevelElements; ///< Strong: keeps top-level elements alive.
     support::ElementRegistry m_elements;          ///< Everything the model holds, by UUID; weak.

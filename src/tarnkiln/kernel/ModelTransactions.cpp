@@ -90,7 +90,7 @@ void Model::Impl::unwatchedChangeEnded()
     checkInvariantsAtEnd();
 }
 
-void Model::Impl::validateTransaction() const
+void Model::Impl::refuseInvalidChange() const
 {
     if (m_validity == ElementValidity::ModelDestroying)
         return;
@@ -100,6 +100,12 @@ void Model::Impl::validateTransaction() const
         reportException(tarnkiln::messages::ModelFrozen());
     if (!m_currentTransaction && (isMultiModel() || hasListeners()))
         reportException(tarnkiln::messages::NoOpenTransaction());
+}
+
+bool Model::Impl::isChangedInSilence() const
+{
+    return m_currentTransaction && m_isFactoryLocal && m_freezeCount == 0 &&
+           m_currentTransaction->isSilent();
 }
 
 void Model::Impl::transactionEnded()

@@ -87,7 +87,7 @@ Value Value::createEmptyValue(meta::Type const& type, bool required)
     if (internal::classImpl(type))
     {
         Value result(ValueMeta(type), nullptr);
-        result.storeElement(ModelElement());
+        result.m_payload.store(ModelElement());
         return result;
     }
     auto const& registry = meta::PropertySerializerRegistry::getInstance();
@@ -239,9 +239,10 @@ void Value::failCast() const
     reportException(CannotCastIncompatibleTypes(qualifiedName(m_type)));
 }
 
-void Value::storeElement(ModelElement const& element)
+void Value::storeElement(ModelElement const& element, meta::Class const& required)
 {
     m_payload.store(element);
+    checkElement(required);
 }
 
 void Value::checkElement(meta::Class const& required) const

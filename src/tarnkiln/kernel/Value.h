@@ -199,7 +199,7 @@ private:
     static meta::Type typeOf(meta::Property const& property);
 
     [[noreturn]] void failCast() const;
-    void storeElement(ModelElement const& element);
+    void storeElement(ModelElement const& element, meta::Class const& required);
     void checkElement(meta::Class const& required) const;
     /// Null if there is no payload.
     ModelElement const* element() const;
@@ -226,10 +226,12 @@ Value::Value(meta::Type const& type, T const& payload)
     : Value(started(type), ValueFlags::Single, nullptr)
 {
     if constexpr (support::ElementReference<T>)
-        storeElement(payload);
+        storeElement(payload, T::metaClass());
     else
+    {
         support::ValueAccess<T>::store(*this, payload);
-    checkCompatible<T>();
+        checkCompatible<T>();
+    }
 }
 
 template <support::PlainPayload T>

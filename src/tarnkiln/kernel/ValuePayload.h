@@ -61,12 +61,19 @@ public:
     void* address() const { return m_data; }
     bool isOwned() const { return m_functions != nullptr; }
     template <class T> bool isOf() const;
+    bool isOf(Functions const& functions) const { return m_functions == &functions; }
 
     /// \name Filling one that holds nothing yet
     /// @{
     void share(void* object) { m_data = object; }
     template <class T> void setType();
     template <class T> void store(T const& object);
+    /// Makes it an object of a trivial type that begins with these bytes.
+    void storeBytes(Functions const& functions, void const* bytes, std::size_t size)
+    {
+        m_functions = &functions;
+        m_data = std::memcpy(m_place, bytes, size);
+    }
     /// @}
 
 private:

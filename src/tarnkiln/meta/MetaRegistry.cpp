@@ -50,7 +50,12 @@ MetaRegistry& MetaRegistry::getInstance()
 {
     if (MetaRegistry* const registry = startedRegistry.load(std::memory_order_acquire))
         return *registry;
+    return start();
+}
 
+/// Kept out of the way of those who find it started.
+[[gnu::noinline]] MetaRegistry& MetaRegistry::start()
+{
     std::lock_guard const lock(startUpMutex());
     if (startingRegistry)
         return *startingRegistry;

@@ -217,6 +217,7 @@ private:
     MetaRegistry();
     ~MetaRegistry();
 
+    static MetaRegistry& start();
     void initialize();
     /// Whether this thread holds a `LockedModel`.
     static bool isChangedHere();

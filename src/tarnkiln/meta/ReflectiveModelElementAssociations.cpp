@@ -37,7 +37,7 @@ bool isDying(ModelElement::Impl const& source, ModelElement const& target)
 void ReflectiveModelElementImpl::inverseAdd(ModelElement const& element,
                                             meta::Property const& property)
 {
-    ReflectiveSlot const* const slot = layout().find(property);
+    ReflectiveSlot const* const slot = getCells().layout().find(property);
     ModelElement const self(this);
     switch (slot ? slot->kind() : SlotKind::Other)
     {
@@ -70,7 +70,7 @@ void ReflectiveModelElementImpl::inverseAdd(ModelElement const& element,
 void ReflectiveModelElementImpl::inverseRemove(ModelElement const& element,
                                                meta::Property const& property)
 {
-    ReflectiveSlot const* const slot = layout().find(property);
+    ReflectiveSlot const* const slot = getCells().layout().find(property);
     ModelElement const self(this);
     switch (slot ? slot->kind() : SlotKind::Other)
     {
@@ -97,7 +97,7 @@ void ReflectiveModelElementImpl::inverseRemove(ModelElement const& element,
 bool ReflectiveModelElementImpl::inverseContainsProxyTo(ModelElement const& element,
                                                         meta::Property const& property) const
 {
-    ReflectiveSlot const* const slot = layout().find(property);
+    ReflectiveSlot const* const slot = getCells().layout().find(property);
     switch (slot ? slot->kind() : SlotKind::Other)
     {
     case SlotKind::References: {

@@ -30,15 +30,14 @@ ReflectiveModelElementImpl* ReflectiveModelElementImpl::createForProxy(Model con
     auto* const made = new (layout, sizeof(internal::StandIn))
         ReflectiveModelElementImpl(model, layout, ElementImpl::generateNewUuid());
     static_assert(alignof(internal::StandIn) <= alignof(ReflectiveCells));
-    made->offerRoom(reinterpret_cast<std::byte*>(&made->cells()) +
-                    ReflectiveCells::sizeFor(*layout.get()));
+    made->offerRoom(reinterpret_cast<std::byte*>(&made->cells()) + layout.get()->cellBytes());
     return made;
 }
 
 void* ReflectiveModelElementImpl::operator new(std::size_t size, LayoutHandle const& layout,
                                                std::size_t more)
 {
-    return ::operator new(size + ReflectiveCells::sizeFor(*layout.get()) + more);
+    return ::operator new(size + layout.get()->cellBytes() + more);
 }
 
 void ReflectiveModelElementImpl::operator delete(void* element, LayoutHandle const& /*layout*/,

@@ -15,6 +15,8 @@ class ReflectiveCells;
 class ReflectiveLayout;
 class ReflectiveSlot;
 class DependentCollections;
+struct ReflectiveCell;
+struct SlotFacts;
 }  // namespace internal
 
 /// An element whose class has no generated code; `ModelElement::createReflective` makes it.
@@ -148,6 +150,7 @@ private:
 
     using Layout = internal::ReflectiveLayout;
     using ReflectiveSlot = internal::ReflectiveSlot;
+    using SlotFacts = internal::SlotFacts;
 
     using LayoutHandle = support::CountedPointer<Layout const>;
 
@@ -166,6 +169,9 @@ private:
     /// The slot of a property that may be read; else null.
     ReflectiveSlot const* readableSlot(meta::Property const& property,
                                        ReflectionPrivateTag const& tag) const;
+    Value getOtherValue(ReflectiveSlot const& slot, internal::ReflectiveCell cell,
+                        ReflectionPrivateTag const& tag) const;
+    Value valueOf(ReflectiveSlot const& slot, ModelElement const& element) const;
     ModelElement::Impl* containerBy(ReflectiveSlot const& slot) const;
     ModelElement::Impl* basicTarget(ReflectiveSlot const& slot) const;
     void basicSetTarget(ReflectiveSlot const& slot, ModelElement const& target) const;
@@ -188,17 +194,19 @@ private:
     void leaveProxies(ReflectiveSlot const& slot, boost::optional<ProxyId>& cachedId);
 
     // Writing
-    ReflectiveSlot const* settableSlot(meta::Property const& property,
-                                       ReflectionPrivateTag const& tag) const;
-    void checkType(ReflectiveSlot const& slot, Value const& value) const;
-    bool isOfType(ReflectiveSlot const& slot, Value const& value) const;
+    static bool isOfType(ReflectiveSlot const& slot, SlotFacts const& facts, Value const& value);
+    static void checkType(ReflectiveSlot const& slot, Value const& value);
     void checkOwnKey(ReflectiveSlot const& slot, ModelElement const& target) const;
-    void setPlain(ReflectiveSlot const& slot, Value const& value);
-    void storePlain(ReflectiveSlot const& slot, Value const& value);
-    void setReference(ReflectiveSlot const& slot, ModelElement const& target);
-    void setContainer(ReflectiveSlot const& slot, ModelElement const& container);
-    void applyPlain(ReflectiveSlot const& slot, Value const& value);
-    void applyReference(ReflectiveSlot const& slot, ModelElement const& target);
-    void applyContainer(ReflectiveSlot const& slot, ModelElement const& container);
+    void setPlain(ReflectiveSlot const& slot, SlotFacts const& facts, Value const& value);
+    bool setWord(ReflectiveSlot const& slot, SlotFacts const& facts, Value const& value);
+    void storePlain(ReflectiveSlot const& slot, SlotFacts const& facts, Value const& value);
+    void setReference(ReflectiveSlot const& slot, SlotFacts const& facts,
+                      ModelElement const& target);
+    void setContainer(ReflectiveSlot const& slot, SlotFacts const& facts,
+                      ModelElement const& container);
+    void replace(ReflectiveSlot const& slot, internal::ReflectiveCell added);
+    void applyReference(ReflectiveSlot const& slot, SlotFacts const& facts,
+                        ModelElement const& target);
+    void applyContainer(SlotFacts const& facts, ModelElement const& container);
 };
 }  // namespace tarn::kiln

@@ -13,6 +13,7 @@
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
+#include "tarnkiln/meta/internal/PayloadAccess.h"
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 #include "tarnkiln/support/Field.h"
 
@@ -24,8 +25,9 @@ internal::ReflectiveSlot const*
 ReflectiveModelElementImpl::readableSlot(meta::Property const& property,
                                          ReflectionPrivateTag const& tag) const
 {
-    ReflectiveSlot const* const slot = layout().find(property);
-    return slot && layout().mayRead(*slot, tag) ? slot : nullptr;
+    Layout const& layout = getCells().layout();
+    ReflectiveSlot const* const slot = layout.find(property);
+    return slot && layout.mayRead(*slot, tag) ? slot : nullptr;
 }
 
 bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property,
@@ -60,27 +62,48 @@ bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property
 Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& property,
                                                    ReflectionPrivateTag const& tag) const
 {
-    ReflectiveSlot const* const slot = readableSlot(property, tag);
-    if (!slot)
+    Layout const& layout = getCells().layout();
+    ReflectiveSlot const* const slot = layout.find(property);
+    if (!slot || !layout.mayRead(*slot, tag))
         return ModelElement::Impl::getPropertyValue(
             property, meta::Extension::cast(property) ? tag : PUBLIC_ACCESS);
-    switch (slot->kind())
+    internal::ReflectiveCell const cell = getCells().get(*slot);
+    return slot->isWord(cell) ? slot->readWord(cell) : getOtherValue(*slot, cell, tag);
+}
+
+/// The value of a slot that is read in more steps than one. Apart, so that those which are not need
+/// not make room for them.
+Value ReflectiveModelElementImpl::getOtherValue(ReflectiveSlot const& slot,
+                                                internal::ReflectiveCell cell,
+                                                ReflectionPrivateTag const& tag) const
+{
+    meta::Property const& property = slot.property();
+    if (internal::isPlain(slot.kind()))
+        return slot.read(cell);
+    switch (slot.kind())
     {
     case SlotKind::Container:
-        return Value::createElementValue(property, ModelElement(containerBy(*slot)));
+        return valueOf(slot, ModelElement(containerBy(slot)));
     case SlotKind::Reference:
-        return Value::createElementValue(property, ModelElement(target(*slot, tag)));
+        return valueOf(slot, ModelElement(target(slot, tag)));
     case SlotKind::References: {
-        Value value = Value::createCollectionValue(property, &shown(*slot, tag));
+        Value value = Value::createCollectionValue(property, &shown(slot, tag));
         value.setReflective();
         return value;
     }
-    case SlotKind::Values:
-    case SlotKind::Annotations:
-        return Value::createCollectionValue(property, made(*slot));
     default:
-        return slot->read(cells().get(*slot));
+        return Value::createCollectionValue(property, made(slot));
     }
+}
+
+/// The value of a reference to `element`.
+Value ReflectiveModelElementImpl::valueOf(ReflectiveSlot const& slot,
+                                          ModelElement const& element) const
+{
+    SlotFacts const facts = layout().factsOf(slot);
+    return facts.isTypeKept && facts.isTypedByElements
+               ? support::PayloadAccess::makeOfElement(slot.type(), element)
+               : Value::createElementValue(slot.property(), element);
 }
 
 // ---------------------------------------------------------------------------- references
@@ -101,14 +124,14 @@ ModelElement::Impl* ReflectiveModelElementImpl::basicTarget(ReflectiveSlot const
 void ReflectiveModelElementImpl::basicSetTarget(ReflectiveSlot const& slot,
                                                 ModelElement const& target) const
 {
-    internal::ReflectiveCell const old = cells().get(slot);
+    ModelElement::Impl* const old = basicTarget(slot);
     internal::ReflectiveCell cell;
     cell.point(target.getImpl());
     if (target.getImpl())
         target.getImpl()->addRef();
     cells().set(slot, cell);
-    if (auto* const left = old.pointer<ModelElement::Impl>())
-        left->release();
+    if (old)
+        old->release();
 }
 
 ModelElement::Impl* ReflectiveModelElementImpl::target(ReflectiveSlot const& slot,

@@ -51,11 +51,19 @@ private:
     support::OpenStep m_step;  ///< Only where there is no transaction.
 };
 
-/// What a value holds whose type was found to suit.
-ModelElement elementOf(Value const& value)
+/// What a value holds whose type was found to suit; lies in the value.
+ModelElement const& elementOf(Value const& value)
 {
-    auto const* const held = support::PayloadAccess::get<ModelElement>(value);
-    return held ? *held : value.getValue<ModelElement>();
+    static ModelElement const none;
+    if (auto const* const held = support::PayloadAccess::get<ModelElement>(value))
+        return *held;
+    value.checkCompatible<ModelElement>();
+    return none;
+}
+
+bool hasOneValue(SlotKind kind)
+{
+    return kind != SlotKind::Values && kind != SlotKind::References;
 }
 }  // namespace
 
@@ -63,45 +71,39 @@ void ReflectiveModelElementImpl::setPropertyValue(meta::Property const& property
                                                   Value const& value,
                                                   ReflectionPrivateTag const& tag)
 {
-    ReflectiveSlot const* const slot = settableSlot(property, tag);
-    if (!slot)
+    Layout const& layout = getCells().layout();
+    ReflectiveSlot const* const slot = layout.find(property);
+    if (!slot || !hasOneValue(slot->kind()))
         return ModelElement::Impl::setPropertyValue(property, value, tag);
-    checkType(*slot, value);
+    SlotFacts const facts = layout.factsOf(*slot);
+    if (!facts.maySet(tag))
+        return ModelElement::Impl::setPropertyValue(property, value, tag);
+    if (!isOfType(*slot, facts, value))
+        checkType(*slot, value);
     if (isProxy())
         reportException(tarnkiln::messages::CannotModifyProxy());
     if (!isLive())
         return;
 
     if (internal::isPlain(slot->kind()))
-        return setPlain(*slot, value);
+        return setPlain(*slot, facts, value);
     ModelElement const self(this);
     switch (slot->kind())
     {
     case SlotKind::Container:
-        return setContainer(*slot, elementOf(value));
+        return setContainer(*slot, facts, elementOf(value));
     case SlotKind::Reference:
-        return setReference(*slot, elementOf(value));
+        return setReference(*slot, facts, elementOf(value));
     default:
         return static_cast<StringToStringMap*>(made(*slot))
             ->assign(value.getValue<StringToStringMap&>());
     }
 }
 
-/// The slot, if the element has the property, it is single, and `tag` allows to set it.
-internal::ReflectiveSlot const*
-ReflectiveModelElementImpl::settableSlot(meta::Property const& property,
-                                         ReflectionPrivateTag const& tag) const
-{
-    ReflectiveSlot const* const slot = layout().find(property);
-    bool const isSingle =
-        slot && slot->kind() != SlotKind::Values && slot->kind() != SlotKind::References;
-    return isSingle && layout().factsOf(*slot).maySet(tag) ? slot : nullptr;
-}
-
 /// Whether the value is just what the property holds; if not, `checkType` has more to ask.
-bool ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot, Value const& value) const
+bool ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot, SlotFacts const& facts,
+                                          Value const& value)
 {
-    internal::SlotFacts const facts = layout().factsOf(slot);
     bool const isShaped = value.getFlags() == ValueFlags::Single ||
                           (value.getFlags() == ValueFlags::OptionalSingle && !facts.isRequired);
     if (!facts.isTypeKept || !isShaped || value.getType() != slot.type())
@@ -115,10 +117,8 @@ bool ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot, Value cons
     return metaClass && metaClass->isA(slot.type());
 }
 
-void ReflectiveModelElementImpl::checkType(ReflectiveSlot const& slot, Value const& value) const
+void ReflectiveModelElementImpl::checkType(ReflectiveSlot const& slot, Value const& value)
 {
-    if (isOfType(slot, value))
-        return;
     meta::Property const& property = slot.property();
     meta::Type const type = property->getType();
     bool suits = false;
@@ -152,8 +152,6 @@ void ReflectiveModelElementImpl::checkType(ReflectiveSlot const& slot, Value con
 void ReflectiveModelElementImpl::checkOwnKey(ReflectiveSlot const& slot,
                                              ModelElement const& target) const
 {
-    if (!layout().factsOf(slot).opposite.isKeyed())
-        return;
     meta::Property const opposite = slot.property()->getOpposite();
     meta::Property const qualifier = opposite ? opposite->getQualifiedBy() : meta::Property();
     if (!qualifier || target->isProxy())
@@ -169,40 +167,63 @@ void ReflectiveModelElementImpl::checkOwnKey(ReflectiveSlot const& slot,
 
 // ---------------------------------------------------------------------------- plain values
 
-void ReflectiveModelElementImpl::setPlain(ReflectiveSlot const& slot, Value const& value)
+void ReflectiveModelElementImpl::setPlain(ReflectiveSlot const& slot, SlotFacts const& facts,
+                                          Value const& value)
 {
+    if (setWord(slot, facts, value))
+        return;
     if (value.getFlags() == ValueFlags::OptionalSingle && value.isAbsent())
-        storePlain(slot, Value::createEmptyValue(slot.property()));
+        storePlain(slot, facts, Value::createEmptyValue(slot.property()));
     else
-        storePlain(slot, value);
+        storePlain(slot, facts, value);
 }
 
-void ReflectiveModelElementImpl::storePlain(ReflectiveSlot const& slot, Value const& value)
+/// Stores a value that is kept as nothing but a word, and on which nothing else depends; the same
+/// as `storePlain` does, in fewer steps. False if the value is none.
+bool ReflectiveModelElementImpl::setWord(ReflectiveSlot const& slot, SlotFacts const& facts,
+                                         Value const& value)
+{
+    internal::ReflectiveCell added;
+    if (facts.isSetOnce || !slot.dependents().empty() || !slot.packWord(value, added) ||
+        meta::MetaRegistry::getInstance().hasOwnershipConverters())
+        return false;
+    internal::ReflectiveCell const present = cells().get(slot);
+    if (present.isPacked() ? slot.isSameWord(present, added) : slot.holds(present, value))
+        return true;
+    if (!getModelImpl()->isChangedInSilence())
+        notifyModifying(slot.index());
+    internal::ReflectiveCell const removed = cells().get(slot);
+    cells().set(slot, added);
+    if (!removed.isPacked())
+        slot.release(removed);
+    return true;
+}
+
+void ReflectiveModelElementImpl::storePlain(ReflectiveSlot const& slot, SlotFacts const& facts,
+                                            Value const& value)
 {
     meta::Property const& property = slot.property();
-    if (layout().factsOf(slot).isSetOnce &&
-        !slot.holds(cells().get(slot), Value::createEmptyValue(property)))
+    if (facts.isSetOnce && !slot.holds(cells().get(slot), Value::createEmptyValue(property)))
         reportException(tarnkiln::messages::CannotSetReadOnlyProperty(property->getName()));
     if (slot.holds(cells().get(slot), value))
         return;
     DependentCollections const dependents(*this, slot);
-    dependents.check(value);
     if (dependents.isEmpty())
     {
         notifyModifying(slot.index());
-        return applyPlain(slot, value);
+        return replace(slot, slot.keepOwn(value));
     }
+    dependents.check(value);
     ChangeOfSeveral change(*this);
     dependents.leave();
     notifyModifying(slot.index());
-    applyPlain(slot, value);
+    replace(slot, slot.keepOwn(value));
     dependents.enter();
     change.commit();
 }
 
-void ReflectiveModelElementImpl::applyPlain(ReflectiveSlot const& slot, Value const& value)
+void ReflectiveModelElementImpl::replace(ReflectiveSlot const& slot, internal::ReflectiveCell added)
 {
-    internal::ReflectiveCell const added = slot.keepOwn(value);
     internal::ReflectiveCell const removed = cells().get(slot);
     cells().set(slot, added);
     slot.release(removed);
@@ -210,36 +231,36 @@ void ReflectiveModelElementImpl::applyPlain(ReflectiveSlot const& slot, Value co
 
 // ---------------------------------------------------------------------------- references
 
-void ReflectiveModelElementImpl::setReference(ReflectiveSlot const& slot,
+void ReflectiveModelElementImpl::setReference(ReflectiveSlot const& slot, SlotFacts const& facts,
                                               ModelElement const& target)
 {
     meta::Property const& property = slot.property();
-    ModelElement const present(this->target(slot, PRIVILEGED_ACCESS));
-    if (target.getImpl() == present.getImpl())
+    ModelElement::Impl const* const present = this->target(slot, PRIVILEGED_ACCESS);
+    if (target.getImpl() == present)
         return;
-    if (property->isSetOnce() && present)
+    if (facts.isSetOnce && present && present->isLive())
         reportException(tarnkiln::messages::CannotSetReadOnlyProperty(property->getName()));
     DependentCollections const dependents(*this, slot);
     if (!dependents.isEmpty())
         dependents.check(Value::createElementValue(property, target));
     if (target)
     {
-        checkOwnKey(slot, target);
+        if (facts.isOppositeKeyed)
+            checkOwnKey(slot, target);
         checkCompatibleModel(target.getImpl(), property);
     }
 
     ChangeOfSeveral change(*this);
     dependents.leave();
     notifyModifying(slot.index());
-    applyReference(slot, target);
+    applyReference(slot, facts, target);
     dependents.enter();
     change.commit();
 }
 
-void ReflectiveModelElementImpl::applyReference(ReflectiveSlot const& slot,
+void ReflectiveModelElementImpl::applyReference(ReflectiveSlot const& slot, SlotFacts const& facts,
                                                 ModelElement const& target)
 {
-    internal::SlotFacts const facts = layout().factsOf(slot);
     ModelElement const removed(basicTarget(slot));
     if (removed && facts.opposite)
         _inverseRemoveThis(removed.getImpl(), facts.opposite);
@@ -254,14 +275,15 @@ void ReflectiveModelElementImpl::applyReference(ReflectiveSlot const& slot,
 
 // ---------------------------------------------------------------------------- container
 
-void ReflectiveModelElementImpl::setContainer(ReflectiveSlot const& slot,
+void ReflectiveModelElementImpl::setContainer(ReflectiveSlot const& slot, SlotFacts const& facts,
                                               ModelElement const& container)
 {
     meta::Property const& property = slot.property();
-    ModelElement::Impl* const present = containerBy(slot);
+    ModelElement::Impl* const present =
+        facts.opposite && getContainment() == facts.opposite ? basicContainer() : nullptr;
     if (container.getImpl() == present || (!container && !present))
         return;
-    if (property->isSetOnce() && present && present->isLive())
+    if (facts.isSetOnce && present && present->isLive())
         reportException(tarnkiln::messages::CannotSetReadOnlyProperty(property->getName()));
     DependentCollections const dependents(*this, slot);
     if (!dependents.isEmpty())
@@ -270,7 +292,8 @@ void ReflectiveModelElementImpl::setContainer(ReflectiveSlot const& slot,
     {
         if (container->isProxy())
             reportException(tarnkiln::messages::CannotModifyProxy());
-        checkOwnKey(slot, container);
+        if (facts.isOppositeKeyed)
+            checkOwnKey(slot, container);
         checkCircularContainment(container);
         if (container->getModelImpl() != getModelImpl())
             reportException(tarnkiln::messages::CannotChangeModel());
@@ -279,19 +302,18 @@ void ReflectiveModelElementImpl::setContainer(ReflectiveSlot const& slot,
     ChangeOfSeveral change(*this);
     dependents.leave();
     notifyModifying(slot.index());
-    applyContainer(slot, container);
+    applyContainer(facts, container);
     dependents.enter();
     change.commit();
 }
 
-void ReflectiveModelElementImpl::applyContainer(ReflectiveSlot const& slot,
+void ReflectiveModelElementImpl::applyContainer(SlotFacts const& facts,
                                                 ModelElement const& container)
 {
-    Feature const opposite = layout().factsOf(slot).opposite;
     makeUncontained();
     if (!container)
         return;
-    basicSetContainer(container.getImpl(), opposite, NO_INDEX);
-    _inverseAddThis(container.getImpl(), opposite, /*force=*/true);
+    basicSetContainer(container.getImpl(), facts.opposite, NO_INDEX);
+    _inverseAddThis(container.getImpl(), facts.opposite, /*force=*/true);
 }
 }  // namespace tarn::kiln

@@ -51,6 +51,11 @@ void setScalar(ModelElement::Impl& element, T& field, Slot const& slot,
     refuseProxy(element);
     if (value == field || !element.isLive())
         return;
+    if (std::is_nothrow_copy_assignable_v<T> && element.getModelImpl()->isChangedInSilence())
+    {
+        field = value;
+        return;
+    }
     JoiningTransaction transaction(element);
     element.notifyModifying(slot.index);
     field = value;

@@ -2,6 +2,7 @@
 /// What can be known of a model that may be gone.
 #pragma once
 #include "tarnkiln/kernel/Model.h"
+#include "tarnkiln/support/SharedCount.h"
 
 #include <atomic>
 #include <cstdint>
@@ -60,10 +61,10 @@ public:
     }
     /// @}
 
-    void addRef() { m_refCount.fetch_add(1); }
+    void addRef() { m_refCount.increment(); }
     void removeRef()
     {
-        if (m_refCount.fetch_sub(1) == 1)
+        if (m_refCount.decrement())
             delete this;
     }
 
@@ -75,6 +76,6 @@ private:
 
     Model::Impl* m_model;
     std::atomic<std::uint64_t> m_version{STEP};
-    std::atomic<std::uint32_t> m_refCount{0};
+    SharedCount m_refCount;
 };
 } // namespace tarn::kiln::support

@@ -83,7 +83,7 @@ TransactionImpl::~TransactionImpl()
 
 bool TransactionImpl::startRecording()
 {
-    if (has(ROLLED_BACK) || (m_listeners.empty() && !m_firstChangeCallback && !has(DEEP)))
+    if (has(ROLLED_BACK) || !isHeard())
         return false;
     if (has(CHANGES_PROHIBITED))
         reportException(tarnkiln::messages::ChangesProhibited());
@@ -293,6 +293,13 @@ void TransactionImpl::nestedCommitted()
         ++m_commitCount;
     else
         commit(boost::none);
+}
+
+bool TransactionImpl::isSilent() const
+{
+    constexpr unsigned LOUD = ROLLED_BACK | CHANGES_PROHIBITED | ROLL_BACK_ONLY | ENDED | DEEP;
+    return (m_flags & LOUD) == 0 && !isHeard() && m_handleCount > m_commitCount &&
+           !(m_group && m_group->isEnding());
 }
 
 void TransactionImpl::markRollBackOnly()

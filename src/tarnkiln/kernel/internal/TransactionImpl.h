@@ -100,6 +100,13 @@ public:
     bool hasEnded() const { return has(ENDED); }
     bool isDeep() const { return has(DEEP); }
     bool isRolledBack() const { return has(ROLLED_BACK); }
+    /// Whether it goes on whatever is changed now, and nobody would ever know.
+    bool isSilent() const;
+    /// Whether anybody would ever know of a change.
+    bool isHeard() const
+    {
+        return has(DEEP) || !m_listeners.empty() || m_firstChangeCallback != nullptr;
+    }
     bool isInStep() const { return m_model->isInStep(); }
     bool isProhibited() const { return has(CHANGES_PROHIBITED); }
     TransactionGroup* getGroup() const { return m_group; }

@@ -7,19 +7,16 @@
 
 namespace tarn::kiln::internal {
 
-DependentCollections::DependentCollections(ReflectiveModelElementImpl& element,
-                                           ReflectiveSlot const& slot)
-    : m_element(element),
-      m_slot(slot)
+void DependentCollections::find()
 {
-    for (std::uint16_t const number : slot.dependents())
+    for (std::uint16_t const number : m_slot.dependents())
     {
-        ReflectiveSlot const& reference = element.layout().slots()[number];
+        ReflectiveSlot const& reference = m_element.layout().slots()[number];
         meta::Property const opposite = reference.property()->getOpposite();
         // A reference that is its own key moves from one collection to another by itself.
-        if (&reference == &slot || !opposite)
+        if (&reference == &m_slot || !opposite)
             continue;
-        for (ModelElement const& holder : element.referred(reference))
+        for (ModelElement const& holder : m_element.referred(reference))
         {
             if (holder && !holder->isProxy())
                 m_holders.push_back({holder, opposite});
@@ -40,13 +37,13 @@ void DependentCollections::check(Value const& value) const
         ReflectiveModelElementImpl::checkUniqueness(holder.element, holder.collection, key);
 }
 
-void DependentCollections::leave() const
+void DependentCollections::leaveAll() const
 {
     for (Holder const& holder : m_holders)
         m_element._inverseRemoveThis(holder.element.getImpl(), holder.collection);
 }
 
-void DependentCollections::enter() const
+void DependentCollections::enterAll() const
 {
     for (Holder const& holder : m_holders)
         m_element._inverseAddThis(holder.element.getImpl(), holder.collection, /*force=*/true);

@@ -33,6 +33,8 @@ struct ReflectiveCell
     std::uint64_t word = 0;
     CellState state = CellState::Empty;
 
+    /// Whether it is a plain value whose payload the word tells.
+    bool isPacked() const { return state == CellState::Optional || state == CellState::Single; }
     template <class T> T* pointer() const { return reinterpret_cast<T*>(word); }
     void point(void* target) { word = reinterpret_cast<std::uint64_t>(target); }
 };

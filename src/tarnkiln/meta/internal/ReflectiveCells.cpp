@@ -13,16 +13,11 @@ namespace tarn::kiln::internal {
 static_assert(isInPlace(SlotKind::DateTime) && Packed<boost::posix_time::ptime>::IN_PLACE);
 static_assert(!isInPlace(SlotKind::Uuid) && !Packed<UUID>::IN_PLACE);
 
-std::size_t ReflectiveCells::sizeFor(ReflectiveLayout const& layout)
-{
-    return sizeof(ReflectiveCells) + bytesForStates(layout) +
-           layout.cellCount() * sizeof(std::uint64_t);
-}
-
 ReflectiveCells* ReflectiveCells::create(void* place, ReflectiveLayout::Handle const& layout)
 {
     auto* const cells = new (place) ReflectiveCells(layout);
-    std::memset(static_cast<void*>(cells + 1), 0, sizeFor(*layout.get()) - sizeof(ReflectiveCells));
+    std::memset(static_cast<void*>(cells + 1), 0,
+                layout.get()->cellBytes() - sizeof(ReflectiveCells));
     return cells;
 }
 
@@ -44,7 +39,7 @@ void ReflectiveCells::destroy()
 
 AbstractOwnedCollection* ReflectiveCells::getCollection(ReflectiveSlot const& slot) const
 {
-    std::uint64_t& word = const_cast<ReflectiveCells*>(this)->words()[slot.cell()];
+    auto& word = const_cast<ReflectiveCells*>(this)->word(slot);
     return reinterpret_cast<AbstractOwnedCollection*>(
         std::atomic_ref(word).load(std::memory_order_acquire));
 }
@@ -53,16 +48,15 @@ AbstractOwnedCollection* ReflectiveCells::publish(ReflectiveSlot const& slot,
                                                   std::unique_ptr<AbstractOwnedCollection> made)
 {
     std::uint64_t present = 0;
-    auto const word = reinterpret_cast<std::uint64_t>(made.get());
-    std::atomic_ref entry(words()[slot.cell()]);
-    if (!entry.compare_exchange_strong(present, word, std::memory_order_acq_rel))
+    std::atomic_ref entry(word(slot));
+    if (!entry.compare_exchange_strong(present, reinterpret_cast<std::uint64_t>(made.get()),
+                                       std::memory_order_acq_rel))
         return reinterpret_cast<AbstractOwnedCollection*>(present);
     return made.release();
 }
 
 bool ReflectiveCells::markLoaded(ReflectiveSlot const& slot)
 {
-    std::atomic_ref state(states()[slot.cell()]);
-    return state.exchange(CellState::Loaded) != CellState::Loaded;
+    return std::atomic_ref(state(slot)).exchange(CellState::Loaded) != CellState::Loaded;
 }
 }  // namespace tarn::kiln::internal

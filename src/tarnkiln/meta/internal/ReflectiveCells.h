@@ -17,11 +17,9 @@ namespace tarn::kiln::internal {
 class ReflectiveCells
 {
 public:
-    /// In bytes.
-    static std::size_t sizeFor(ReflectiveLayout const& layout);
     /// All cells are empty.
     ///
-    /// \param place  of the size for the layout.
+    /// \param place  of the size that the layout asks for.
     static ReflectiveCells* create(void* place, ReflectiveLayout::Handle const& layout);
     /// Frees what the cells hold, and not the place.
     void destroy();
@@ -33,20 +31,23 @@ public:
     ReflectiveLayout::Handle const& layoutHandle() const { return m_layout; }
 
     /// Of a slot that has a cell, as in all that follows.
-    ReflectiveCell get(ReflectiveSlot const& slot) const
-    {
-        return {words()[slot.cell()], states()[slot.cell()]};
-    }
+    ReflectiveCell get(ReflectiveSlot const& slot) const { return {word(slot), state(slot)}; }
     /// \name Where the two lie: in all elements of the layout as far behind where these begin
     /// @{
-    std::uint64_t const& word(ReflectiveSlot const& slot) const { return words()[slot.cell()]; }
-    CellState const& state(ReflectiveSlot const& slot) const { return states()[slot.cell()]; }
+    std::uint64_t const& word(ReflectiveSlot const& slot) const
+    {
+        return const_cast<ReflectiveCells*>(this)->word(slot);
+    }
+    CellState const& state(ReflectiveSlot const& slot) const
+    {
+        return const_cast<ReflectiveCells*>(this)->state(slot);
+    }
     /// @}
     /// Frees nothing of what was there.
     void set(ReflectiveSlot const& slot, ReflectiveCell cell)
     {
-        words()[slot.cell()] = cell.word;
-        states()[slot.cell()] = cell.state;
+        word(slot) = cell.word;
+        state(slot) = cell.state;
     }
     /// The collection of the slot; null while there is none.
     AbstractOwnedCollection* getCollection(ReflectiveSlot const& slot) const;
@@ -60,21 +61,17 @@ private:
     explicit ReflectiveCells(ReflectiveLayout::Handle const& layout) : m_layout(layout) {}
     ~ReflectiveCells() = default;
 
-    CellState* states() { return reinterpret_cast<CellState*>(this + 1); }
-    CellState const* states() const { return reinterpret_cast<CellState const*>(this + 1); }
-    std::uint64_t* words()
+    std::byte* at(std::size_t place) { return reinterpret_cast<std::byte*>(this) + place; }
+    std::uint64_t& word(ReflectiveSlot const& slot)
     {
-        return reinterpret_cast<std::uint64_t*>(states() + bytesForStates(layout()));
+        return *reinterpret_cast<std::uint64_t*>(at(slot.wordAt()));
     }
-    std::uint64_t const* words() const { return const_cast<ReflectiveCells*>(this)->words(); }
-    /// Up to where words may lie.
-    static std::size_t bytesForStates(ReflectiveLayout const& layout)
+    CellState& state(ReflectiveSlot const& slot)
     {
-        constexpr std::size_t WORD = sizeof(std::uint64_t);
-        return (layout.cellCount() * sizeof(CellState) + WORD - 1) / WORD * WORD;
+        return *reinterpret_cast<CellState*>(at(slot.stateAt()));
     }
 
     ReflectiveLayout::Handle const m_layout;
 };
-static_assert(sizeof(ReflectiveCells) % alignof(std::uint64_t) == 0);
+static_assert(sizeof(ReflectiveCells) == ReflectiveLayout::CELLS_AT);
 }  // namespace tarn::kiln::internal

@@ -141,13 +141,27 @@ void ReflectiveLayout::addSlots(meta::Class const& owner)
 
 void ReflectiveLayout::numberSlots()
 {
-    TARNKILN_ASSERT(m_slots.size() < NONE, "a class has fewer properties", m_slots.size());
+    TARNKILN_ASSERT(m_slots.size() <= std::numeric_limits<std::uint16_t>::max(),
+                    "a class has fewer properties", m_slots.size());
+    auto const hasCell = [](ReflectiveSlot const& slot) {
+        return slot.kind() != SlotKind::Container;
+    };
+    constexpr std::size_t WORD = sizeof(std::uint64_t);
+    auto const cells = std::count_if(m_slots.begin(), m_slots.end(), hasCell);
+    std::size_t stateAt = CELLS_AT;
+    std::size_t wordAt = CELLS_AT + (static_cast<std::size_t>(cells) + WORD - 1) / WORD * WORD;
     for (std::size_t number = 0; number < m_slots.size(); ++number)
     {
-        m_slots[number].setPlaces(number, m_cellCount);
-        if (m_slots[number].kind() != SlotKind::Container)
-            ++m_cellCount;
+        if (!hasCell(m_slots[number]))
+        {
+            m_slots[number].setPlaces(number, 0, 0);
+            continue;
+        }
+        m_slots[number].setPlaces(number, wordAt, stateAt);
+        stateAt += sizeof(CellState);
+        wordAt += WORD;
     }
+    m_cellBytes = wordAt;
 }
 
 /// Enters each slot whose opposite is qualified by a property of the class with that property.
@@ -171,15 +185,15 @@ void ReflectiveLayout::buildIndex()
     std::size_t size = 4;
     while (size < 2 * m_slots.size())
         size *= 2;
-    m_index.assign(size, NONE);
+    m_index.resize(size);
     m_indexMask = size - 1;
-    for (std::size_t number = 0; number < m_slots.size(); ++number)
+    for (ReflectiveSlot const& slot : m_slots)
     {
-        std::size_t place = hash(m_slots[number].property().getImpl());
-        while (m_index[place] != NONE)
+        std::size_t place = hash(slot.property().getImpl());
+        while (m_index[place].slot)
             place = (place + 1) & m_indexMask;
-        m_index[place] = static_cast<std::uint16_t>(number);
-        m_slotsByIndex.push_back(&m_slots[number]);
+        m_index[place] = {slot.property().getImpl(), &slot};
+        m_slotsByIndex.push_back(&slot);
     }
     std::stable_sort(m_slotsByIndex.begin(), m_slotsByIndex.end(),
                      [](ReflectiveSlot const* left, ReflectiveSlot const* right) {

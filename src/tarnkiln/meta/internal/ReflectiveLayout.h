@@ -8,6 +8,7 @@
 #include "tarnkiln/meta/internal/SlotFacts.h"
 #include "tarnkiln/support/CountedPointer.h"
 #include "tarnkiln/support/ModelAnchor.h"
+#include "tarnkiln/support/SharedCount.h"
 
 #include <atomic>
 #include <cstddef>
@@ -27,6 +28,9 @@ class ReflectiveLayout
 public:
     using Handle = support::CountedPointer<ReflectiveLayout const>;
 
+    /// The link to the layout goes before the cells of an element.
+    static constexpr std::size_t CELLS_AT = sizeof(void*);
+
     /// The layout for new elements of `metaClass`.
     ///
     /// \throws tarnkiln::messages::CannotUsePropertyWithoutType, UnsupportedQualification,
@@ -38,19 +42,15 @@ public:
 
     meta::Class const& getMetaClass() const { return m_metaClass; }
     std::vector<ReflectiveSlot> const& slots() const { return m_slots; }
-    std::size_t cellCount() const { return m_cellCount; }
+    /// What the cells of an element take, the link to this included.
+    std::size_t cellBytes() const { return m_cellBytes; }
     /// Null if the property has no slot.
     ReflectiveSlot const* find(meta::Property::Impl const* property) const
     {
         std::size_t place = hash(property);
-        while (m_index[place] != NONE)
-        {
-            ReflectiveSlot const& slot = m_slots[m_index[place]];
-            if (slot.property().getImpl() == property)
-                return &slot;
+        while (m_index[place].slot && m_index[place].property != property)
             place = (place + 1) & m_indexMask;
-        }
-        return nullptr;
+        return m_index[place].slot;
     }
     ReflectiveSlot const* find(meta::Property const& property) const
     {
@@ -76,16 +76,19 @@ public:
     /// The slots of the change records of elements.
     unsigned long getRecordSize() const { return m_recordSize; }
 
-    void addRef() const { m_refCount.fetch_add(1, std::memory_order_relaxed); }
+    void addRef() const { m_refCount.increment(); }
     void removeRef() const
     {
-        if (m_refCount.fetch_sub(1, std::memory_order_acq_rel) == 1)
+        if (m_refCount.decrement())
             delete this;
     }
 
 private:
-    static constexpr std::uint16_t NONE = 0xFFFF;
-
+    struct IndexEntry
+    {
+        meta::Property::Impl const* property = nullptr;
+        ReflectiveSlot const* slot = nullptr;
+    };
     /// The facts of all slots, and the version of the models for which they hold.
     struct Known
     {
@@ -143,14 +146,14 @@ private:
     std::vector<ModelElement> m_pins;    ///< Keeps what the facts point to from being another one.
     std::vector<ReflectiveSlot> m_slots;
     std::vector<ReflectiveSlot const*> m_slotsByIndex;
-    std::vector<std::uint16_t> m_index;  ///< Slot numbers, hashed by the address of the property.
+    std::vector<IndexEntry> m_index;  ///< Hashed by the address of the property.
     std::size_t m_indexMask = 0;
-    std::size_t m_cellCount = 0;
+    std::size_t m_cellBytes = 0;
     unsigned long m_recordSize = 0;
     std::vector<support::CountedPointer<support::ModelAnchor>> m_models;  ///< Of all of the above.
     support::ModelAnchor const* m_onlyModel = nullptr;  ///< Of `m_models`, if it is one.
     mutable std::atomic<std::uint64_t> m_currentVersion{0};  ///< When the facts were last the same.
     mutable std::atomic<Known const*> m_known{nullptr};
-    mutable std::atomic<std::uint32_t> m_refCount{0};
+    mutable support::SharedCount m_refCount;
 };
 }  // namespace tarn::kiln::internal

@@ -10,6 +10,7 @@
 #include "tarnkiln/meta/internal/PayloadAccess.h"
 #include "tarnkiln/support/ValueAccess.h"
 
+#include <bit>
 #include <exception>
 
 namespace tarn::kiln::internal {
@@ -78,6 +79,7 @@ ReflectiveSlot::ReflectiveSlot(meta::Property const& property)
         makeCollection(nullptr);  // fails now if it ever would
     if (!isPlain(m_kind))
         return;
+    findWordPayload();
     Value const initial = initialValueOf(property);
     if (property->getLower() != 1)
         m_empty = emptyValueOf(property);
@@ -91,10 +93,29 @@ ReflectiveSlot::ReflectiveSlot(meta::Property const& property)
         m_initialCell = cell;
 }
 
-void ReflectiveSlot::setPlaces(std::size_t number, std::size_t cell)
+void ReflectiveSlot::setPlaces(std::size_t number, std::size_t wordAt, std::size_t stateAt)
 {
     m_number = static_cast<std::uint16_t>(number);
-    m_cell = static_cast<std::uint16_t>(cell);
+    m_wordAt = static_cast<std::uint32_t>(wordAt);
+    m_stateAt = static_cast<std::uint32_t>(stateAt);
+}
+
+/// The number of a literal is none of these: what values carry it as depends on its type.
+void ReflectiveSlot::findWordPayload()
+{
+    if (m_kind >= SlotKind::Enumeration)
+        return;
+    withPayloadType(m_kind, [this]<class T>() {
+        if constexpr (Packed<T>::IN_PLACE)
+        {
+            using Payload = support::PayloadOf<T>;
+            static_assert(Payload::FUNCTIONS.isTrivial);
+            m_wordPayload = &Payload::FUNCTIONS;
+            // Payloads lie in the first bytes, which are the low ones.
+            static_assert(std::endian::native == std::endian::little);
+            m_wordMask = ~std::uint64_t{0} >> (8 * (sizeof m_wordMask - sizeof(T)));
+        }
+    });
 }
 
 /// Whether nothing but the property decides what elements start with: the value of a text may
@@ -137,8 +158,19 @@ bool ReflectiveSlot::isPackable(Value const& value) const
            });
 }
 
+bool ReflectiveSlot::isSameWord(ReflectiveCell left, ReflectiveCell right) const
+{
+    if (left.state != right.state)
+        return false;
+    if (m_kind == SlotKind::Real)  // zero has two forms, and what is no number equals nothing
+        return Packed<double>::unpack(left.word) == Packed<double>::unpack(right.word);
+    return left.word == right.word;
+}
+
 Value ReflectiveSlot::read(ReflectiveCell cell) const
 {
+    if (isWord(cell))
+        return readWord(cell);
     if (cell.state == CellState::Empty)
         return *m_empty;
     if (cell.state == CellState::Boxed)
@@ -214,8 +246,7 @@ Value ReflectiveSlot::asRequired(Value const& value) const
 
 bool ReflectiveSlot::holds(ReflectiveCell cell, Value const& value) const
 {
-    bool const isPacked = cell.state == CellState::Single || cell.state == CellState::Optional;
-    if (!isPacked || !isPackable(value))
+    if (!cell.isPacked() || !isPackable(value))
         return read(cell) == value;
     bool const isSingle = value.getFlags() == ValueFlags::Single;
     return isSingle == (cell.state == CellState::Single) && withPayloadType(m_kind, [&]<class T>() {

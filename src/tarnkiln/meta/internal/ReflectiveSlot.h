@@ -4,6 +4,7 @@
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/meta/Property.h"
 #include "tarnkiln/meta/Type.h"
+#include "tarnkiln/meta/internal/PayloadAccess.h"
 #include "tarnkiln/meta/internal/ReferenceCollectionRecipe.h"
 #include "tarnkiln/meta/internal/ReflectiveCell.h"
 #include "tarnkiln/meta/internal/SlotKind.h"
@@ -11,6 +12,7 @@
 #include <boost/optional.hpp>
 
 #include <cstdint>
+#include <cstring>
 #include <memory>
 #include <vector>
 
@@ -37,10 +39,11 @@ public:
     SlotKind kind() const { return m_kind; }
     /// Its place among the slots of its layout.
     std::uint16_t number() const { return m_number; }
-    /// Its place among the cells of an element; containers, which the element's link tells, have
-    /// none.
-    std::uint16_t cell() const { return m_cell; }
-    void setPlaces(std::size_t number, std::size_t cell);
+    /// Where the word and the state of its cell lie, in bytes from the `ReflectiveCells` of an
+    /// element. Containers, which the element's link tells, have no cell; theirs are 0.
+    std::size_t wordAt() const { return m_wordAt; }
+    std::size_t stateAt() const { return m_stateAt; }
+    void setPlaces(std::size_t number, std::size_t wordAt, std::size_t stateAt);
     /// The slot in change records: the property's index; `NO_INDEX` for -1.
     unsigned long index() const { return m_index; }
     /// The slots whose elements keep this element by the key that is this slot's value.
@@ -56,6 +59,33 @@ public:
     /// @{
     /// The same value as was kept.
     Value read(ReflectiveCell cell) const;
+    /// Whether all there is to the value is its payload, as the word of the cell.
+    bool isWord(ReflectiveCell cell) const { return m_wordPayload && cell.isPacked(); }
+    /// As `read`, of such a cell.
+    Value readWord(ReflectiveCell cell) const
+    {
+        auto const flags =
+            cell.state == CellState::Single ? ValueFlags::Single : ValueFlags::OptionalSingle;
+        return support::PayloadAccess::makeOfWord(m_type, flags, *m_wordPayload, cell.word);
+    }
+    /// Whether the cell of `value` would be such a one, which `cell` becomes then.
+    bool packWord(Value const& value, ReflectiveCell& cell) const
+    {
+        ValueFlags const flags = value.getFlags();
+        bool const isShaped = flags == ValueFlags::Single || flags == ValueFlags::OptionalSingle;
+        if (!m_wordPayload || !isShaped || value.isReflective() || !value.isManaged() ||
+            value.getType() != m_type)
+            return false;
+        void const* const payload = support::PayloadAccess::ofKind(value, *m_wordPayload);
+        if (!payload)
+            return false;
+        std::memcpy(&cell.word, payload, sizeof cell.word);
+        cell.word &= m_wordMask;
+        cell.state = flags == ValueFlags::Single ? CellState::Single : CellState::Optional;
+        return true;
+    }
+    /// Whether two cells that `packWord` could have made hold equal payloads in the same shape.
+    bool isSameWord(ReflectiveCell left, ReflectiveCell right) const;
     /// A copy of `value` as cells hold it.
     ReflectiveCell keep(Value const& value) const;
     /// The same of what the ownership converter makes of `value`.
@@ -82,6 +112,7 @@ private:
     bool isEmpty(Value const& value) const;
     bool isPackable(Value const& value) const;
     bool isInitialShared() const;
+    void findWordPayload();
     bool owns(ReflectiveCell cell) const;
     void free(ReflectiveCell cell) const noexcept;
     ReflectiveCell copyPlain(ReflectiveCell cell) const;
@@ -91,7 +122,11 @@ private:
     meta::Property m_oppositeQualifier;
     SlotKind m_kind;
     std::uint16_t m_number = 0;
-    std::uint16_t m_cell = 0;
+    std::uint32_t m_wordAt = 0;
+    std::uint32_t m_stateAt = 0;
+    std::uint64_t m_wordMask = 0;  ///< The bits of a word that the payload takes.
+    /// What values do with the payload; null unless it lies in the word and is nothing but bytes.
+    ValuePayload::Functions const* m_wordPayload = nullptr;
     unsigned long m_index;
     boost::optional<ReferenceCollectionRecipe> m_recipe;  ///< Of `References`.
     boost::optional<Value> m_empty;  ///< What `CellState::Empty` stands for; optional values only.

@@ -12,6 +12,7 @@ SlotFacts::SlotFacts(meta::Class const& metaClass, ReflectiveSlot const& slot)
       isComposite(Feature(slot.property()).isComposite()),
       opposite(Feature(slot.property()).opposite())
 {
+    isOppositeKeyed = opposite.isKeyed();
     meta::Property const& property = slot.property();
     if (!isOfClass)
         return;
@@ -22,6 +23,8 @@ SlotFacts::SlotFacts(meta::Class const& metaClass, ReflectiveSlot const& slot)
     isRequired = property->getLower() == 1;
     meta::Type const type = property->getType();
     isTypeKept = type && type == slot.type();
-    isTypedByClass = type && classImpl(type);
+    auto const* const metaType = type ? classImpl(type) : nullptr;
+    isTypedByClass = metaType != nullptr;
+    isTypedByElements = metaType && metaType->isA(ModelElement::metaClass());
 }
 }  // namespace tarn::kiln::internal

@@ -31,6 +31,8 @@ struct SlotFacts
     bool isRequired = false;      ///< The lower bound is 1.
     bool isTypeKept = false;      ///< The type is live and still that of the slot.
     bool isTypedByClass = false;  ///< By a live one.
+    bool isTypedByElements = false;  ///< By one that is or extends the class of all elements.
+    bool isOppositeKeyed;
     bool isComposite;             ///< As a `Feature` of a dead property, this and the next are empty.
     Feature opposite;
 };
