@@ -467,7 +467,9 @@ std::vector<ModelElement> Model::Impl::getElementsInOrder() const
 
 void Model::Impl::convertAllReferencesToProxies(bool multiModel)
 {
-    for (ModelElement const& element : getElementsInOrder()) {
+    std::vector<ModelElement> elements = getElementsInOrder();
+    for (ModelElement& next : elements) {
+        ModelElement const element = std::move(next); // let go while it is at hand
         boost::optional<ProxyId> proxyId;
         element->convertReferencesToProxies(multiModel, proxyId);
     }
