@@ -7,6 +7,7 @@
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 
 #include <algorithm>
+#include <ranges>
 
 namespace tarn::kiln {
 
@@ -15,17 +16,12 @@ using internal::SlotKind;
 
 namespace {
 
-bool holdsElements(internal::ReflectiveSlot const& slot)
+/// The slots of references that are not empty and of collections that are there.
+auto usedReferences(internal::ReflectiveCells const& cells)
 {
-    return slot.kind() == SlotKind::Reference || slot.kind() == SlotKind::References;
-}
-
-/// Whether it is a reference that is not empty, or a collection of references that is there.
-inline bool isInUse(internal::ReflectiveCells const& cells, internal::ReflectiveSlot const& slot)
-{
-    return holdsElements(slot) &&
-           (slot.kind() == SlotKind::Reference ? cells.get(slot).word != 0
-                                               : cells.getCollection(slot) != nullptr);
+    return cells.layout().references() |
+           std::views::filter(
+               [&cells](internal::ReflectiveSlot const* slot) { return cells.word(*slot) != 0; });
 }
 
 bool isDying(ModelElement::Impl const& source, ModelElement const& target)
@@ -123,16 +119,16 @@ bool ReflectiveModelElementImpl::inverseContainsProxyTo(ModelElement const& elem
 /// Collections that keep this element by a reference go first, while that still tells the key.
 void ReflectiveModelElementImpl::disassociateIncoming()
 {
-    for (ReflectiveSlot const& slot : layout().slots())
+    Layout const& layout = getCells().layout();
+    for (ReflectiveSlot const* const slot : layout.references())
     {
-        if (slot.kind() == SlotKind::Reference && !slot.dependents().empty())
-            DependentCollections(*this, slot).leave();
+        if (slot->kind() == SlotKind::Reference && !slot->dependents().empty())
+            DependentCollections(*this, *slot).leave();
     }
-    for (ReflectiveSlot const& slot : layout().slots())
+    for (ReflectiveSlot const* const used : usedReferences(getCells()))
     {
-        if (!isInUse(getCells(), slot))
-            continue;
-        internal::SlotFacts const facts = layout().factsOf(slot);
+        ReflectiveSlot const& slot = *used;
+        internal::SlotFacts const facts = layout.factsOf(slot);
         if (facts.isComposite || !facts.opposite)
             continue;
         auto const leave = [&](ModelElement const& target) {
@@ -161,11 +157,10 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
     auto const destroyChild = [&](ModelElement const& child) {
         child->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
     };
-    for (ReflectiveSlot const& slot : layout().slots())
+    for (ReflectiveSlot const* const used : usedReferences(getCells()))
     {
-        if (!isInUse(getCells(), slot))
-            continue;
-        bool const isComposite = layout().factsOf(slot).isComposite;
+        ReflectiveSlot const& slot = *used;
+        bool const isComposite = getCells().layout().factsOf(slot).isComposite;
         if (slot.kind() == SlotKind::Reference)
         {
             if (isComposite)
@@ -186,17 +181,17 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
 void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
                                                             boost::optional<ProxyId>& cachedId)
 {
-    internal::ReflectiveCells& own = cells();
-    for (ReflectiveSlot const& slot : own.layout().slots())
+    for (ReflectiveSlot const* const used : usedReferences(getCells()))
     {
-        if (!isInUse(own, slot) || own.layout().factsOf(slot).isComposite)
+        ReflectiveSlot const& slot = *used;
+        if (getCells().layout().factsOf(slot).isComposite)
             continue;
         if (multiModel)
             leaveProxies(slot, cachedId);
         if (slot.kind() == SlotKind::Reference)
             basicSetTarget(slot, ModelElement());
         else
-            _basicClear(static_cast<ReferenceCollection*>(own.getCollection(slot)));
+            _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
     }
 }
 

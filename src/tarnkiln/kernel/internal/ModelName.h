@@ -4,8 +4,8 @@
 #include "tarnkiln/kernel/Model.h"
 #include "tarnkiln/kernel/Types.h"
 #include "tarnkiln/support/CountedPointer.h"
+#include "tarnkiln/support/SharedCount.h"
 
-#include <atomic>
 #include <cstddef>
 #include <cstdint>
 #include <utility>
@@ -45,10 +45,10 @@ public:
     }
     /// @}
 
-    void addRef() const { m_refCount.fetch_add(1, std::memory_order_relaxed); }
+    void addRef() const { m_refCount.increment(); }
     void removeRef() const
     {
-        if (m_refCount.fetch_sub(1, std::memory_order_acq_rel) == 1)
+        if (m_refCount.decrement())
             delete this;
     }
 
@@ -59,7 +59,7 @@ private:
     mutable Model::Impl const* m_asker = nullptr;
     mutable Model::Impl const* m_model = nullptr;
     mutable std::uint64_t m_version = 0;
-    mutable std::atomic<std::uint32_t> m_refCount{0};
+    mutable support::SharedCount m_refCount;
 };
 
 /// The names that were used last, so that equal ones are shared.

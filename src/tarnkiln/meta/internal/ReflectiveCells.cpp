@@ -26,13 +26,11 @@ void ReflectiveCells::destroy()
     bool const isTold = meta::MetaRegistry::getInstance().hasOwnershipConverters();
     for (ReflectiveSlot const& slot : layout().slots())
     {
-        if (slot.kind() == SlotKind::Container)
+        bool const ownsNothing =
+            word(slot) == 0 || (isInPlace(slot.kind()) && state(slot) != CellState::Boxed);
+        if ((ownsNothing && !isTold) || slot.kind() == SlotKind::Container)
             continue;
-        ReflectiveCell const cell = get(slot);
-        bool const isBehind =
-            cell.word != 0 && (!isInPlace(slot.kind()) || cell.state == CellState::Boxed);
-        if (isBehind || isTold)
-            slot.release(cell);
+        slot.release(get(slot));
     }
     this->~ReflectiveCells();
 }

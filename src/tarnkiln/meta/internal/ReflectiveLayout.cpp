@@ -56,6 +56,7 @@ ReflectiveLayout::ReflectiveLayout(meta::Class const& metaClass) : m_metaClass(m
             m_recordSize = std::max(m_recordSize, slot.index() + 1);
     }
     numberSlots();
+    listReferences();
     tieDependents();
     buildIndex();
     listModels();
@@ -162,6 +163,15 @@ void ReflectiveLayout::numberSlots()
         wordAt += WORD;
     }
     m_cellBytes = wordAt;
+}
+
+void ReflectiveLayout::listReferences()
+{
+    for (ReflectiveSlot const& slot : m_slots)
+    {
+        if (slot.kind() == SlotKind::Reference || slot.kind() == SlotKind::References)
+            m_references.push_back(&slot);
+    }
 }
 
 /// Enters each slot whose opposite is qualified by a property of the class with that property.

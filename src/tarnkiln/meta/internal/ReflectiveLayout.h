@@ -42,6 +42,8 @@ public:
 
     meta::Class const& getMetaClass() const { return m_metaClass; }
     std::vector<ReflectiveSlot> const& slots() const { return m_slots; }
+    /// Those of them that refer to elements, one or many: all but the references to containers.
+    std::vector<ReflectiveSlot const*> const& references() const { return m_references; }
     /// What the cells of an element take, the link to this included.
     std::size_t cellBytes() const { return m_cellBytes; }
     /// Null if the property has no slot.
@@ -132,6 +134,7 @@ private:
     bool isOnChain(meta::Class::Impl const* metaClass) const;
     void addSlots(meta::Class const& owner);
     void numberSlots();
+    void listReferences();
     void tieDependents();
     void buildIndex();
     std::size_t hash(meta::Property::Impl const* property) const
@@ -145,6 +148,7 @@ private:
     std::vector<PropertyFacts> m_facts;  ///< Of all owned attributes of the chain, in order.
     std::vector<ModelElement> m_pins;    ///< Keeps what the facts point to from being another one.
     std::vector<ReflectiveSlot> m_slots;
+    std::vector<ReflectiveSlot const*> m_references;
     std::vector<ReflectiveSlot const*> m_slotsByIndex;
     std::vector<IndexEntry> m_index;  ///< Hashed by the address of the property.
     std::size_t m_indexMask = 0;
