@@ -8,29 +8,25 @@ class Target:
 
 
 @dataclass(frozen=True)
-class Theirs(Target):
-    """At most so many times what the peer needs."""
+class Times(Target):
+    """At most so many times what one of the others needs."""
     factor: float
+    other: str  # "theirs" or "floor", as `Figures` calls them
 
     def __str__(self):
-        return f"{self.factor:g} x theirs"
+        return f"{self.factor:g} x {self.other}"
 
     def bound(self, figures, workload, size):
-        theirs = figures.theirs(workload, size)
-        return None if theirs is None else self.factor * theirs
+        figure = getattr(figures, self.other)(workload, size)
+        return None if figure is None else self.factor * figure
 
 
-@dataclass(frozen=True)
-class Floor(Target):
-    """At most so many times what plain structs need."""
-    factor: float
+def times_theirs(factor):
+    return Times(factor, "theirs")
 
-    def __str__(self):
-        return f"{self.factor:g} x floor"
 
-    def bound(self, figures, workload, size):
-        floor = figures.floor(workload, size)
-        return None if floor is None else self.factor * floor
+def times_floor(factor):
+    return Times(factor, "floor")
 
 
 @dataclass(frozen=True)
@@ -102,32 +98,32 @@ def moves():
 
 def reads(order, value, typed):
     name = f"read {order}"
-    yield Workload(f"{name}, Value", (Theirs(value),), name)
-    yield Workload(f"{name}, typed accessor", (Theirs(typed),), name)
+    yield Workload(f"{name}, Value", (times_theirs(value),), name)
+    yield Workload(f"{name}, typed accessor", (times_theirs(typed),), name)
 
 
 WORKLOADS = (
-    Workload("create", (Theirs(0.5),)),
+    Workload("create", (times_theirs(0.5),)),
     Workload("bytes a book", (Absolute(200, "bytes"),)),
     *reads("in order", value=2, typed=1),
-    Workload("read in order, generated getter", (Floor(1.5),), "read in order"),
+    Workload("read in order, generated getter", (times_floor(1.5),), "read in order"),
     *reads("at random", value=1.5, typed=1),
-    Workload("set, Value", (Theirs(2),), "set"),
-    Workload("set, generated setter", (Theirs(0.8),), "set"),
-    Workload("set recorded", (Theirs(0.25),)),
+    Workload("set, Value", (times_theirs(2),), "set"),
+    Workload("set, generated setter", (times_theirs(0.8),), "set"),
+    Workload("set recorded", (times_theirs(0.25),)),
     Workload("bytes a recorded change", (Absolute(130, "bytes"),)),
-    Workload("undo sets", (Theirs(0.8),)),
+    Workload("undo sets", (times_theirs(0.8),)),
     Workload("one recorded set", (Absolute(1500),)),
     *moves(),
-    Workload("find by UUID", (Theirs(0.3),)),
-    Workload("resolve a reference", (Theirs(1),)),
+    Workload("find by UUID", (times_theirs(0.3),)),
+    Workload("resolve a reference", (times_theirs(1),)),
     Workload("read a local reference"),
     Workload("read a resolved reference", (OtherWorkload(1.2, "read a local reference"),)),
-    Workload("count 1 %", (Theirs(1),)),
-    Workload("rows 1 %", (Theirs(1),)),
-    Workload("count 50 %", (Theirs(1),)),
-    Workload("rows 50 %", (Theirs(1),)),
-    Workload("rows of a join", (Theirs(1),)),
-    Workload("delete every second book", (Theirs(0.1), Growth(2))),
-    Workload("destroy the model", (Floor(1.5),)),
+    Workload("count 1 %", (times_theirs(1),)),
+    Workload("rows 1 %", (times_theirs(1),)),
+    Workload("count 50 %", (times_theirs(1),)),
+    Workload("rows 50 %", (times_theirs(1),)),
+    Workload("rows of a join", (times_theirs(1),)),
+    Workload("delete every second book", (times_theirs(0.1), Growth(2))),
+    Workload("destroy the model", (times_floor(1.5),)),
 )
