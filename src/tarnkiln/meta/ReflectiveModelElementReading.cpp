@@ -21,7 +21,7 @@ namespace tarn::kiln {
 
 using internal::SlotKind;
 
-internal::ReflectiveSlot const*
+[[gnu::always_inline]] inline internal::ReflectiveSlot const*
 ReflectiveModelElementImpl::readableSlot(meta::Property const& property,
                                          ReflectionPrivateTag const& tag) const
 {
@@ -62,9 +62,8 @@ bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property
 Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& property,
                                                    ReflectionPrivateTag const& tag) const
 {
-    Layout const& layout = getCells().layout();
-    ReflectiveSlot const* const slot = layout.find(property);
-    if (!slot || !layout.mayRead(*slot, tag))
+    ReflectiveSlot const* const slot = readableSlot(property, tag);
+    if (!slot)
         return ModelElement::Impl::getPropertyValue(
             property, meta::Extension::cast(property) ? tag : PUBLIC_ACCESS);
     internal::ReflectiveCell const cell = getCells().get(*slot);
@@ -143,9 +142,8 @@ ModelElement::Impl* ReflectiveModelElementImpl::target(ReflectiveSlot const& slo
         return present;
     bool const mayLoad = !(tag == IN_MEMORY_ONLY);
     ModelElement const proxy(present);
-    ModelElement found(mayLoad ? model->findKnownTarget(*present) : nullptr);
-    if (!found.getImpl())
-        found = mayLoad ? model->resolveProxy(this, proxy) : model->peekResolveProxy(this, proxy);
+    ModelElement const found =
+        mayLoad ? model->resolveProxy(this, proxy) : model->peekResolveProxy(this, proxy);
     if (!found || found->isProxy())
         return basicTarget(slot);
     internal::SlotFacts const facts = layout().factsOf(slot);

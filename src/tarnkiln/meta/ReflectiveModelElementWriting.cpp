@@ -51,10 +51,11 @@ private:
     support::OpenStep m_step;  ///< Only where there is no transaction.
 };
 
+ModelElement const none;
+
 /// What a value holds whose type was found to suit; lies in the value.
 ModelElement const& elementOf(Value const& value)
 {
-    static ModelElement const none;
     if (auto const* const held = support::PayloadAccess::get<ModelElement>(value))
         return *held;
     value.checkCompatible<ModelElement>();

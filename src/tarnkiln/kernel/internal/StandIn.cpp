@@ -2,6 +2,7 @@
 
 #include "tarnkiln/kernel/internal/uuidText.h"
 
+#include <algorithm>
 #include <memory>
 
 namespace tarn::kiln::internal {
@@ -10,8 +11,10 @@ namespace {
 /// Whether the text of `uuid` is all that there is to say.
 bool isPlainUuid(ElementId const& id, UUID& uuid)
 {
-    return id.getType() == ElementId::UUID_TYPE && parseUuidText(id.getId(), uuid) &&
-           uuidText(uuid) == id.getId();
+    auto const isUpper = [](char16_t letter) { return letter >= u'A' && letter <= u'F'; };
+    ustring const& text = id.getId();
+    return id.getType() == ElementId::UUID_TYPE && parseUuidText(text, uuid) &&
+           std::none_of(text.begin(), text.end(), isUpper);
 }
 }  // namespace
 

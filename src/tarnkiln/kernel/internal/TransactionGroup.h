@@ -40,8 +40,6 @@ public:
     TransactionResult rollBack();
     void markRollBackOnly();
     bool anyRollBackOnly() const;
-    /// Whether a commit or rollback has begun, or is all that can follow.
-    bool isEnding() const { return m_ending || anyRollBackOnly(); }
 
 private:
     class Ended;

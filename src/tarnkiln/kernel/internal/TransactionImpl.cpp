@@ -295,11 +295,11 @@ void TransactionImpl::nestedCommitted()
         commit(boost::none);
 }
 
+/// A group of several models is deep, so this one goes on alone.
 bool TransactionImpl::isSilent() const
 {
     constexpr unsigned LOUD = ROLLED_BACK | CHANGES_PROHIBITED | ROLL_BACK_ONLY | ENDED | DEEP;
-    return (m_flags & LOUD) == 0 && !isHeard() && m_handleCount > m_commitCount &&
-           !(m_group && m_group->isEnding());
+    return (m_flags & LOUD) == 0 && !isHeard() && m_handleCount > m_commitCount;
 }
 
 void TransactionImpl::markRollBackOnly()

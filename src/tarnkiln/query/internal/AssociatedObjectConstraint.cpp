@@ -1,45 +1,26 @@
 #include "tarnkiln/query/internal/AssociatedObjectConstraint.h"
 
-#include "sill/i18n/StringConversion.h"
 #include "tarnkiln/collections/ReferenceCollection.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/kernel/internal/TypeKind.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
-
-#include <boost/uuid/uuid_io.hpp>
 
 #include <algorithm>
 
 namespace tarn::kiln::internal {
 namespace {
 
-/// Tells whether entries refer to one element, whose text form it makes once.
-class Target
+/// Whether an entry is `target`, or stands in for what has its UUID.
+bool isMeant(ModelElement const& target, ModelElement const& entry)
 {
-public:
-    explicit Target(ModelElement const& element) : m_element(element) {}
-
-    bool isMeantBy(ModelElement const& entry)
-    {
-        if (!entry || !entry->isProxy())
-            return entry == m_element;
-        ustring const* const named = AssociatedObjectConstraint::getNamedUuid(entry);
-        return named && sill::i18n::to_string(*named) == text();
-    }
-
-private:
-    string const& text()
-    {
-        if (m_text.empty())
-            m_text = boost::uuids::to_string(m_element->getUuid());
-        return m_text;
-    }
-
-    ModelElement const& m_element;
-    string m_text;
-};
+    if (!entry || !entry->isProxy())
+        return entry == target;
+    UUID const* const named = entry->getStandIn()->getUuid();
+    return named && *named == target->getUuid();
+}
 }  // namespace
 
 JoinConstraint::~JoinConstraint() = default;
@@ -78,20 +59,14 @@ AssociatedObjectConstraint::readReferences(ModelElement const& source) const
 bool AssociatedObjectConstraint::matches(std::vector<ModelElement> const& row,
                                          std::vector<std::size_t> const& ids) const
 {
-    Target target(elementOf(m_target, row, ids));
+    ModelElement const& target = elementOf(m_target, row, ids);
     std::vector<ModelElement> const entries = readReferences(elementOf(m_source, row, ids));
     return std::any_of(entries.begin(), entries.end(),
-                       [&](ModelElement const& entry) { return target.isMeantBy(entry); });
+                       [&](ModelElement const& entry) { return isMeant(target, entry); });
 }
 
 void AssociatedObjectConstraint::retarget(RetargetableQuery& target) const
 {
     target.addAssociatedObjectConstraint(m_property, m_source, m_target);
-}
-
-ustring const* AssociatedObjectConstraint::getNamedUuid(ModelElement const& proxy)
-{
-    ProxyId const* const id = proxy->getProxyIdImpl();
-    return id && id->getType() == ElementId::UUID_TYPE ? &id->getId() : nullptr;
 }
 }  // namespace tarn::kiln::internal

@@ -28,9 +28,6 @@ public:
     bool isOfSingleReference() const;
     /// What the property of `source` refers to; stand-ins, empty and dead handles too.
     std::vector<ModelElement> readReferences(ModelElement const& source) const;
-    /// The UUID that a stand-in names, as elements write theirs; null if it names none. Any other
-    /// entry is compared as it is.
-    static ustring const* getNamedUuid(ModelElement const& proxy);
 
 private:
     meta::Property const m_property;

@@ -1,11 +1,7 @@
 #include "tarnkiln/query/internal/ReferenceTest.h"
 
 #include "tarnkiln/kernel/ModelImpl.h"
-#include "tarnkiln/kernel/UUIDHasher.h"
-#include "tarnkiln/kernel/internal/TypeKind.h"
-#include "tarnkiln/meta/ClassImpl.h"
-#include "tarnkiln/meta/PropertyImpl.h"
-#include "tarnkiln/meta/internal/PlainPlace.h"
+#include "tarnkiln/kernel/internal/StandIn.h"
 #include "tarnkiln/query/internal/RowIndex.h"
 #include "tarnkiln/query/internal/prefetch.h"
 
@@ -13,34 +9,6 @@
 
 namespace tarn::kiln::internal {
 namespace {
-
-/// The UUID that elements write as `text`; nothing if they write none so.
-std::optional<UUID> parseUuid(ustring const& text)
-{
-    constexpr std::u16string_view FORM = u"xxxxxxxx-xxxx-xxxx-xxxx-xxxxxxxxxxxx";
-    if (text.size() != FORM.size())
-        return std::nullopt;
-    UUID result{};
-    std::size_t digits = 0;
-    for (std::size_t at = 0; at < text.size(); ++at)
-    {
-        char16_t const letter = text[at];
-        if (FORM[at] == u'-')
-        {
-            if (letter != u'-')
-                return std::nullopt;
-            continue;
-        }
-        bool const isDecimal = letter >= u'0' && letter <= u'9';
-        if (!isDecimal && !(letter >= u'a' && letter <= u'f'))
-            return std::nullopt;
-        auto const digit = static_cast<unsigned>(isDecimal ? letter - u'0' : letter - u'a' + 10);
-        std::uint8_t& byte = result.data[digits / 2];
-        byte = static_cast<std::uint8_t>(byte << 4 | digit);
-        ++digits;
-    }
-    return result;
-}
 
 /// Finds the rows of elements.
 class ElementIndex
@@ -145,8 +113,7 @@ ModelElement::Impl* ReferenceTest::meaningOf(ModelElement::Impl* entry) const
 {
     if (!entry || !entry->isLive() || !entry->isProxy())
         return entry;
-    ustring const* const text = AssociatedObjectConstraint::getNamedUuid(ModelElement(entry));
-    std::optional<UUID> const id = text ? parseUuid(*text) : std::nullopt;
+    UUID const* const id = entry->getStandIn()->getUuid();
     return id ? m_context.model->findElementImpl(*id) : nullptr;
 }
 
@@ -193,5 +160,4 @@ std::optional<RowPairs> ReferenceTest::findMatches()
         sortBySecond(pairs, targets.size());
     return pairs;
 }
-
 }  // namespace tarn::kiln::internal

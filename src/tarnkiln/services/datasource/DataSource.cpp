@@ -1,14 +1,12 @@
 #include "tarnkiln/services/datasource/DataSource.h"
 
-#include "sill/i18n/StringConversion.h"
 #include "tarnkiln/collections/ReferenceCollection.h"
 #include "tarnkiln/kernel/ElementId.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/uuidText.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
 #include "tarnkiln/services/datasource/LoadingTransaction.h"
-
-#include <boost/uuid/uuid_io.hpp>
 
 namespace tarn::kiln::datasource {
 namespace {
@@ -47,8 +45,8 @@ DataSource::~DataSource() = default;
 
 ModelElement DataSource::fetchElement(UUID const& id)
 {
-    ustring const text = sill::i18n::to_ustring(boost::uuids::to_string(id));
-    return lookupElement(ModelElement::metaClass(), ElementId(ElementId::UUID_TYPE, text));
+    return lookupElement(ModelElement::metaClass(),
+                         ElementId(ElementId::UUID_TYPE, internal::uuidText(id)));
 }
 
 void DataSource::loadElementSubtree(ModelElement const& element)
