@@ -132,7 +132,7 @@ SequenceEntries::SequenceEntries(SequenceEntries const& other) noexcept
       m_holdsTwice(other.m_holdsTwice)
 {
     if (m_root)
-        m_root->owners.fetch_add(1, std::memory_order_relaxed);
+        m_root->owners.increment();
 }
 
 SequenceEntries::SequenceEntries(SequenceEntries&& other) noexcept
@@ -242,8 +242,7 @@ SequenceEntries::Inner*& SequenceEntries::parentOf(Node& node)
 
 void SequenceEntries::disown(Node* node) noexcept
 {
-    if (node->owners.load(std::memory_order_acquire) == 1 ||
-        node->owners.fetch_sub(1, std::memory_order_acq_rel) == 1)
+    if (node->owners.decrement())
         release(node);
 }
 
@@ -293,7 +292,7 @@ SequenceEntries::Node* SequenceEntries::copyInner(Inner& inner)
     std::copy_n(inner.sizes, inner.count, copy->sizes);
     copy->count = inner.count;
     for (unsigned i = 0; i < copy->count; ++i)
-        copy->children[i]->owners.fetch_add(1, std::memory_order_relaxed);
+        copy->children[i]->owners.increment();
     adopt(*copy, 0, copy->count);
     return copy;
 }
@@ -302,7 +301,7 @@ SequenceEntries::Node* SequenceEntries::copyInner(Inner& inner)
 SequenceEntries::Node& SequenceEntries::unshare(Inner& parent, unsigned child)
 {
     Node*& present = parent.children[child];
-    if (present->owners.load(std::memory_order_acquire) != 1)
+    if (present->owners.get() != 1)
     {
         Node* const copy = present->level == 0 ? copyLeaf(*present, FULL_LEAF)
                                                : copyInner(static_cast<Inner&>(*present));
@@ -314,7 +313,7 @@ SequenceEntries::Node& SequenceEntries::unshare(Inner& parent, unsigned child)
 
 void SequenceEntries::unshareRoot()
 {
-    if (m_root->owners.load(std::memory_order_acquire) == 1)
+    if (m_root->owners.get() == 1)
         return;
     Node* const copy = m_root->level == 0 ? copyLeaf(*m_root, leafCapacityFor(m_root->count))
                                           : copyInner(static_cast<Inner&>(*m_root));
@@ -343,7 +342,7 @@ void SequenceEntries::makeRoomInRoot()
     }
     if (m_root->level != 0)
         return unshareRoot();
-    bool const isShared = m_root->owners.load(std::memory_order_acquire) != 1;
+    bool const isShared = m_root->owners.get() != 1;
     if (!isShared && m_root->count < m_root->capacity)
         return;
     unsigned const capacity = leafCapacityFor(m_root->count + 1u);
@@ -473,8 +472,8 @@ bool SequenceEntries::join(Inner& parent, unsigned left) noexcept
         return false;
     Node& from = *parent.children[left + 1];
     if (to.count + from.count > static_cast<int>(limit) ||
-        to.owners.load(std::memory_order_acquire) != 1 ||
-        from.owners.load(std::memory_order_acquire) != 1)
+        to.owners.get() != 1 ||
+        from.owners.get() != 1)
         return false;
 
     unsigned const before = to.count;
@@ -505,7 +504,7 @@ void SequenceEntries::lowerRoot() noexcept
         m_root = root->count == 0 ? nullptr : root->children[0];
         if (!m_root)
             return delete root;
-        m_root->owners.fetch_add(1, std::memory_order_relaxed);
+        m_root->owners.increment();
         disown(root);
     }
 }
@@ -721,7 +720,7 @@ bool SequenceEntries::isSound() const
 bool SequenceEntries::isSound(Node& node, Inner* parent) const
 {
     bool const isRoot = &node == m_root;
-    if (node.owners == 0 || node.count > node.capacity || (node.count == 0 && !isRoot) ||
+    if (node.owners.get() == 0 || node.count > node.capacity || (node.count == 0 && !isRoot) ||
         (m_index && !isRoot && parentOf(node) != parent))
         return false;
     if (node.level == 0)

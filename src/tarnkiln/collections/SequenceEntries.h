@@ -3,9 +3,9 @@
 #pragma once
 #include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
+#include "tarnkiln/support/SharedCount.h"
 
 #include <algorithm>
-#include <atomic>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
@@ -120,7 +120,7 @@ private:
 
     struct alignas(void*) Node
     {
-        std::atomic<std::uint32_t> owners{1};
+        support::SharedCount owners{1};
         std::uint8_t level;  ///< 0 for a leaf, whose entries lie behind.
         std::uint8_t count;  ///< Of entries or children.
         std::uint8_t capacity;

@@ -287,9 +287,6 @@ public:
     /// @{
     /// The element that `proxy` names, loading what is needed; the proxy itself if there is none.
     ModelElement resolveProxy(ModelElement::Impl const* source, ModelElement const& proxy) const;
-    /// The same, if the registries of models and elements are all that has to be asked; else null.
-    /// Takes no reference.
-    ModelElement::Impl* findKnownTarget(ModelElement::Impl const& proxy) const;
     /// The same as `resolveProxy` among what is in memory.
     ModelElement peekResolveProxy(ModelElement::Impl const* source,
                                   ModelElement const& proxy) const;
@@ -348,6 +345,9 @@ private:
     void convertAllReferencesToProxies(bool multiModel);
     void destroyElements(bool multiModel);
     Impl const* findNamedModel(internal::ModelName const* name) const;
+    /// What `resolveProxy` finds, if the registries of models and elements are all that has to be
+    /// asked; else null. Takes no reference.
+    ModelElement::Impl* findKnownTarget(ModelElement::Impl const& proxy) const;
     bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
     void refuseInvalidChange() const;
 

@@ -2,17 +2,6 @@
 
 namespace tarn::kiln {
 
-void ValuePayload::copyObject(ValuePayload const& other)
-{
-    if (m_functions->isInPlace)
-    {
-        m_functions->copy(other.m_data, m_place);
-        m_data = m_place;
-    }
-    else
-        m_data = m_functions->clone(other.m_data);
-}
-
 void ValuePayload::takeObject(ValuePayload& other) noexcept
 {
     if (m_functions->isTrivial)

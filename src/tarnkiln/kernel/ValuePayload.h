@@ -14,6 +14,8 @@ namespace tarn::kiln {
 /// A small object lies in the payload itself, any other on the heap. An owned payload that is empty,
 /// such as one that was moved from, still knows its type.
 ///
+/// Threads: as a plain value; what it holds may be read by several.
+///
 /// What creates and reads payloads of a type is in support/ValuePayload.h, for those sources that
 /// know the type.
 class TARNKILN_EXPORT ValuePayload
@@ -23,10 +25,9 @@ public:
     struct Functions
     {
         bool isTrivial;  ///< In place, copied as bytes, with nothing to be done at the end.
-        bool isInPlace;
         void (*destroy)(void* payload);
-        void (*copy)(void const* payload, void* place);
-        void* (*clone)(void const* payload);  ///< On the heap.
+        /// To `place` if such payloads lie in place, else to the heap; returns where.
+        void* (*copy)(void const* payload, void* place);
         void (*relocate)(void* from, void* to) noexcept;
         bool (*equals)(void const* left, void const* right);
     };
@@ -40,7 +41,7 @@ public:
         else if (other.m_functions->isTrivial)
             copyBytes(other);
         else
-            copyObject(other);
+            m_data = m_functions->copy(other.m_data, m_place);
     }
     /// Leaves the other one empty, and of the same type.
     ValuePayload(ValuePayload&& other) noexcept : m_functions(other.m_functions) { take(other); }
@@ -77,7 +78,6 @@ public:
     /// @}
 
 private:
-    void copyObject(ValuePayload const& other);
     void copyBytes(ValuePayload const& other)
     {
         std::memcpy(m_place, other.m_place, ROOM);

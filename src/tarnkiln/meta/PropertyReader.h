@@ -15,6 +15,8 @@
 namespace tarn::kiln::meta {
 
 /// Finds where elements keep the value of a property; remembers it for the last kind of elements.
+///
+/// Threads: one.
 class TARNKILN_EXPORT PropertyPlace
 {
 public:

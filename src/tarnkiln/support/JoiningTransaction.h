@@ -9,6 +9,8 @@ namespace tarn::kiln::support {
 /// Joins the open transaction of an element's model, or opens one for this change alone.
 ///
 /// Dropped uncommitted, it takes the change back, and with it the transaction that it joined.
+///
+/// Threads: as the element's model.
 class TARNKILN_EXPORT JoiningTransaction
 {
 public:

@@ -2,7 +2,7 @@
 /// What can be known of a model that may be gone.
 #pragma once
 #include "tarnkiln/kernel/Model.h"
-#include "tarnkiln/support/SharedCount.h"
+#include "tarnkiln/support/Shared.h"
 
 #include <atomic>
 #include <cstdint>
@@ -15,15 +15,13 @@ namespace tarn::kiln::support {
 ///
 /// Threads: shares may be dropped, and the version be asked, anywhere; all else happens on the
 /// thread of the model.
-class ModelAnchor
+class ModelAnchor : public Shared<ModelAnchor>
 {
 public:
     explicit ModelAnchor(Model::Impl* model)
         : m_model(model)
     {
     }
-    ModelAnchor(ModelAnchor const&) = delete;
-    ModelAnchor& operator=(ModelAnchor const&) = delete;
 
     /// Null once the model is gone.
     Model::Impl* getModel() const { return m_model; }
@@ -61,14 +59,9 @@ public:
     }
     /// @}
 
-    void addRef() { m_refCount.increment(); }
-    void removeRef()
-    {
-        if (m_refCount.decrement())
-            delete this;
-    }
-
 private:
+    friend class Shared<ModelAnchor>;
+
     ~ModelAnchor() = default;
 
     static constexpr std::uint64_t IN_CHANGE = 1;
@@ -76,6 +69,5 @@ private:
 
     Model::Impl* m_model;
     std::atomic<std::uint64_t> m_version{STEP};
-    SharedCount m_refCount;
 };
 } // namespace tarn::kiln::support

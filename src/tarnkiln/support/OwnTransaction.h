@@ -10,6 +10,8 @@ namespace tarn::kiln::support {
 /// A transaction for one change alone; nothing if one is open.
 ///
 /// Where nobody would hear of it and nothing could be taken back, the change goes without.
+///
+/// Threads: as the model.
 class TARNKILN_EXPORT OwnTransaction
 {
 public:

@@ -22,8 +22,9 @@ inline bool isOnlyThread() noexcept
 
 /// A count that several threads may change, each step indivisible and sequentially consistent.
 ///
-/// As long as the process has one thread, a step is spared what only other threads could see: it is
-/// a quarter of the price then.
+/// As long as the process has one thread, a step is spared what only other threads could see.
+///
+/// Threads: any, but for `set`.
 class SharedCount
 {
 public:

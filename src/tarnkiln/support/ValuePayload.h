@@ -23,12 +23,18 @@ template <class T> struct PayloadOf
         else
             delete static_cast<T*>(payload);
     }
-    static void copy(void const* payload, void* place)
+    static void* copy(void const* payload, void* place)
+    {
+        return make(*static_cast<T const*>(payload), place);
+    }
+    /// In `place`, or on the heap; returns where.
+    static T* make(T const& object, void* place)
     {
         if constexpr (IN_PLACE)
-            new (place) T(*static_cast<T const*>(payload));
+            return new (place) T(object);
+        else
+            return new T(object);
     }
-    static void* clone(void const* payload) { return new T(*static_cast<T const*>(payload)); }
     static void relocate(void* from, void* to) noexcept
     {
         if constexpr (IN_PLACE)
@@ -44,10 +50,8 @@ template <class T> struct PayloadOf
 
     static constexpr ValuePayload::Functions FUNCTIONS{
         IN_PLACE && std::is_trivially_copyable_v<T> && std::is_trivially_destructible_v<T>,
-        IN_PLACE,
         destroy,
         copy,
-        clone,
         relocate,
         equals};
 };
@@ -67,10 +71,7 @@ template <class T> void ValuePayload::setType()
 
 template <class T> void ValuePayload::store(T const& object)
 {
-    if constexpr (support::PayloadOf<T>::IN_PLACE)
-        m_data = new (m_place) T(object);
-    else
-        m_data = new T(object);
+    m_data = support::PayloadOf<T>::make(object, m_place);
     setType<T>();
 }
 

@@ -4,7 +4,7 @@
 #include "tarnkiln/kernel/Model.h"
 #include "tarnkiln/kernel/Types.h"
 #include "tarnkiln/support/CountedPointer.h"
-#include "tarnkiln/support/SharedCount.h"
+#include "tarnkiln/support/Shared.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -16,15 +16,13 @@ namespace tarn::kiln::internal {
 /// A model part, shared by proxies, and what it was found to mean.
 ///
 /// Threads: shares may be dropped anywhere; all else happens on the thread of the models.
-class ModelName
+class ModelName : public support::Shared<ModelName>
 {
 public:
     explicit ModelName(ustring text)
         : m_text(std::move(text))
     {
     }
-    ModelName(ModelName const&) = delete;
-    ModelName& operator=(ModelName const&) = delete;
 
     ustring const& text() const { return m_text; }
 
@@ -45,21 +43,15 @@ public:
     }
     /// @}
 
-    void addRef() const { m_refCount.increment(); }
-    void removeRef() const
-    {
-        if (m_refCount.decrement())
-            delete this;
-    }
-
 private:
+    friend class support::Shared<ModelName>;
+
     ~ModelName() = default;
 
     ustring const m_text;
     mutable Model::Impl const* m_asker = nullptr;
     mutable Model::Impl const* m_model = nullptr;
     mutable std::uint64_t m_version = 0;
-    mutable support::SharedCount m_refCount;
 };
 
 /// The names that were used last, so that equal ones are shared.

@@ -8,7 +8,7 @@
 #include "tarnkiln/meta/internal/SlotFacts.h"
 #include "tarnkiln/support/CountedPointer.h"
 #include "tarnkiln/support/ModelAnchor.h"
-#include "tarnkiln/support/SharedCount.h"
+#include "tarnkiln/support/Shared.h"
 
 #include <atomic>
 #include <cstddef>
@@ -23,7 +23,7 @@ namespace tarn::kiln::internal {
 /// with: a property that the class gains later is none of theirs.
 ///
 /// Threads: any; handles to it may be copied and dropped anywhere.
-class ReflectiveLayout
+class ReflectiveLayout : public support::Shared<ReflectiveLayout>
 {
 public:
     using Handle = support::CountedPointer<ReflectiveLayout const>;
@@ -36,9 +36,6 @@ public:
     /// \throws tarnkiln::messages::CannotUsePropertyWithoutType, UnsupportedQualification,
     ///     InvalidValue  as `ReflectiveSlot`, for the first property that is at fault.
     static Handle of(meta::Class const& metaClass);
-
-    ReflectiveLayout(ReflectiveLayout const&) = delete;
-    ReflectiveLayout& operator=(ReflectiveLayout const&) = delete;
 
     meta::Class const& getMetaClass() const { return m_metaClass; }
     std::vector<ReflectiveSlot> const& slots() const { return m_slots; }
@@ -78,14 +75,9 @@ public:
     /// The slots of the change records of elements.
     unsigned long getRecordSize() const { return m_recordSize; }
 
-    void addRef() const { m_refCount.increment(); }
-    void removeRef() const
-    {
-        if (m_refCount.decrement())
-            delete this;
-    }
-
 private:
+    friend class support::Shared<ReflectiveLayout>;
+
     struct IndexEntry
     {
         meta::Property::Impl const* property = nullptr;
@@ -158,6 +150,5 @@ private:
     support::ModelAnchor const* m_onlyModel = nullptr;  ///< Of `m_models`, if it is one.
     mutable std::atomic<std::uint64_t> m_currentVersion{0};  ///< When the facts were last the same.
     mutable std::atomic<Known const*> m_known{nullptr};
-    mutable support::SharedCount m_refCount;
 };
 }  // namespace tarn::kiln::internal
