@@ -24,6 +24,7 @@ protected:
         metamodel.property(thing, u"label", StandardTypes::stringMeta).required();
     meta::Property const pages =
         metamodel.property(book, u"pages", StandardTypes::integerMeta).required();
+    meta::Property const draft = metamodel.property(book, u"draft", book);
     ModelElement const element = make(book);
 };
 
@@ -95,6 +96,18 @@ TEST_F(ChangedMetamodel, GivesNewElementsAnotherTypeOfValues)
     EXPECT_RAISES(messages::CannotCastIncompatibleTypes, setPages(2));
     EXPECT_EQ(later->getPropertyValue(pages, ModelElement::Impl::PUBLIC_ACCESS).getValue<double>(),
               0.0);
+}
+
+TEST_F(ChangedMetamodel, GivesReferencesOfAllElementsAnotherTypeAtOnce)
+{
+    ModelElement const first = make(book);
+    element->setPropertyValue(draft, Value(book, first), ModelElement::Impl::PUBLIC_ACCESS);
+    EXPECT_EQ(valueOf(draft).getType(), book);
+
+    draft->setType(thing);
+
+    EXPECT_EQ(valueOf(draft).getType(), thing);
+    EXPECT_EQ(valueOf(draft).getValue<ModelElement>(), first);
 }
 
 TEST_F(ChangedMetamodel, GivesNewElementsWhatARolledBackChangeHadTaken)
