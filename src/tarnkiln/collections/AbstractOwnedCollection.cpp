@@ -1,6 +1,6 @@
 #include "tarnkiln/collections/AbstractOwnedCollection.h"
 
-#include "tarnkiln/kernel/ModelImpl.h"
+#include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/meta/Extension.h"
 
 namespace tarn::kiln {
@@ -25,6 +25,14 @@ void AbstractOwnedCollection::basicSetProperty(meta::Property const& property) n
 {
     m_property = property;
     m_feature = Feature(m_property);
+}
+
+bool AbstractOwnedCollection::isChangedInSilence() const
+{
+    if (!m_owner)
+        return true;
+    Model::Impl const* const model = m_owner->getModelImpl();
+    return model && internal::isChangedInSilence(*model);
 }
 
 /// Neither an extension nor a computed property has a slot.

@@ -11,6 +11,8 @@
 #include "tarnkiln/support/OpenStep.h"
 #include "tarnkiln/support/OwnTransaction.h"
 
+#include <optional>
+
 namespace tarn::kiln {
 
 /// The values of one many-valued property of one element, or a snapshot of them.
@@ -35,6 +37,7 @@ class TARNKILN_EXPORT AbstractOwnedCollection
 {
 public:
     class Operation;
+    class AnnouncedOperation;
 
     AbstractOwnedCollection(AbstractOwnedCollection const&) = delete;
     AbstractOwnedCollection& operator=(AbstractOwnedCollection const&) = delete;
@@ -75,6 +78,8 @@ protected:
 
     /// Whether the owner is destroyed, so that public changes do nothing.
     bool isOwnerDead() const { return m_owner && !m_owner->isLive(); }
+    /// Whether a change that is made now could neither fail nor be heard of, kept or taken back.
+    bool isChangedInSilence() const;
 
     ModelElement::Impl* const m_owner;
 
@@ -106,5 +111,29 @@ public:
 private:
     support::OwnTransaction m_transaction;
     support::OpenStep m_step;
+};
+
+/// The same around a change of nothing but this collection, in one step, which is announced here;
+/// nothing where that is to be done in silence.
+///
+/// \throws  as `modifying`.
+class AbstractOwnedCollection::AnnouncedOperation
+{
+public:
+    explicit AnnouncedOperation(AbstractOwnedCollection& collection)
+    {
+        if (collection.isChangedInSilence())
+            return;
+        m_operation.emplace(collection);
+        collection.modifying();
+    }
+    void commit()
+    {
+        if (m_operation)
+            m_operation->commit();
+    }
+
+private:
+    std::optional<Operation> m_operation;
 };
 }  // namespace tarn::kiln

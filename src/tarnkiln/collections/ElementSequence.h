@@ -450,11 +450,10 @@ template <class T> void ElementSequence<T>::resolveLocal()
 
 template <class T> void ElementSequence<T>::basicAdd(ModelElement const& element)
 {
-    T const added = Base::toEntry(element);
-    AbstractOwnedCollection::Operation operation(*this);
-    Base::modifying();
-    m_entries.append(added);
-    countIn(added);
+    T added = Base::toEntry(element);
+    AbstractOwnedCollection::AnnouncedOperation operation(*this);
+    m_entries.append(std::move(added));
+    countIn(element);
     operation.commit();
 }
 
@@ -463,8 +462,7 @@ template <class T> void ElementSequence<T>::basicRemove(ModelElement const& elem
     std::size_t const index = findForChange(element);
     if (index == size())
         return;
-    AbstractOwnedCollection::Operation operation(*this);
-    Base::modifying();
+    AbstractOwnedCollection::AnnouncedOperation operation(*this);
     ModelElement const released = m_entries.take(index);
     countOut(released);
     operation.commit();

@@ -21,7 +21,8 @@ public:
     bool acceptsElement(ModelElement const& element) const override
     {
         meta::Class const& metaClass = element.getImpl()->getMetaClass();
-        return metaClass.getElementImpl() && metaClass->isA(m_elementClass);
+        return metaClass.getElementImpl() &&
+               (metaClass == m_elementClass || metaClass->isA(m_elementClass));
     }
 
 protected:

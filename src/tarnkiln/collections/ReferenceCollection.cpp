@@ -35,12 +35,11 @@ std::vector<ModelElement> ReferenceCollection::getAllValuesAndProxies() const
     return getAllValues();
 }
 
-void ReferenceCollection::checkElementClass(ModelElement const& element) const
+void ReferenceCollection::refuseElementClass(ModelElement const& element) const
 {
-    if (!acceptsElement(element))
-        reportException(tarnkiln::messages::CannotAddIncompatibleTypes(
-            internal::qualifiedName(getElementClass()),
-            internal::qualifiedName(element->getMetaClass())));
+    reportException(tarnkiln::messages::CannotAddIncompatibleTypes(
+        internal::qualifiedName(getElementClass()),
+        internal::qualifiedName(element->getMetaClass())));
 }
 
 void ReferenceCollection::checkCompatibleModel(ModelElement::Impl* element) const

@@ -45,7 +45,11 @@ public:
     virtual bool acceptsElement(ModelElement const& element) const = 0;
     /// \throws tarnkiln::messages::CannotAddIncompatibleTypes  unless the class of `element`, which
     ///     must not be null, suits; with the qualified names of both classes.
-    void checkElementClass(ModelElement const& element) const;
+    void checkElementClass(ModelElement const& element) const
+    {
+        if (!acceptsElement(element))
+            refuseElementClass(element);
+    }
     /// \throws tarnkiln::messages::CannotCreateCrossModelAssociation, CircularContainment  if the
     ///     owner may not refer to `element` by this property. Nothing for a snapshot.
     void checkCompatibleModel(ModelElement::Impl* element) const;
@@ -126,6 +130,8 @@ protected:
     /// @}
 
 private:
+    [[noreturn]] void refuseElementClass(ModelElement const& element) const;
+
     Feature const m_opposite;
 };
 }  // namespace tarn::kiln

@@ -440,6 +440,18 @@ SequenceEntries::Node& SequenceEntries::openRoom(std::size_t& index, Path& path)
     return *node;
 }
 
+/// The last leaf, if it has room and nothing is to be copied or split on the way to it; else null.
+SequenceEntries::Node* SequenceEntries::openEnd()
+{
+    Node* node = m_root;
+    while (node && node->level != 0)
+    {
+        auto const& inner = static_cast<Inner const&>(*node);
+        node = inner.owners.get() == 1 ? inner.children[inner.count - 1u] : nullptr;
+    }
+    return node && node->owners.get() == 1 && node->count < node->capacity ? node : nullptr;
+}
+
 /// Joins the nodes on the way to a leaf from which an entry was taken with their neighbours, where
 /// that needs no memory.
 void SequenceEntries::shrink(Path const& path) noexcept
@@ -517,19 +529,41 @@ void SequenceEntries::noteChange(std::size_t index) noexcept
     m_lastChange = static_cast<std::uint32_t>(index);
 }
 
-void SequenceEntries::insert(std::size_t index, ModelElement element)
+/// Enters what has the place `at` in a leaf, in which there is room, and `index` among all.
+void SequenceEntries::place(ModelElement&& element, std::size_t index, Node& leaf,
+                            unsigned at) noexcept
 {
-    Path path;
-    std::size_t place = index;
-    Node& leaf = openRoom(place, path);
-    auto const at = static_cast<unsigned>(place);
-    moveEntries(leaf, at, leaf, at + 1, leaf.count - at);
     ModelElement const& added = *new (leaf.entries() + at) ModelElement(std::move(element));
     ++leaf.count;
-    path.addToSizes(1);
     ++m_size;
     noteEntering(added, leaf);
     noteChange(index);
+}
+
+/// Mostly there is room at the end, and nothing to be looked for.
+void SequenceEntries::append(ModelElement element)
+{
+    Node* const leaf = openEnd();
+    if (!leaf)
+        return insert(m_size, std::move(element));
+    for (Node* node = m_root; node != leaf;)
+    {
+        auto& inner = static_cast<Inner&>(*node);
+        ++inner.sizes[inner.count - 1u];
+        node = inner.children[inner.count - 1u];
+    }
+    place(std::move(element), m_size, *leaf, leaf->count);
+}
+
+void SequenceEntries::insert(std::size_t index, ModelElement element)
+{
+    Path path;
+    std::size_t there = index;
+    Node& leaf = openRoom(there, path);
+    auto const at = static_cast<unsigned>(there);
+    moveEntries(leaf, at, leaf, at + 1, leaf.count - at);
+    path.addToSizes(1);
+    place(std::move(element), index, leaf, at);
 }
 
 ModelElement SequenceEntries::take(std::size_t index)
@@ -649,11 +683,15 @@ void SequenceEntries::noteEntering(ModelElement const& element, Node& leaf) noex
     ModelElement::Impl const* const impl = element.getImpl();
     if (impl && impl->isProxy())
         m_mayHoldProxies = true;
-    if (!m_index)
-        return;
+    if (m_index)
+        addEntering(element, leaf);
+}
+
+void SequenceEntries::addEntering(ModelElement const& element, Node& leaf) noexcept
+{
     try
     {
-        m_holdsTwice = !m_index->add(impl, &leaf);
+        m_holdsTwice = !m_index->add(element.getImpl(), &leaf);
         if (m_holdsTwice)
             m_index.reset();
     }

@@ -102,7 +102,7 @@ public:
     /// \name Changing
     /// Positions must exist, or be `size()` for `insert`.
     /// @{
-    void append(ModelElement element) { insert(m_size, std::move(element)); }
+    void append(ModelElement element);
     void insert(std::size_t index, ModelElement element);
     /// Removes the entry and hands it out.
     [[nodiscard]] ModelElement take(std::size_t index);
@@ -155,11 +155,14 @@ private:
     void split(Inner& parent, unsigned child, unsigned at);
     Node& openLeaf(std::size_t& index, Path& path);
     Node& openRoom(std::size_t& index, Path& path);
+    Node* openEnd();
     void shrink(Path const& path) noexcept;
     bool join(Inner& parent, unsigned left) noexcept;
     void lowerRoot() noexcept;
+    void place(ModelElement&& element, std::size_t index, Node& leaf, unsigned at) noexcept;
     void noteLeaving(ModelElement const& element) noexcept;
     void noteEntering(ModelElement const& element, Node& leaf) noexcept;
+    void addEntering(ModelElement const& element, Node& leaf) noexcept;
     void noteChange(std::size_t index) noexcept;
 
     std::size_t scan(ModelElement const& element) const;

@@ -85,6 +85,12 @@ Generator seededGenerator()
     return Generator(first, words.end());
 }
 
+/// A function of its own, so that it is found once for the two words of a UUID.
+[[gnu::noinline]] Generator& generatorOfThread()
+{
+    thread_local Generator generator = seededGenerator();
+    return generator;
+}
 }  // namespace
 
 ElementImpl::InvalidateCallback ElementImpl::m_callback = nullptr;
@@ -143,7 +149,7 @@ void ElementImpl::setInvalidateCallback(InvalidateCallback callback)
 
 UUID ElementImpl::generateNewUuid()
 {
-    thread_local Generator generator = seededGenerator();
+    Generator& generator = generatorOfThread();
 
     UUID result;
     for (int half = 0; half < 2; ++half)

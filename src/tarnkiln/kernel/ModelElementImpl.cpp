@@ -8,6 +8,7 @@
 #include "tarnkiln/kernel/Value.h"
 #include "tarnkiln/kernel/internal/ExtensionValues.h"
 #include "tarnkiln/kernel/internal/StandIn.h"
+#include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/kernel/internal/uuidText.h"
 #include "tarnkiln/meta/AbstractMethodInvoker.h"
@@ -33,6 +34,12 @@ namespace {
     reportException(tarnkiln::messages::NoSuchProperty(
         property ? property->getName() : ustring(),
         internal::qualifiedName(element.getMetaClass())));
+}
+
+/// Whether an element that refers to many by `feature` is among many by the opposite too.
+bool isListedByBothEnds(Feature const& feature)
+{
+    return !feature.isSingle() && !feature.isComposite() && !feature.opposite().isComposite();
 }
 
 } // namespace
@@ -264,7 +271,8 @@ ModelElement::Impl* ModelElement::Impl::basicGetReference(Slot const&) const
 
 void ModelElement::Impl::notifyModifying(unsigned long index)
 {
-    if (index != NO_INDEX && m_validity == ElementValidity::Valid)
+    if (index != NO_INDEX && m_validity == ElementValidity::Valid
+        && !internal::isChangedInSilence(*m_model))
         m_model->elementModifying(this, index);
 }
 
@@ -349,9 +357,8 @@ void ModelElement::Impl::_inverseAddThis(Impl* other, Feature const& feature, bo
 {
     if (!other || other->isProxy())
         return;
-    bool const listedByBothEnds = !feature.isSingle() && !feature.isComposite()
-                                  && !feature.opposite().isComposite();
-    if (!force && listedByBothEnds && m_model->isParsing())
+    Model::Impl const* const model = getModelImpl();
+    if (!force && model && model->isParsing() && isListedByBothEnds(feature))
         return;
     _callInverseAdd(*other, feature);
 }

@@ -104,8 +104,7 @@ void Model::Impl::refuseInvalidChange() const
 
 bool Model::Impl::isChangedInSilence() const
 {
-    return m_currentTransaction && m_isFactoryLocal && m_freezeCount == 0 &&
-           m_currentTransaction->isSilent();
+    return internal::isChangedInSilence(*this);
 }
 
 void Model::Impl::transactionEnded()

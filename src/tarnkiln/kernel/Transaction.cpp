@@ -34,10 +34,9 @@ Transaction::Transaction(Transaction&& other) noexcept
 {
 }
 
-Transaction::~Transaction()
+void Transaction::drop()
 {
-    if (m_impl)
-        m_impl->removeRef();
+    m_impl->removeRef();
 }
 
 Transaction& Transaction::operator=(Transaction other) noexcept

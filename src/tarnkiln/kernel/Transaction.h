@@ -44,7 +44,11 @@ public:
     explicit Transaction(AbstractTransactionImpl* impl);
     Transaction(Transaction const& other);
     Transaction(Transaction&& other) noexcept;
-    ~Transaction();
+    ~Transaction()
+    {
+        if (m_impl)
+            drop();
+    }
     Transaction& operator=(Transaction other) noexcept;
 
     explicit operator bool() const { return m_impl != nullptr; }
@@ -74,6 +78,8 @@ public:
     AbstractTransactionImpl* getImpl() const { return m_impl; }
 
 private:
+    void drop();
+
     AbstractTransactionImpl* m_impl = nullptr;
 };
 } // namespace tarn::kiln

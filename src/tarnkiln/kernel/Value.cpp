@@ -234,6 +234,16 @@ meta::Type Value::typeOf(meta::Property const& property)
     return property->getType();
 }
 
+/// Apart from its template, so that it need not be compiled for each class of elements.
+Value Value::createReference(meta::Property const& property, ModelElement const& element,
+                             meta::Class const& required)
+{
+    meta::StandardTypes::ensureInitialized();
+    Value result(typeOf(property), ValueFlags::Single, nullptr);
+    result.storeElement(element, required);
+    return result;
+}
+
 void Value::failCast() const
 {
     reportException(CannotCastIncompatibleTypes(qualifiedName(m_type)));

@@ -197,6 +197,9 @@ private:
     /// `type`, with the registry started before it is read.
     static meta::Type const& started(meta::Type const& type);
     static meta::Type typeOf(meta::Property const& property);
+    /// An element of a class that extends `required`, as a value of `property`.
+    static Value createReference(meta::Property const& property, ModelElement const& element,
+                                 meta::Class const& required);
 
     [[noreturn]] void failCast() const;
     void storeElement(ModelElement const& element, meta::Class const& required);
@@ -243,7 +246,7 @@ Value Value::createPrimitiveValue(meta::Property const& property, T const& paylo
 template <support::ElementReference T>
 Value Value::createElementValue(meta::Property const& property, T const& element)
 {
-    return Value(typeOf(property), element);
+    return createReference(property, element, T::metaClass());
 }
 
 template <class T>

@@ -34,27 +34,31 @@ void ReflectiveModelElementImpl::inverseAdd(ModelElement const& element,
                                             meta::Property const& property)
 {
     ReflectiveSlot const* const slot = getCells().layout().find(property);
-    ModelElement const self(this);
     switch (slot ? slot->kind() : SlotKind::Other)
     {
     case SlotKind::References:
         _basicAdd(&loaded(*slot), element);
         return;
-    case SlotKind::Container:
+    case SlotKind::Container: {
         if (containerBy(*slot) == element.getImpl())
             return;
+        ModelElement const self(this);
         notifyModifying(slot->index());
         makeUncontained();
         basicSetContainer(element.getImpl(), Feature(property).opposite(), slot->index());
         return;
+    }
     case SlotKind::Reference: {
         ModelElement const removed(basicTarget(*slot));
         if (removed == element)
             return;
+        ModelElement const self(this);
         notifyModifying(slot->index());
-        Feature const opposite = Feature(property).opposite();
-        if (removed && opposite)
-            _inverseRemoveThis(removed.getImpl(), opposite);
+        if (removed)
+        {
+            if (Feature const opposite = Feature(property).opposite())
+                _inverseRemoveThis(removed.getImpl(), opposite);
+        }
         basicSetTarget(*slot, element);
         return;
     }

@@ -5,6 +5,7 @@
 #include "tarnkiln/kernel/Messages.h"
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/kernel/Value.h"
+#include "tarnkiln/kernel/internal/TransactionImpl.h"
 #include "tarnkiln/kernel/internal/TypeKind.h"
 #include "tarnkiln/kernel/internal/qualifiedName.h"
 #include "tarnkiln/meta/ClassImpl.h"
@@ -68,6 +69,24 @@ bool hasOneValue(SlotKind kind)
 }
 }  // namespace
 
+/// Whether the value is just what the property holds; if not, `checkType` has more to ask.
+[[gnu::always_inline]] inline bool
+ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot, SlotFacts const& facts,
+                                     Value const& value)
+{
+    bool const isShaped = value.getFlags() == ValueFlags::Single ||
+                          (value.getFlags() == ValueFlags::OptionalSingle && !facts.isRequired);
+    if (!facts.isTypeKept || !isShaped || value.getType() != slot.type())
+        return false;
+    if (!facts.isTypedByClass)
+        return true;
+    auto const* const held = support::PayloadAccess::get<ModelElement>(value);
+    if (!held || !held->getImpl())
+        return held != nullptr;
+    meta::Class const& metaClass = held->getImpl()->getMetaClass();
+    return metaClass && (metaClass == slot.type() || metaClass->isA(slot.type()));
+}
+
 void ReflectiveModelElementImpl::setPropertyValue(meta::Property const& property,
                                                   Value const& value,
                                                   ReflectionPrivateTag const& tag)
@@ -99,23 +118,6 @@ void ReflectiveModelElementImpl::setPropertyValue(meta::Property const& property
         return static_cast<StringToStringMap*>(made(*slot))
             ->assign(value.getValue<StringToStringMap&>());
     }
-}
-
-/// Whether the value is just what the property holds; if not, `checkType` has more to ask.
-bool ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot, SlotFacts const& facts,
-                                          Value const& value)
-{
-    bool const isShaped = value.getFlags() == ValueFlags::Single ||
-                          (value.getFlags() == ValueFlags::OptionalSingle && !facts.isRequired);
-    if (!facts.isTypeKept || !isShaped || value.getType() != slot.type())
-        return false;
-    if (!facts.isTypedByClass)
-        return true;
-    auto const* const held = support::PayloadAccess::get<ModelElement>(value);
-    if (!held || !held->getImpl())
-        return held != nullptr;
-    meta::Class const& metaClass = held->getImpl()->getMetaClass();
-    return metaClass && metaClass->isA(slot.type());
 }
 
 void ReflectiveModelElementImpl::checkType(ReflectiveSlot const& slot, Value const& value)
@@ -191,8 +193,7 @@ bool ReflectiveModelElementImpl::setWord(ReflectiveSlot const& slot, SlotFacts c
     internal::ReflectiveCell const present = cells().get(slot);
     if (present.isPacked() ? slot.isSameWord(present, added) : slot.holds(present, value))
         return true;
-    if (!getModelImpl()->isChangedInSilence())
-        notifyModifying(slot.index());
+    notifyModifying(slot.index());
     internal::ReflectiveCell const removed = cells().get(slot);
     cells().set(slot, added);
     if (!removed.isPacked())
@@ -248,7 +249,9 @@ void ReflectiveModelElementImpl::setReference(ReflectiveSlot const& slot, SlotFa
     {
         if (facts.isOppositeKeyed)
             checkOwnKey(slot, target);
-        checkCompatibleModel(target.getImpl(), property);
+        bool const isNeighbour = !target->isProxy() && target->getModelImpl() == getModelImpl();
+        if (!isNeighbour || facts.isComposite)
+            checkCompatibleModel(target.getImpl(), property);
     }
 
     ChangeOfSeveral change(*this);
@@ -263,14 +266,15 @@ void ReflectiveModelElementImpl::applyReference(ReflectiveSlot const& slot, Slot
                                                 ModelElement const& target)
 {
     ModelElement const removed(basicTarget(slot));
-    if (removed && facts.opposite)
+    bool const isPaired = !facts.opposite.isNull();  // it is live, or would not be a fact
+    if (removed && isPaired)
         _inverseRemoveThis(removed.getImpl(), facts.opposite);
     basicSetTarget(slot, target);
-    if (target && facts.opposite)
+    if (target && isPaired)
         _inverseAddThis(target.getImpl(), facts.opposite, /*force=*/false);
     else if (target && facts.isComposite)
         _setContainedByThis(target.getImpl(), slot.property());
-    if (removed && !removed->isProxy() && !facts.opposite && facts.isComposite)
+    if (removed && !removed->isProxy() && !isPaired && facts.isComposite)
         _basicSetUncontained(removed.getImpl());
 }
 
@@ -281,7 +285,7 @@ void ReflectiveModelElementImpl::setContainer(ReflectiveSlot const& slot, SlotFa
 {
     meta::Property const& property = slot.property();
     ModelElement::Impl* const present =
-        facts.opposite && getContainment() == facts.opposite ? basicContainer() : nullptr;
+        !isTopLevel() && getContainment() == facts.opposite ? basicContainer() : nullptr;
     if (container.getImpl() == present || (!container && !present))
         return;
     if (facts.isSetOnce && present && present->isLive())

@@ -69,6 +69,7 @@ TransactionImpl::TransactionImpl(Model const& model, TransactionGroup* group,
 {
     for (auto const& holder : model->getListeners())
         m_listeners.push_back(holder.get());
+    findHearers();
     if (m_group)
         m_group->addMember(this);
 }
@@ -80,6 +81,15 @@ TransactionImpl::~TransactionImpl()
 }
 
 // ---------------------------------------------------------------------------- recording
+
+/// A listener that leaves stays on the list, as null.
+void TransactionImpl::findHearers()
+{
+    if (has(DEEP) || !m_listeners.empty() || m_firstChangeCallback)
+        set(HEARD);
+    else
+        clear(HEARD);
+}
 
 bool TransactionImpl::startRecording()
 {
@@ -221,6 +231,7 @@ void TransactionImpl::addFirstChangeCallback(std::function<void()> const& callba
 {
     std::function<void()> replacement(callback);
     m_firstChangeCallback.swap(replacement);
+    findHearers();
 }
 
 void TransactionImpl::eventEmitted(std::unique_ptr<meta::AbstractDeferredInvocation> invocation)
@@ -293,13 +304,6 @@ void TransactionImpl::nestedCommitted()
         ++m_commitCount;
     else
         commit(boost::none);
-}
-
-/// A group of several models is deep, so this one goes on alone.
-bool TransactionImpl::isSilent() const
-{
-    constexpr unsigned LOUD = ROLLED_BACK | CHANGES_PROHIBITED | ROLL_BACK_ONLY | ENDED | DEEP;
-    return (m_flags & LOUD) == 0 && !isHeard() && m_handleCount > m_commitCount;
 }
 
 void TransactionImpl::markRollBackOnly()

@@ -100,13 +100,15 @@ public:
     bool hasEnded() const { return has(ENDED); }
     bool isDeep() const { return has(DEEP); }
     bool isRolledBack() const { return has(ROLLED_BACK); }
-    /// Whether it goes on whatever is changed now, and nobody would ever know.
-    bool isSilent() const;
-    /// Whether anybody would ever know of a change.
-    bool isHeard() const
+    /// Whether it goes on whatever is changed now, and nobody would ever know. A group of several
+    /// models is deep, so this one goes on alone.
+    bool isSilent() const
     {
-        return has(DEEP) || !m_listeners.empty() || m_firstChangeCallback != nullptr;
+        constexpr unsigned LOUD = ROLLED_BACK | CHANGES_PROHIBITED | ROLL_BACK_ONLY | ENDED | HEARD;
+        return (m_flags & LOUD) == 0 && m_handleCount > m_commitCount;
     }
+    /// Whether anybody would ever know of a change.
+    bool isHeard() const { return has(HEARD); }
     bool isInStep() const { return m_model->isInStep(); }
     bool isProhibited() const { return has(CHANGES_PROHIBITED); }
     TransactionGroup* getGroup() const { return m_group; }
@@ -129,12 +131,14 @@ private:
         DEEP = 256,
         REVERT_UNCHANGED = 512,
         DESTROYED_SOME = 1024, ///< Records keep destroyed elements.
-        CREATED_SOME = 2048
+        CREATED_SOME = 2048,
+        HEARD = 4096 ///< By a listener or the first callback, or for it is deep.
     };
     bool has(Flag flag) const { return (m_flags & flag) != 0; }
     void set(Flag flag) { m_flags |= flag; }
     void clear(Flag flag) { m_flags &= ~static_cast<unsigned>(flag); }
 
+    void findHearers();
     bool startRecording();
     void announceFirstChange();
     template <class Fill>
@@ -165,4 +169,11 @@ private:
     bool m_isTelling = false;
     TransactionImpl* m_previousTelling = nullptr;
 };
+
+/// The same as `model.isChangedInSilence()`, without a call.
+inline bool isChangedInSilence(Model::Impl const& model)
+{
+    TransactionImpl const* const open = model.getCurrentTransaction();
+    return open && open->isSilent() && model.isFactoryLocal() && !model.isFrozen();
+}
 } // namespace tarn::kiln::internal

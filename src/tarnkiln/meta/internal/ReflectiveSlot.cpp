@@ -228,7 +228,7 @@ void ReflectiveSlot::free(ReflectiveCell cell) const noexcept
 {
     if (cell.state == CellState::Boxed)
         delete cell.pointer<Value>();
-    else if (cell.state != CellState::Empty)
+    else if (cell.state != CellState::Empty && cell.word != 0)
         withPayloadType(m_kind, [&]<class T>() { Packed<T>::free(cell.word); });
 }
 
