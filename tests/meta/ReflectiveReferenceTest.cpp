@@ -75,6 +75,49 @@ TEST_F(ReflectiveReference, KeepsTheOtherEndInStep)
     EXPECT_FALSE(targetOf(a, left));
 }
 
+TEST_F(ReflectiveReference, TellsTheFirstChangeThatIsHeardOfBeforeEitherEndIsChanged)
+{
+    ModelElement const a = make(node), b = make(node), p = make(node);
+    Transaction const transaction = model->beginTransaction(/*revertible=*/false);
+    set(a, owner, b);
+    int calls = 0;
+    transaction.addFirstChangeCallback([&] {
+        ++calls;
+        EXPECT_EQ(targetOf(a, owner), b);
+        EXPECT_THAT(entriesOf(b, owned), ElementsAre(a));
+        EXPECT_THAT(entriesOf(p, owned), IsEmpty());
+    });
+
+    set(a, owner, p);
+    set(a, left, b);
+
+    EXPECT_EQ(calls, 1);
+    EXPECT_THAT(entriesOf(b, owned), IsEmpty());
+    EXPECT_THAT(entriesOf(p, owned), ElementsAre(a));
+    EXPECT_EQ(targetOf(b, right), a);
+    transaction.commit();
+}
+
+TEST_F(ReflectiveReference, StaysInAFrozenModelThoughNobodyWouldHearOfTheChange)
+{
+    ModelElement const a = make(node), b = make(node);
+    Transaction const transaction = model->beginTransaction(/*revertible=*/false);
+    set(a, buddy, b);
+    {
+        Model::Freezer const freezer(model);
+        EXPECT_RAISES(messages::ModelFrozen, set(a, owner, b));
+        EXPECT_RAISES(messages::ModelFrozen, set(a, left, b));
+        EXPECT_RAISES(messages::ModelFrozen, set(a, parent, b));
+    }
+
+    EXPECT_FALSE(targetOf(a, owner));
+    EXPECT_FALSE(targetOf(b, right));
+    EXPECT_THAT(entriesOf(b, owned), IsEmpty());
+    EXPECT_THAT(entriesOf(b, children), IsEmpty());
+    EXPECT_TRUE(a->isTopLevel());
+    transaction.commit();
+}
+
 TEST_F(ReflectiveReference, EntersAndLeavesTheCollectionAtTheOtherEnd)
 {
     ModelElement const p = make(node), q = make(node), x = make(node);

@@ -231,7 +231,8 @@ meta::Type const& Value::started(meta::Type const& type)
 meta::Type Value::typeOf(meta::Property const& property)
 {
     TARNKILN_ASSERT(property.getElementImpl(), "only a property has values");
-    return property->getType();
+    meta::Type::Impl* const known = property->getTypeImpl();
+    return known && !known->isProxy() ? meta::Type(known) : property->getType();
 }
 
 /// Apart from its template, so that it need not be compiled for each class of elements.
@@ -258,7 +259,10 @@ void Value::storeElement(ModelElement const& element, meta::Class const& require
 void Value::checkElement(meta::Class const& required) const
 {
     auto const* const own = internal::classImpl(m_type);
-    if (m_flags > ValueFlags::Single || !own || !own->isLive() || !own->isA(required))
+    if (m_flags > ValueFlags::Single || !own || !own->isLive())
+        failCast();
+    // Most classes of references that are asked about lie just below that of all elements.
+    if (own->getSuperclassImpl() != required.getImpl() && !own->isA(required))
         failCast();
 }
 

@@ -49,7 +49,7 @@ void ReflectiveModelElementImpl::inverseAdd(ModelElement const& element,
         return;
     }
     case SlotKind::Reference: {
-        ModelElement const removed(basicTarget(*slot));
+        ModelElement const removed(cells().target(*slot));
         if (removed == element)
             return;
         ModelElement const self(this);
@@ -59,7 +59,7 @@ void ReflectiveModelElementImpl::inverseAdd(ModelElement const& element,
             if (Feature const opposite = Feature(property).opposite())
                 _inverseRemoveThis(removed.getImpl(), opposite);
         }
-        basicSetTarget(*slot, element);
+        cells().setTarget(*slot, element);
         return;
     }
     default:
@@ -87,7 +87,7 @@ void ReflectiveModelElementImpl::inverseRemove(ModelElement const& element,
         if (!refersTo(*slot, element))
             return;
         notifyModifying(slot->index());
-        basicSetTarget(*slot, ModelElement());
+        cells().setTarget(*slot, ModelElement());
         return;
     default:
         ModelElement::Impl::inverseRemove(element, property);
@@ -111,7 +111,7 @@ bool ReflectiveModelElementImpl::inverseContainsProxyTo(ModelElement const& elem
     case SlotKind::Reference:
         if (!refersTo(*slot, element))
             return false;
-        basicSetTarget(*slot, element);
+        cells().setTarget(*slot, element);
         return true;
     default:
         return ModelElement::Impl::inverseContainsProxyTo(element, property);
@@ -141,10 +141,10 @@ void ReflectiveModelElementImpl::disassociateIncoming()
         };
         if (slot.kind() == SlotKind::Reference)
         {
-            ModelElement const target(basicTarget(slot));
+            ModelElement const target(cells().target(slot));
             notifyModifying(slot.index());
             leave(target);
-            basicSetTarget(slot, ModelElement());
+            cells().setTarget(slot, ModelElement());
             continue;
         }
         std::vector<ModelElement> const targets = members(slot);
@@ -168,9 +168,9 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
         if (slot.kind() == SlotKind::Reference)
         {
             if (isComposite)
-                destroyChild(ModelElement(basicTarget(slot)));
+                destroyChild(ModelElement(cells().target(slot)));
             notifyModifying(slot.index());
-            basicSetTarget(slot, ModelElement());
+            cells().setTarget(slot, ModelElement());
             continue;
         }
         std::vector<ModelElement> const children = members(slot);
@@ -193,7 +193,7 @@ void ReflectiveModelElementImpl::convertReferencesToProxies(bool multiModel,
         if (multiModel)
             leaveProxies(slot, cachedId);
         if (slot.kind() == SlotKind::Reference)
-            basicSetTarget(slot, ModelElement());
+            cells().setTarget(slot, ModelElement());
         else
             _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
     }
@@ -209,7 +209,7 @@ void ReflectiveModelElementImpl::leaveProxies(ReflectiveSlot const& slot,
         return;
     std::vector<ModelElement> const targets =
         slot.kind() == SlotKind::Reference
-            ? std::vector<ModelElement>(1, ModelElement(basicTarget(slot)))
+            ? std::vector<ModelElement>(1, ModelElement(cells().target(slot)))
             : members(slot);
     for (ModelElement const& target : targets)
     {
@@ -230,7 +230,7 @@ void ReflectiveModelElementImpl::basicDisassociateAll()
     for (ReflectiveSlot const& slot : layout().slots())
     {
         if (slot.kind() == SlotKind::Reference)
-            basicSetTarget(slot, ModelElement());
+            cells().setTarget(slot, ModelElement());
         else if (slot.kind() != SlotKind::References)
             continue;
         else if (AbstractOwnedCollection* const present = cells().getCollection(slot))

@@ -8,7 +8,6 @@
 namespace tarn::kiln {
 
 using internal::isCollection;
-using internal::isPlain;
 using internal::ReflectiveCells;
 using internal::ReflectiveLayout;
 
@@ -59,11 +58,7 @@ ReflectiveModelElementImpl::ReflectiveModelElementImpl(Model const& model,
     ReflectiveCells* const made = ReflectiveCells::create(&cells(), layout);
     try
     {
-        for (ReflectiveSlot const& slot : layout.get()->slots())
-        {
-            if (isPlain(slot.kind()))
-                made->set(slot, slot.keepInitial());
-        }
+        made->fill();
     }
     catch (...)
     {

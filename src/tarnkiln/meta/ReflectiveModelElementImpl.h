@@ -173,8 +173,6 @@ private:
                         ReflectionPrivateTag const& tag) const;
     Value valueOf(ReflectiveSlot const& slot, ModelElement const& element) const;
     ModelElement::Impl* containerBy(ReflectiveSlot const& slot) const;
-    ModelElement::Impl* basicTarget(ReflectiveSlot const& slot) const;
-    void basicSetTarget(ReflectiveSlot const& slot, ModelElement const& target) const;
     /// Resolves a proxy in its place as far as `tag` allows.
     ModelElement::Impl* target(ReflectiveSlot const& slot, ReflectionPrivateTag const& tag) const;
     /// Whether the reference is to `element`, be it by a proxy.
@@ -200,13 +198,17 @@ private:
     void setPlain(ReflectiveSlot const& slot, SlotFacts const& facts, Value const& value);
     bool setWord(ReflectiveSlot const& slot, SlotFacts const& facts, Value const& value);
     void storePlain(ReflectiveSlot const& slot, SlotFacts const& facts, Value const& value);
-    void setReference(ReflectiveSlot const& slot, SlotFacts const& facts,
+    // `self` is a handle of this element, here and in what follows.
+    void setReference(ModelElement const& self, ReflectiveSlot const& slot, SlotFacts const& facts,
                       ModelElement const& target);
-    void setContainer(ReflectiveSlot const& slot, SlotFacts const& facts,
+    void setContainer(ModelElement const& self, ReflectiveSlot const& slot, SlotFacts const& facts,
                       ModelElement const& container);
     void replace(ReflectiveSlot const& slot, internal::ReflectiveCell added);
-    void applyReference(ReflectiveSlot const& slot, SlotFacts const& facts,
-                        ModelElement const& target);
-    void applyContainer(SlotFacts const& facts, ModelElement const& container);
+    void applyReference(ModelElement const& self, ReflectiveSlot const& slot,
+                        SlotFacts const& facts, ModelElement const& target);
+    void applyContainer(ModelElement const& self, SlotFacts const& facts,
+                        ModelElement const& container);
+    void enterOtherEnd(ModelElement const& self, ModelElement const& target,
+                       Feature const& opposite, bool force);
 };
 }  // namespace tarn::kiln

@@ -41,7 +41,7 @@ bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property
     case SlotKind::Container:
         return containerBy(*slot) != nullptr;
     case SlotKind::Reference:
-        return basicTarget(*slot) && basicTarget(*slot)->isLive();
+        return cells().target(*slot) && cells().target(*slot)->isLive();
     case SlotKind::References:
         return mayHaveMembers(*slot) && shown(*slot, tag).getGenericInterface()->genericSize() > 0;
     case SlotKind::Values: {
@@ -114,29 +114,10 @@ ModelElement::Impl* ReflectiveModelElementImpl::containerBy(ReflectiveSlot const
     return opposite && getContainment() == opposite ? basicContainer() : nullptr;
 }
 
-ModelElement::Impl* ReflectiveModelElementImpl::basicTarget(ReflectiveSlot const& slot) const
-{
-    return cells().get(slot).pointer<ModelElement::Impl>();
-}
-
-/// Changes nothing but the handle; putting a target in the place of its proxy is no change.
-void ReflectiveModelElementImpl::basicSetTarget(ReflectiveSlot const& slot,
-                                                ModelElement const& target) const
-{
-    ModelElement::Impl* const old = basicTarget(slot);
-    internal::ReflectiveCell cell;
-    cell.point(target.getImpl());
-    if (target.getImpl())
-        target.getImpl()->addRef();
-    cells().set(slot, cell);
-    if (old)
-        old->release();
-}
-
 ModelElement::Impl* ReflectiveModelElementImpl::target(ReflectiveSlot const& slot,
                                                        ReflectionPrivateTag const& tag) const
 {
-    ModelElement::Impl* const present = basicTarget(slot);
+    ModelElement::Impl* const present = cells().target(slot);
     Model::Impl const* const model = present && present->isProxy() ? getModelImpl() : nullptr;
     if (!model || tag == NO_PROXY_RESOLVE)
         return present;
@@ -145,25 +126,25 @@ ModelElement::Impl* ReflectiveModelElementImpl::target(ReflectiveSlot const& slo
     ModelElement const found =
         mayLoad ? model->resolveProxy(this, proxy) : model->peekResolveProxy(this, proxy);
     if (!found || found->isProxy())
-        return basicTarget(slot);
+        return cells().target(slot);
     internal::SlotFacts const facts = layout().factsOf(slot);
     meta::Class const& metaClass = found->getMetaClass();
     bool const isOfType =
         metaClass && metaClass->isA(facts.isTypeKept ? slot.type() : slot.property()->getType());
     if (!isOfType)
-        return basicTarget(slot);
+        return cells().target(slot);
     if (facts.opposite && !facts.isComposite &&
         !_inverseContainsThis(found.getImpl(), facts.opposite))
-        return basicTarget(slot);
-    if (basicTarget(slot) == present)  // loading may have changed it
-        basicSetTarget(slot, found);
-    return basicTarget(slot);
+        return cells().target(slot);
+    if (cells().target(slot) == present)  // loading may have changed it
+        cells().setTarget(slot, found);
+    return cells().target(slot);
 }
 
 bool ReflectiveModelElementImpl::refersTo(ReflectiveSlot const& slot,
                                           ModelElement const& element) const
 {
-    ModelElement::Impl* const present = basicTarget(slot);
+    ModelElement::Impl* const present = cells().target(slot);
     if (!present || present == element.getImpl())
         return present != nullptr;
     return present->isProxy() && getModelImpl() &&
@@ -174,7 +155,7 @@ ModelElement::Impl* ReflectiveModelElementImpl::basicGetReference(Slot const& sl
 {
     ReflectiveSlot const* const own = layout().findByIndex(slot.index);
     if (own && own->kind() == SlotKind::Reference)
-        return basicTarget(*own);
+        return cells().target(*own);
     return own && own->kind() == SlotKind::Container ? containerBy(*own) : nullptr;
 }
 
@@ -197,8 +178,8 @@ void ReflectiveModelElementImpl::visitReferences(ReferenceVisitor const& visit) 
 {
     for (ReflectiveSlot const& slot : layout().slots())
     {
-        if (slot.kind() == SlotKind::Reference && basicTarget(slot))
-            visit(ModelElement(basicTarget(slot)), slot.property());
+        if (slot.kind() == SlotKind::Reference && cells().target(slot))
+            visit(ModelElement(cells().target(slot)), slot.property());
         for (ModelElement const& member : members(slot))
             visit(member, slot.property());
     }

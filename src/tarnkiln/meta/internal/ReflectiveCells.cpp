@@ -21,6 +21,23 @@ ReflectiveCells* ReflectiveCells::create(void* place, ReflectiveLayout::Handle c
     return cells;
 }
 
+void ReflectiveCells::fill()
+{
+    if (meta::MetaRegistry::getInstance().hasOwnershipConverters())
+    {
+        for (ReflectiveSlot const& slot : layout().slots())
+        {
+            if (isPlain(slot.kind()))
+                set(slot, slot.keepInitial());
+        }
+        return;
+    }
+    for (ReflectiveSlot const* const slot : layout().sharedInitials())
+        set(*slot, *slot->sharedInitial());
+    for (ReflectiveSlot const* const slot : layout().ownInitials())
+        set(*slot, slot->keepInitial());
+}
+
 void ReflectiveCells::destroy()
 {
     bool const isTold = meta::MetaRegistry::getInstance().hasOwnershipConverters();

@@ -43,11 +43,28 @@ public:
         return const_cast<ReflectiveCells*>(this)->state(slot);
     }
     /// @}
+    /// Gives all plain values what a new element starts with.
+    void fill();
     /// Frees nothing of what was there.
     void set(ReflectiveSlot const& slot, ReflectiveCell cell)
     {
         word(slot) = cell.word;
         state(slot) = cell.state;
+    }
+    /// What the reference refers to: a proxy as it stands, null for nothing.
+    ModelElement::Impl* target(ReflectiveSlot const& slot) const
+    {
+        return reinterpret_cast<ModelElement::Impl*>(word(slot));
+    }
+    /// Changes nothing but the reference; putting a target in the place of its proxy is no change.
+    void setTarget(ReflectiveSlot const& slot, ModelElement const& target)
+    {
+        ModelElement::Impl* const old = this->target(slot);
+        if (target.getImpl())
+            target.getImpl()->addRef();
+        word(slot) = reinterpret_cast<std::uint64_t>(target.getImpl());
+        if (old)
+            old->release();
     }
     /// The collection of the slot; null while there is none.
     AbstractOwnedCollection* getCollection(ReflectiveSlot const& slot) const;

@@ -57,6 +57,7 @@ ReflectiveLayout::ReflectiveLayout(meta::Class const& metaClass) : m_metaClass(m
     }
     numberSlots();
     listReferences();
+    listInitials();
     tieDependents();
     buildIndex();
     listModels();
@@ -171,6 +172,15 @@ void ReflectiveLayout::listReferences()
     {
         if (slot.kind() == SlotKind::Reference || slot.kind() == SlotKind::References)
             m_references.push_back(&slot);
+    }
+}
+
+void ReflectiveLayout::listInitials()
+{
+    for (ReflectiveSlot const& slot : m_slots)
+    {
+        if (isPlain(slot.kind()))
+            (slot.sharedInitial() ? m_sharedInitials : m_ownInitials).push_back(&slot);
     }
 }
 

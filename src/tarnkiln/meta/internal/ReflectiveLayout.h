@@ -13,6 +13,7 @@
 #include <atomic>
 #include <cstddef>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
 namespace tarn::kiln::internal {
@@ -41,6 +42,10 @@ public:
     std::vector<ReflectiveSlot> const& slots() const { return m_slots; }
     /// Those of them that refer to elements, one or many: all but the references to containers.
     std::vector<ReflectiveSlot const*> const& references() const { return m_references; }
+    /// Those of plain values, by how new elements come to theirs: all the same word, or each one
+    /// of its own.
+    std::vector<ReflectiveSlot const*> const& sharedInitials() const { return m_sharedInitials; }
+    std::vector<ReflectiveSlot const*> const& ownInitials() const { return m_ownInitials; }
     /// What the cells of an element take, the link to this included.
     std::size_t cellBytes() const { return m_cellBytes; }
     /// Null if the property has no slot.
@@ -64,6 +69,12 @@ public:
     {
         SlotFacts const* const known = knownFacts(slot);
         return known ? *known : askFacts(slot);
+    }
+    /// The same in their place, if they are known, else in `room`.
+    SlotFacts const& factsOf(ReflectiveSlot const& slot, std::optional<SlotFacts>& room) const
+    {
+        SlotFacts const* const known = knownFacts(slot);
+        return known ? *known : room.emplace(askFacts(slot));
     }
     /// Whether the property of the slot may be read now.
     bool mayRead(ReflectiveSlot const& slot,
@@ -127,6 +138,7 @@ private:
     void addSlots(meta::Class const& owner);
     void numberSlots();
     void listReferences();
+    void listInitials();
     void tieDependents();
     void buildIndex();
     std::size_t hash(meta::Property::Impl const* property) const
@@ -141,6 +153,8 @@ private:
     std::vector<ModelElement> m_pins;    ///< Keeps what the facts point to from being another one.
     std::vector<ReflectiveSlot> m_slots;
     std::vector<ReflectiveSlot const*> m_references;
+    std::vector<ReflectiveSlot const*> m_sharedInitials;
+    std::vector<ReflectiveSlot const*> m_ownInitials;
     std::vector<ReflectiveSlot const*> m_slotsByIndex;
     std::vector<IndexEntry> m_index;  ///< Hashed by the address of the property.
     std::size_t m_indexMask = 0;

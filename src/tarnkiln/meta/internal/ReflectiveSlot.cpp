@@ -130,8 +130,6 @@ bool ReflectiveSlot::isInitialShared() const
 
 ReflectiveCell ReflectiveSlot::keepInitial() const
 {
-    if (m_initialCell && !MetaRegistry::getInstance().hasOwnershipConverters())
-        return *m_initialCell;
     return keepOwn(m_initial ? *m_initial : initialValueOf(m_property));
 }
 

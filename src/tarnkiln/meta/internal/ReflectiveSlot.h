@@ -54,6 +54,8 @@ public:
 
     /// What a new element starts with, kept as an element keeps it.
     ReflectiveCell keepInitial() const;
+    /// The same if it is one word for all, of which no ownership converter is told; else null.
+    ReflectiveCell const* sharedInitial() const { return m_initialCell.get_ptr(); }
 
     /// \name Cells of plain values
     /// @{
