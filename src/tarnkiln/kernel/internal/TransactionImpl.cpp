@@ -31,6 +31,15 @@ private:
     Model::Impl* m_model;
 };
 
+namespace {
+
+/// Of a deep transaction.
+void putBack(ModelElement::Impl& element, ModelElement::Impl::Changes& record)
+{
+    element.copyStateFromStorage(static_cast<ModelElement::Impl::Storage*>(&record));
+}
+} // namespace
+
 /// The group that ends a transaction which stands alone. While it lives, calls from listeners find
 /// it running.
 class TransactionImpl::LocalGroup
@@ -225,6 +234,7 @@ void TransactionImpl::containerChanging(ModelElement::Impl* element)
         if (!changes.isCreated())
             element->recordOldContainer(static_cast<ModelElement::Impl::Storage&>(changes));
     });
+    set(MOVED_SOME);
 }
 
 void TransactionImpl::addFirstChangeCallback(std::function<void()> const& callback)
@@ -505,14 +515,21 @@ void TransactionImpl::checkInvariants()
 
 // ---------------------------------------------------------------------------- undo
 
+/// Null if the model has none under the UUID of the record, or another one.
+ModelElement::Impl*
+TransactionImpl::findElementOf(ModelElement::Impl::Changes const& record) const
+{
+    ModelElement::Impl* const element = m_model->findElementImpl(record.getUuid());
+    return belongsTo(record, element) ? element : nullptr;
+}
+
 /// No element may die from what is put back into another one.
 void TransactionImpl::pinElements()
 {
     m_changes->forEach([this](ModelElement::Impl::Changes& record) {
         if (record.isDestroyed())
             return;
-        ModelElement::Impl* const element = m_model->findElementImpl(record.getUuid());
-        if (belongsTo(record, element))
+        if (ModelElement::Impl* const element = findElementOf(record))
             record.keepElement(element);
     });
 }
@@ -533,8 +550,12 @@ TransactionResult TransactionImpl::undo()
         return TransactionResult::NotCompleted;
     if (!has(DEEP))
         return TransactionResult::NotRevertible;
-    pinElements();
     set(ROLLED_BACK);
+    if (!has(CREATED_SOME) && !has(DESTROYED_SOME) && !has(MOVED_SOME)) {
+        undoInPlace();
+        return TransactionResult::RolledBack;
+    }
+    pinElements();
     // First what was created: it may have the UUID of what comes back.
     if (has(CREATED_SOME))
         takeBackCreated();
@@ -542,11 +563,19 @@ TransactionResult TransactionImpl::undo()
         bringBackDestroyed();
     m_changes->forEachBackward([](ModelElement::Impl::Changes& record) {
         if (record.getKeptElement() && !record.isCreated())
-            record.getKeptElement()->copyStateFromStorage(
-                static_cast<ModelElement::Impl::Storage*>(&record));
+            putBack(*record.getKeptElement(), record);
     });
     unpinElements();
     return TransactionResult::RolledBack;
+}
+
+/// Where all elements are and stay where they were, none can die: one walk is enough.
+void TransactionImpl::undoInPlace()
+{
+    m_changes->forEachBackward([this](ModelElement::Impl::Changes& record) {
+        if (ModelElement::Impl* const element = findElementOf(record))
+            putBack(*element, record);
+    });
 }
 
 void TransactionImpl::takeBackCreated()

@@ -132,7 +132,8 @@ private:
         REVERT_UNCHANGED = 512,
         DESTROYED_SOME = 1024, ///< Records keep destroyed elements.
         CREATED_SOME = 2048,
-        HEARD = 4096 ///< By a listener or the first callback, or for it is deep.
+        HEARD = 4096, ///< By a listener or the first callback, or for it is deep.
+        MOVED_SOME = 8192 ///< Records keep former containers.
     };
     bool has(Flag flag) const { return (m_flags & flag) != 0; }
     void set(Flag flag) { m_flags |= flag; }
@@ -149,8 +150,10 @@ private:
     bool anyListener(ReportKind kind) const;
     bool belongsTo(ModelElement::Impl::Changes const& record,
                    ModelElement::Impl const* element) const;
+    ModelElement::Impl* findElementOf(ModelElement::Impl::Changes const& record) const;
     void pinElements();
     void unpinElements();
+    void undoInPlace();
     void takeBackCreated();
     void bringBackDestroyed();
 
