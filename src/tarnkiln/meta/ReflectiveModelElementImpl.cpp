@@ -28,34 +28,40 @@ ReflectiveModelElementImpl* ReflectiveModelElementImpl::createForProxy(Model con
     LayoutHandle const layout = ReflectiveLayout::of(metaClass);
     auto* const made = new (layout, sizeof(internal::StandIn))
         ReflectiveModelElementImpl(model, layout, ElementImpl::generateNewUuid());
-    static_assert(alignof(internal::StandIn) <= alignof(ReflectiveCells));
-    made->offerRoom(reinterpret_cast<std::byte*>(&made->cells()) + layout.get()->cellBytes());
+    static_assert(alignof(internal::StandIn) <= alignof(ReflectiveModelElementImpl));
+    made->offerRoom(made + 1);
     return made;
 }
 
 void* ReflectiveModelElementImpl::operator new(std::size_t size, LayoutHandle const& layout,
                                                std::size_t more)
 {
-    return ::operator new(size + layout.get()->cellBytes() + more);
+    std::size_t const cells = layout.get()->cellBytes();
+    return static_cast<std::byte*>(::operator new(cells + size + more)) + cells;
 }
 
-void ReflectiveModelElementImpl::operator delete(void* element, LayoutHandle const& /*layout*/,
+void ReflectiveModelElementImpl::operator delete(void* element, LayoutHandle const& layout,
                                                  std::size_t /*more*/)
 {
-    ::operator delete(element);
+    ::operator delete(static_cast<std::byte*>(element) - layout.get()->cellBytes());
 }
 
-void ReflectiveModelElementImpl::operator delete(void* element)
+/// The layout tells where the memory begins, and may go with the element.
+void ReflectiveModelElementImpl::operator delete(ReflectiveModelElementImpl* element,
+                                                 std::destroying_delete_t)
 {
-    ::operator delete(element);
+    void* const memory = reinterpret_cast<std::byte*>(element) - element->layout().cellBytes();
+    element->~ReflectiveModelElementImpl();
+    ::operator delete(memory);
 }
 
 ReflectiveModelElementImpl::ReflectiveModelElementImpl(Model const& model,
                                                        LayoutHandle const& layout, UUID const& id)
     : ModelElement::Impl(model, id)
 {
-    static_assert(sizeof(ReflectiveModelElementImpl) % alignof(ReflectiveCells) == 0);
-    ReflectiveCells* const made = ReflectiveCells::create(&cells(), layout);
+    static_assert(alignof(ReflectiveModelElementImpl) <= alignof(ReflectiveCells));
+    ReflectiveCells* const made =
+        ReflectiveCells::create(reinterpret_cast<std::byte*>(this), layout);
     try
     {
         made->fill();

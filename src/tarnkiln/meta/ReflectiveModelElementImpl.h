@@ -8,6 +8,7 @@
 #include "tarnkiln/support/CountedPointer.h"
 
 #include <cstddef>
+#include <new>
 
 namespace tarn::kiln {
 namespace internal {
@@ -95,7 +96,8 @@ public:
     /// What it keeps for its properties, for readers of many elements.
     internal::ReflectiveCells const& getCells() const
     {
-        return *reinterpret_cast<internal::ReflectiveCells const*>(this + 1);
+        return *reinterpret_cast<internal::ReflectiveCells const*>(
+            reinterpret_cast<std::byte const*>(this) - sizeof(void*));
     }
 
     // ModelElement::Impl
@@ -155,10 +157,10 @@ private:
     using LayoutHandle = support::CountedPointer<Layout const>;
 
     ReflectiveModelElementImpl(Model const& model, LayoutHandle const& layout, UUID const& id);
-    /// Room for the cells too, which lie behind the element, and for more behind them.
+    /// Room for the cells too, which lie before the element, and for more behind it.
     static void* operator new(std::size_t size, LayoutHandle const& layout, std::size_t more);
     static void operator delete(void* element, LayoutHandle const& layout, std::size_t more);
-    static void operator delete(void* element);
+    static void operator delete(ReflectiveModelElementImpl* element, std::destroying_delete_t);
     internal::ReflectiveCells& cells() const
     {
         return const_cast<internal::ReflectiveCells&>(getCells());

@@ -13,12 +13,11 @@ namespace tarn::kiln::internal {
 static_assert(isInPlace(SlotKind::DateTime) && Packed<boost::posix_time::ptime>::IN_PLACE);
 static_assert(!isInPlace(SlotKind::Uuid) && !Packed<UUID>::IN_PLACE);
 
-ReflectiveCells* ReflectiveCells::create(void* place, ReflectiveLayout::Handle const& layout)
+ReflectiveCells* ReflectiveCells::create(std::byte* place, ReflectiveLayout::Handle const& layout)
 {
-    auto* const cells = new (place) ReflectiveCells(layout);
-    std::memset(static_cast<void*>(cells + 1), 0,
-                layout.get()->cellBytes() - sizeof(ReflectiveCells));
-    return cells;
+    std::size_t const bytes = layout.get()->cellBytes();
+    std::memset(place - bytes, 0, bytes);
+    return new (place - sizeof(ReflectiveCells)) ReflectiveCells(layout);
 }
 
 void ReflectiveCells::fill()

@@ -9,9 +9,11 @@
 
 namespace tarn::kiln::internal {
 
-/// The layout, a byte for the state of each slot that has a cell, and behind them a word for each.
+/// The layout, before it a byte for the state of each slot that has a cell, and before them a word
+/// for each.
 ///
-/// Lies in one piece of memory behind the element.
+/// Lies in one piece of memory just before the element, so that what is read first of an element
+/// and its first words are neighbours.
 ///
 /// Threads: as the element; collections may be entered by several threads at once.
 class ReflectiveCells
@@ -19,8 +21,8 @@ class ReflectiveCells
 public:
     /// All cells are empty.
     ///
-    /// \param place  of the size that the layout asks for.
-    static ReflectiveCells* create(void* place, ReflectiveLayout::Handle const& layout);
+    /// \param place  the end of as much room as the layout asks for.
+    static ReflectiveCells* create(std::byte* place, ReflectiveLayout::Handle const& layout);
     /// Frees what the cells hold, and not the place.
     void destroy();
 
@@ -32,7 +34,7 @@ public:
 
     /// Of a slot that has a cell, as in all that follows.
     ReflectiveCell get(ReflectiveSlot const& slot) const { return {word(slot), state(slot)}; }
-    /// \name Where the two lie: in all elements of the layout as far behind where these begin
+    /// \name Where the two lie: in all elements of the layout as far before this
     /// @{
     std::uint64_t const& word(ReflectiveSlot const& slot) const
     {
@@ -78,17 +80,17 @@ private:
     explicit ReflectiveCells(ReflectiveLayout::Handle const& layout) : m_layout(layout) {}
     ~ReflectiveCells() = default;
 
-    std::byte* at(std::size_t place) { return reinterpret_cast<std::byte*>(this) + place; }
+    std::byte* before(std::size_t place) { return reinterpret_cast<std::byte*>(this) - place; }
     std::uint64_t& word(ReflectiveSlot const& slot)
     {
-        return *reinterpret_cast<std::uint64_t*>(at(slot.wordAt()));
+        return *reinterpret_cast<std::uint64_t*>(before(slot.wordAt()));
     }
     CellState& state(ReflectiveSlot const& slot)
     {
-        return *reinterpret_cast<CellState*>(at(slot.stateAt()));
+        return *reinterpret_cast<CellState*>(before(slot.stateAt()));
     }
 
     ReflectiveLayout::Handle const m_layout;
 };
-static_assert(sizeof(ReflectiveCells) == ReflectiveLayout::CELLS_AT);
+static_assert(sizeof(ReflectiveCells) == ReflectiveLayout::LINK_SIZE);
 }  // namespace tarn::kiln::internal

@@ -150,8 +150,8 @@ void ReflectiveLayout::numberSlots()
     };
     constexpr std::size_t WORD = sizeof(std::uint64_t);
     auto const cells = std::count_if(m_slots.begin(), m_slots.end(), hasCell);
-    std::size_t stateAt = CELLS_AT;
-    std::size_t wordAt = CELLS_AT + (static_cast<std::size_t>(cells) + WORD - 1) / WORD * WORD;
+    std::size_t stateAt = 0;
+    std::size_t wordAt = (static_cast<std::size_t>(cells) + WORD - 1) / WORD * WORD;
     for (std::size_t number = 0; number < m_slots.size(); ++number)
     {
         if (!hasCell(m_slots[number]))
@@ -159,11 +159,11 @@ void ReflectiveLayout::numberSlots()
             m_slots[number].setPlaces(number, 0, 0);
             continue;
         }
-        m_slots[number].setPlaces(number, wordAt, stateAt);
         stateAt += sizeof(CellState);
         wordAt += WORD;
+        m_slots[number].setPlaces(number, wordAt, stateAt);
     }
-    m_cellBytes = wordAt;
+    m_cellBytes = wordAt + LINK_SIZE;
 }
 
 void ReflectiveLayout::listReferences()

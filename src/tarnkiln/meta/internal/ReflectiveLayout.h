@@ -29,8 +29,8 @@ class ReflectiveLayout : public support::Shared<ReflectiveLayout>
 public:
     using Handle = support::CountedPointer<ReflectiveLayout const>;
 
-    /// The link to the layout goes before the cells of an element.
-    static constexpr std::size_t CELLS_AT = sizeof(void*);
+    /// The link to the layout goes between the cells of an element and the element.
+    static constexpr std::size_t LINK_SIZE = sizeof(void*);
 
     /// The layout for new elements of `metaClass`.
     ///

@@ -39,8 +39,8 @@ public:
     SlotKind kind() const { return m_kind; }
     /// Its place among the slots of its layout.
     std::uint16_t number() const { return m_number; }
-    /// Where the word and the state of its cell lie, in bytes from the `ReflectiveCells` of an
-    /// element. Containers, which the element's link tells, have no cell; theirs are 0.
+    /// Where the word and the state of its cell lie, in bytes before the `ReflectiveCells` of
+    /// an element. Containers, which the element's link tells, have no cell; theirs are 0.
     std::size_t wordAt() const { return m_wordAt; }
     std::size_t stateAt() const { return m_stateAt; }
     void setPlaces(std::size_t number, std::size_t wordAt, std::size_t stateAt);
