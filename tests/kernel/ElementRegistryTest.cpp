@@ -4,6 +4,7 @@
 
 #include <gmock/gmock.h>
 
+#include <algorithm>
 #include <random>
 #include <unordered_set>
 
@@ -14,6 +15,7 @@ using namespace testkit;
 using support::ElementRegistry;
 using ::testing::IsEmpty;
 using ::testing::UnorderedElementsAre;
+using ::testing::UnorderedElementsAreArray;
 
 /// Elements that no model knows, and a registry of their own.
 class Registry : public ::testing::Test
@@ -156,6 +158,46 @@ TEST_F(AnElementRegistry, TakesElementsBackForWhichNoRoomWasKept)
     EXPECT_EQ(registry.size(), 200u);
     for (std::uint32_t i = 0; i < 200; ++i)
         EXPECT_EQ(registry.find(uuidOf(i)), elements[i]);
+}
+
+TEST_F(AnElementRegistry, VisitsEachElementOnceHoweverManyThereAre)
+{
+    std::vector<ModelElement::Impl*> elements;
+    for (std::uint32_t i = 0; i < 300; ++i)
+    {
+        ASSERT_THAT(all(), UnorderedElementsAreArray(elements));
+        elements.push_back(make(uuidOf(i)));
+        registry.insert(elements.back());
+    }
+}
+
+TEST_F(AnElementRegistry, LosesNoneAndTakesNoneTwiceWhileItGrowsAndShrinks)
+{
+    std::vector<ModelElement::Impl*> elements;
+    for (std::uint32_t i = 0; i < 20'000; ++i)
+    {
+        elements.push_back(make(uuidOf(i)));
+        ASSERT_TRUE(registry.insert(elements.back()));
+        ASSERT_FALSE(registry.insert(elements.back()));
+        ASSERT_EQ(registry.size(), i + 1);
+    }
+    std::shuffle(elements.begin(), elements.end(), std::mt19937(1));
+    auto const half = elements.begin() + 10'000;
+
+    std::for_each(elements.begin(), half, [&](auto* element) { registry.erase(element); });
+
+    EXPECT_EQ(registry.size(), 10'000u);
+    EXPECT_TRUE(std::none_of(elements.begin(), half,
+                             [&](auto* element) { return registry.find(element->getUuid()); }));
+    EXPECT_TRUE(std::all_of(half, elements.end(), [&](auto* element) {
+        return registry.find(element->getUuid()) == element;
+    }));
+    std::for_each(elements.begin(), half,
+                  [&](auto* element) { ASSERT_TRUE(registry.insert(element)); });
+    std::vector<ModelElement::Impl*> visited = all();
+    std::sort(visited.begin(), visited.end());
+    std::sort(elements.begin(), elements.end());
+    EXPECT_EQ(visited, elements);
 }
 
 TEST_F(AnElementRegistry, FindsElementsAmongOthersWhoseUuidsDifferInFewBits)
