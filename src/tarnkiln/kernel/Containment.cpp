@@ -311,4 +311,20 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
     }
     invalidate();
 }
+
+void ModelElement::Impl::_destroyEach(std::vector<ModelElement> elements, bool keepIncoming,
+                                      bool multiModel)
+{
+    // Far enough for an element to arrive, and then its entry in the table of elements.
+    constexpr std::size_t AHEAD = 8;
+    for (std::size_t i = 0; i < elements.size(); ++i) {
+        if (i + 2 * AHEAD < elements.size())
+            __builtin_prefetch(elements[i + 2 * AHEAD].getImpl(), /*rw=*/1);
+        ModelElement const element = std::move(elements[i]);
+        Model::Impl const* const model = element->getModelImpl();
+        if (model && i + AHEAD < elements.size())
+            model->m_elements.prefetch(elements[i + AHEAD]->getUuid());
+        element->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
+    }
+}
 } // namespace tarn::kiln

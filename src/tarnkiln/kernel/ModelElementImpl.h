@@ -196,6 +196,9 @@ public:
     /// Destroys the element and all that it contains, in the open transaction or its own.
     void destroy();
     void destroyRecursively(bool keepIncoming, bool removeFromContainer, bool multiModel);
+    /// Destroys each of `elements`, which stay in their containers, and lets go of it at once.
+    static void _destroyEach(std::vector<ModelElement> elements, bool keepIncoming,
+                             bool multiModel);
     /// @}
 
     /// \name Extensions

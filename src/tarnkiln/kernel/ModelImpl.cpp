@@ -429,12 +429,9 @@ void Model::Impl::destroyElements(bool multiModel)
 {
     bool const keepIncoming = m_validity == ElementValidity::ModelDestroying
                               || (m_dataSource && !multiModel);
-    std::vector<ModelElement> topLevel = m_topLevelElements.all();
-    while (!topLevel.empty()) { // from the back, where leaving the top level moves no other element
-        ModelElement const element = std::move(topLevel.back());
-        topLevel.pop_back();
-        element->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
-    }
+    std::vector<ModelElement> const& all = m_topLevelElements.all();
+    // from the back, where leaving the top level moves no other element
+    ModelElement::Impl::_destroyEach({all.rbegin(), all.rend()}, keepIncoming, multiModel);
 }
 
 void Model::Impl::destroyAllContents()

@@ -158,9 +158,6 @@ void ReflectiveModelElementImpl::disassociateIncoming()
 
 void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
 {
-    auto const destroyChild = [&](ModelElement const& child) {
-        child->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
-    };
     for (ReflectiveSlot const* const used : usedReferences(getCells()))
     {
         ReflectiveSlot const& slot = *used;
@@ -168,16 +165,17 @@ void ReflectiveModelElementImpl::doDestroy(bool keepIncoming, bool multiModel)
         if (slot.kind() == SlotKind::Reference)
         {
             if (isComposite)
-                destroyChild(ModelElement(cells().target(slot)));
+                cells().target(slot)->destroyRecursively(keepIncoming,
+                                                         /*removeFromContainer=*/false, multiModel);
             notifyModifying(slot.index());
             cells().setTarget(slot, ModelElement());
             continue;
         }
-        std::vector<ModelElement> const children = members(slot);
+        std::vector<ModelElement> children = members(slot);
         if (children.empty())
             continue;
         if (isComposite)
-            std::for_each(children.begin(), children.end(), destroyChild);
+            _destroyEach(std::move(children), keepIncoming, multiModel);
         _basicClear(static_cast<ReferenceCollection*>(cells().getCollection(slot)));
     }
 }

@@ -30,6 +30,14 @@ public:
     {
         return m_size == 0 ? nullptr : m_table[lookUp(id, hashOf(id)).at].element();
     }
+    /// Fetches what finding or erasing `id` will need; for one who knows it some steps ahead.
+    ///
+    /// Not left to the compiler: GCC 12 drops calls of functions that do nothing else.
+    [[gnu::always_inline]] void prefetch(UUID const& id) const
+    {
+        if (m_size != 0)
+            __builtin_prefetch(&m_table[home(hashOf(id))], /*rw=*/1);
+    }
     /// False if the UUID is taken.
     bool insert(ModelElement::Impl* element)
     {

@@ -15,6 +15,7 @@
 #include <algorithm>
 #include <type_traits>
 #include <typeinfo>
+#include <utility>
 #include <vector>
 
 namespace tarn::kiln::support {
@@ -534,12 +535,11 @@ struct Steps<References<FIELD, SLOT, MAKE, GETTER>> : NoSteps<SLOT>
     }
     static void destroy(Owner& element, bool keepIncoming, bool multiModel)
     {
-        std::vector<ModelElement> const present = members(element);
+        std::vector<ModelElement> present = members(element);
         if (present.empty())
             return;
         if (SLOT.composite)
-            for (ModelElement const& member : present)
-                member->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
+            ModelElement::Impl::_destroyEach(std::move(present), keepIncoming, multiModel);
         ModelElement::Impl::_basicClear(&made(element));
     }
     static void drop(Owner& element)
