@@ -62,6 +62,7 @@ bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property
 Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& property,
                                                    ReflectionPrivateTag const& tag) const
 {
+    getCells().prefetch();
     ReflectiveSlot const* const slot = readableSlot(property, tag);
     if (!slot)
         return ModelElement::Impl::getPropertyValue(
