@@ -38,8 +38,8 @@ protected:
     ModelElement proxyOf(ModelElement const& target, meta::Class const& metaClass,
                          bool namesModel = false)
     {
-        return ModelElement::createProxy(
-            model, metaClass, target->getPersistentProxyId(/*omitModel=*/!namesModel));
+        return ModelElement::createProxy(model, metaClass,
+                                         target->getPersistentProxyId(/*omitModel=*/!namesModel));
     }
     ModelElement danglingProxy(meta::Class const& metaClass)
     {

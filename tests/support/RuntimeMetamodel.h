@@ -172,9 +172,9 @@ public:
 
 /// \name Reading and writing by reflection, with all rights unless a tag is given
 /// @{
-inline Value valueOf(ModelElement const& element, meta::Property const& property,
-                     ModelElement::Impl::ReflectionPrivateTag const& tag =
-                         ModelElement::Impl::PRIVILEGED_ACCESS)
+inline Value
+valueOf(ModelElement const& element, meta::Property const& property,
+        ModelElement::Impl::ReflectionPrivateTag const& tag = ModelElement::Impl::PRIVILEGED_ACCESS)
 {
     return element->getPropertyValue(property, tag);
 }

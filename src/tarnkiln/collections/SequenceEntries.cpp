@@ -483,8 +483,7 @@ bool SequenceEntries::join(Inner& parent, unsigned left) noexcept
     if (to.count >= limit)
         return false;
     Node& from = *parent.children[left + 1];
-    if (to.count + from.count > static_cast<int>(limit) ||
-        to.owners.get() != 1 ||
+    if (to.count + from.count > static_cast<int>(limit) || to.owners.get() != 1 ||
         from.owners.get() != 1)
         return false;
 

@@ -36,4 +36,4 @@ protected:
     std::uint32_t m_handleCount = 0;
     meta::TransactionOrigin m_origin;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -2,11 +2,11 @@
 /// What a transaction remembers about one element.
 #pragma once
 #include "tarnkiln/kernel/ModelElementImpl.h"
-#include "tarnkiln/support/OldValues.h"
-#include "tarnkiln/support/SlotSet.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/Extension.h"
 #include "tarnkiln/meta/Property.h"
+#include "tarnkiln/support/OldValues.h"
+#include "tarnkiln/support/SlotSet.h"
 
 #include <boost/optional.hpp>
 
@@ -115,11 +115,12 @@ private:
     UUID m_id;
     Model::Impl* m_model;
     meta::Class m_metaClass;
-    [[no_unique_address]] support::SlotSet m_modified; ///< What comes next fits in behind.
+    [[no_unique_address]] support::SlotSet m_modified;  ///< What comes next fits in behind.
     std::uint32_t m_keepsElement : 1 = 0;
     std::uint32_t m_holderCount : 31 = 0;
-    ModelElement::Impl* m_element = nullptr; ///< Not to be followed unless it is kept.
-    std::unique_ptr<internal::ChangedExtensions> m_changedExtensions; ///< Null while there are none.
+    ModelElement::Impl* m_element = nullptr;  ///< Not to be followed unless it is kept.
+    std::unique_ptr<internal::ChangedExtensions>
+        m_changedExtensions;  ///< Null while there are none.
 };
 
 /// The record of a deep transaction: also the old values. Each class derives its own.
@@ -159,13 +160,13 @@ private:
     struct OldLink
     {
         ModelElement container;
-        meta::Property property; ///< Keeps what `feature` may point to.
+        meta::Property property;  ///< Keeps what `feature` may point to.
         Feature feature;
     };
-    static constexpr unsigned long LINK = 0; ///< No property has this slot.
+    static constexpr unsigned long LINK = 0;  ///< No property has this slot.
 
     void setOldContainer(ModelElement const& container, Feature const& feature);
 
-    support::OldValues m_oldValues; ///< And the `OldLink`, for few elements move.
+    support::OldValues m_oldValues;  ///< And the `OldLink`, for few elements move.
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

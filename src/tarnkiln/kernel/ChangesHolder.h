@@ -15,20 +15,15 @@ class TARNKILN_EXPORT ChangesHolder
 public:
     ChangesHolder() = default;
     /// Takes a share in `changes`, which may be null.
-    explicit ChangesHolder(ModelElement::Impl::Changes* changes)
-        : m_changes(changes)
+    explicit ChangesHolder(ModelElement::Impl::Changes* changes) : m_changes(changes)
     {
         if (m_changes)
             ++m_changes->m_holderCount;
     }
-    ChangesHolder(ChangesHolder const& other)
-        : ChangesHolder(other.m_changes)
-    {
-    }
+    ChangesHolder(ChangesHolder const& other) : ChangesHolder(other.m_changes) {}
     ChangesHolder(ChangesHolder&& other) noexcept
         : m_changes(std::exchange(other.m_changes, nullptr))
-    {
-    }
+    {}
     ~ChangesHolder()
     {
         if (m_changes && --m_changes->m_holderCount == 0)
@@ -49,4 +44,4 @@ public:
 private:
     ModelElement::Impl::Changes* m_changes = nullptr;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

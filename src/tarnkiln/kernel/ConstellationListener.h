@@ -17,4 +17,4 @@ public:
     virtual void modelDestroyed(ModelConstellation const& constellation, Model const& model) = 0;
     virtual void listenerRemoved(ModelConstellation const& constellation) = 0;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

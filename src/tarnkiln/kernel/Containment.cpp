@@ -23,7 +23,7 @@ constexpr int MAX_DESTRUCTION_DEPTH = 100;
 struct Waiting
 {
     ModelElement element;
-    ModelElement container; ///< To which the element still points.
+    ModelElement container;  ///< To which the element still points.
     bool keepIncoming;
     bool multiModel;
 };
@@ -33,7 +33,7 @@ struct Waiting
 struct Destructions
 {
     int depth = 0;
-    std::vector<Waiting>* waiting = nullptr; ///< Made by the outermost level of a deep tree.
+    std::vector<Waiting>* waiting = nullptr;  ///< Made by the outermost level of a deep tree.
 };
 
 /// Holds no object, so that it is found without a test whether it has been made.
@@ -49,23 +49,20 @@ constinit thread_local Destructions destructions;
 class DestructionLevel
 {
 public:
-    explicit DestructionLevel(Destructions& all)
-        : m_all(all)
-    {
-        ++m_all.depth;
-    }
+    explicit DestructionLevel(Destructions& all) : m_all(all) { ++m_all.depth; }
     DestructionLevel(DestructionLevel const&) = delete;
     DestructionLevel& operator=(DestructionLevel const&) = delete;
     ~DestructionLevel()
     {
         if (--m_all.depth == 0)
-            delete std::exchange(m_all.waiting, nullptr); // not empty after a failure only
+            delete std::exchange(m_all.waiting, nullptr);  // not empty after a failure only
     }
 
     /// Destroys what waits, if this is the outermost level.
     void finish() const
     {
-        while (m_all.depth == 1 && m_all.waiting && !m_all.waiting->empty()) {
+        while (m_all.depth == 1 && m_all.waiting && !m_all.waiting->empty())
+        {
             Waiting const next = std::move(m_all.waiting->back());
             m_all.waiting->pop_back();
             next.element->destroyRecursively(next.keepIncoming, /*removeFromContainer=*/false,
@@ -89,11 +86,7 @@ void postpone(Destructions& all, Waiting waiting)
 class SeparateDestruction
 {
 public:
-    SeparateDestruction()
-        : m_all(destructionsOfThread())
-        , m_outer(std::exchange(m_all, {}))
-    {
-    }
+    SeparateDestruction() : m_all(destructionsOfThread()), m_outer(std::exchange(m_all, {})) {}
     SeparateDestruction(SeparateDestruction const&) = delete;
     SeparateDestruction& operator=(SeparateDestruction const&) = delete;
     ~SeparateDestruction() { m_all = m_outer; }
@@ -103,7 +96,7 @@ private:
     Destructions m_outer;
 };
 
-} // namespace
+}  // namespace
 
 ModelElement ModelElement::Impl::container() const
 {
@@ -128,7 +121,8 @@ meta::Property::Impl* ModelElement::Impl::containmentFeatureImpl() const
 /// A dead element's container may lose its last handle before the dead element does.
 void ModelElement::Impl::pinContainer()
 {
-    if (m_container && !m_containerPinned) {
+    if (m_container && !m_containerPinned)
+    {
         m_container->addRef();
         m_containerPinned = true;
     }
@@ -136,7 +130,8 @@ void ModelElement::Impl::pinContainer()
 
 void ModelElement::Impl::unpinContainer()
 {
-    if (m_containerPinned) {
+    if (m_containerPinned)
+    {
         m_containerPinned = false;
         m_container->removeRef();
     }
@@ -168,7 +163,8 @@ void ModelElement::Impl::basicSetContainer(Impl* newContainer, Feature const& fe
                                            unsigned long index)
 {
     notifyModifying(index);
-    if (!newContainer || !feature) {
+    if (!newContainer || !feature)
+    {
         if (isTopLevel())
             return;
         announceContainerChange();
@@ -189,7 +185,8 @@ void ModelElement::Impl::basicSetContainer(Impl* newContainer, Feature const& fe
 void ModelElement::Impl::basicSetContainer(Storage const* storage)
 {
     Feature const feature = storage->getOldContainment();
-    if (!feature) {
+    if (!feature)
+    {
         m_model->m_topLevelElements.insertReturning(this);
         storeLink(nullptr, Feature());
         return;
@@ -225,11 +222,12 @@ void ModelElement::Impl::_basicSetUncontained(Impl* child)
 
 void ModelElement::Impl::checkCircularContainment(ModelElement const& candidate) const
 {
-    for (Impl const* above = candidate.getImpl(); above; above = above->basicContainer()) {
+    for (Impl const* above = candidate.getImpl(); above; above = above->basicContainer())
+    {
         if (above == this)
             reportException(tarnkiln::messages::CircularContainment());
         if (!m_everContainer)
-            return; // above nothing, however deep the candidate lies
+            return;  // above nothing, however deep the candidate lies
     }
 }
 
@@ -238,9 +236,10 @@ void ModelElement::Impl::checkCompatibleModel(Impl* other, Feature const& featur
     if (!other || !other->isLive())
         return;
     bool const sameModel = other->m_model == m_model;
-    if (feature.isComposite()) {
-        bool const elsewhere = other->isProxy() ? other->m_standIn->getModelName() != nullptr
-                                                : !sameModel;
+    if (feature.isComposite())
+    {
+        bool const elsewhere =
+            other->isProxy() ? other->m_standIn->getModelName() != nullptr : !sameModel;
         if (elsewhere)
             reportException(tarnkiln::messages::CannotCreateCrossModelAssociation());
         other->checkCircularContainment(ModelElement(const_cast<Impl*>(this)));
@@ -262,13 +261,15 @@ void ModelElement::Impl::destroy()
         return;
     ModelElement const keep(this);
     Model const model = getModel();
-    if (!model) {
-        invalidate(); // a proxy that outlived its model
+    if (!model)
+    {
+        invalidate();  // a proxy that outlived its model
         return;
     }
     bool const multiModel = model->isMultiModel();
     SeparateDestruction const separate;
-    if (model->getCurrentTransaction() && !model->getDataSource()) {
+    if (model->getCurrentTransaction() && !model->getDataSource())
+    {
         support::JoiningTransaction transaction(*this);
         destroyRecursively(/*keepIncoming=*/false, /*removeFromContainer=*/true, multiModel);
         transaction.commit();
@@ -289,13 +290,15 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
     if (!isLive())
         return;
     Destructions& ofThread = destructionsOfThread();
-    if (ofThread.depth == MAX_DESTRUCTION_DEPTH && !isProxy() && !removeFromContainer) {
+    if (ofThread.depth == MAX_DESTRUCTION_DEPTH && !isProxy() && !removeFromContainer)
+    {
         postpone(ofThread, {ModelElement(this), container(), keepIncoming, multiModel});
         return;
     }
     ModelElement const keep(this);
     DestructionLevel const level(ofThread);
-    if (!isProxy()) {
+    if (!isProxy())
+    {
         aboutToDestroy();
         notifyDestroying();
         if (!keepIncoming)
@@ -306,7 +309,8 @@ void ModelElement::Impl::destroyRecursively(bool keepIncoming, bool removeFromCo
         recordEndingExtensions();
         level.finish();
     }
-    else if (m_model && m_model->isRecording()) {
+    else if (m_model && m_model->isRecording())
+    {
         m_model->m_currentTransaction->proxyDestroying(this);
     }
     invalidate();
@@ -317,7 +321,8 @@ void ModelElement::Impl::_destroyEach(std::vector<ModelElement> elements, bool k
 {
     // Far enough for an element to arrive, and then its entry in the table of elements.
     constexpr std::size_t AHEAD = 8;
-    for (std::size_t i = 0; i < elements.size(); ++i) {
+    for (std::size_t i = 0; i < elements.size(); ++i)
+    {
         if (i + 2 * AHEAD < elements.size())
             __builtin_prefetch(elements[i + 2 * AHEAD].getImpl(), /*rw=*/1);
         ModelElement const element = std::move(elements[i]);
@@ -327,4 +332,4 @@ void ModelElement::Impl::_destroyEach(std::vector<ModelElement> elements, bool k
         element->destroyRecursively(keepIncoming, /*removeFromContainer=*/false, multiModel);
     }
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -11,7 +11,8 @@ namespace {
 meta::Package rootPackage(meta::Class const& type)
 {
     meta::Package package = type->getOwningPackage();
-    while (package) {
+    while (package)
+    {
         meta::Package const parent = package->getParentPackage();
         if (!parent)
             break;
@@ -20,19 +21,22 @@ meta::Package rootPackage(meta::Class const& type)
     return package;
 }
 
-} // namespace
+}  // namespace
 
 std::vector<meta::Package> DefaultModelUsageProvider::getUsedPackages() const
 {
     std::unordered_map<meta::Package, long, std::hash<ModelElement>> counts;
-    for (auto const& [metaClass, number] : m_elements) {
-        for (meta::Class type = metaClass; type; type = type->getSuperclass()) {
+    for (auto const& [metaClass, number] : m_elements)
+    {
+        for (meta::Class type = metaClass; type; type = type->getSuperclass())
+        {
             if (meta::Package const package = rootPackage(type))
                 counts[package] += number;
         }
     }
     std::vector<meta::Package> result;
-    for (auto const& [package, number] : counts) {
+    for (auto const& [package, number] : counts)
+    {
         if (number != 0)
             result.push_back(package);
     }
@@ -64,4 +68,4 @@ void DefaultModelUsageProvider::count(ModelElement::Impl const& element, long st
         m_last = &*m_elements.try_emplace(metaClass).first;
     m_last->second += step;
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

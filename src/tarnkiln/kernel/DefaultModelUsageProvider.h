@@ -26,6 +26,6 @@ private:
 
     /// Elements by class; packages are only looked for when they are asked for.
     std::unordered_map<meta::Class, long, std::hash<ModelElement>> m_elements;
-    std::pair<meta::Class const, long>* m_last = nullptr; ///< The entry that was changed last.
+    std::pair<meta::Class const, long>* m_last = nullptr;  ///< The entry that was changed last.
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -23,16 +23,12 @@ class TARNKILN_EXPORT ElementHandle
 {
 public:
     ElementHandle() = default;
-    ElementHandle(ElementHandle const& other) noexcept
-        : m_impl(other.m_impl)
+    ElementHandle(ElementHandle const& other) noexcept : m_impl(other.m_impl)
     {
         if (m_impl)
             m_impl->addRef();
     }
-    ElementHandle(ElementHandle&& other) noexcept
-        : m_impl(std::exchange(other.m_impl, nullptr))
-    {
-    }
+    ElementHandle(ElementHandle&& other) noexcept : m_impl(std::exchange(other.m_impl, nullptr)) {}
     ~ElementHandle()
     {
         if (m_impl)
@@ -40,7 +36,8 @@ public:
     }
     ElementHandle& operator=(ElementHandle const& other)
     {
-        if (this != &other) {
+        if (this != &other)
+        {
             if (other.m_impl)
                 other.m_impl->addRef();
             if (ElementImpl* const old = std::exchange(m_impl, other.m_impl))
@@ -71,8 +68,7 @@ public:
     ElementImpl* getElementImpl() const noexcept { return m_impl; }
 
 protected:
-    explicit ElementHandle(ElementImpl* impl) noexcept
-        : m_impl(impl)
+    explicit ElementHandle(ElementImpl* impl) noexcept : m_impl(impl)
     {
         if (m_impl)
             m_impl->addRef();

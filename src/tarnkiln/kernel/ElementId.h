@@ -32,4 +32,4 @@ private:
 
 /// Shows type and identifier to people, as `uuid:8d5a0ea6-...`.
 TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ElementId const& id);
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

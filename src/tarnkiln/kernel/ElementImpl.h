@@ -25,11 +25,11 @@ class TARNKILN_EXPORT ElementImpl
 public:
     enum class ElementValidity : signed char
     {
-        Invalid = 0,         ///< Destroyed, or rolled back out of existence: handles test false.
-        Constructing = 1,    ///< Not yet announced to its model; reflective proxies stay so.
-        Valid = 2,           ///< Live: changes are recorded.
-        ModelDestroying = 3, ///< A model that is being destroyed.
-        BuilderProxy = -1    ///< A proxy that a builder made.
+        Invalid = 0,          ///< Destroyed, or rolled back out of existence: handles test false.
+        Constructing = 1,     ///< Not yet announced to its model; reflective proxies stay so.
+        Valid = 2,            ///< Live: changes are recorded.
+        ModelDestroying = 3,  ///< A model that is being destroyed.
+        BuilderProxy = -1     ///< A proxy that a builder made.
     };
 
     /// Called with (element, null) when an element dies and with (null, collection) or
@@ -105,4 +105,4 @@ protected:
 private:
     std::atomic<bool> m_isPermanent{false};
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -17,4 +17,4 @@ public:
     /// Called when the model dies.
     virtual void listenerRemoved();
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

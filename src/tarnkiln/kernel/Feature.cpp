@@ -4,15 +4,12 @@
 
 namespace tarn::kiln {
 
-Feature::Feature(meta::Property const& property)
-    : Feature(property ? property.getImpl() : nullptr)
-{
-}
+Feature::Feature(meta::Property const& property) : Feature(property ? property.getImpl() : nullptr)
+{}
 
 Feature::Feature(meta::Property::Impl* property)
     : m_bits(reinterpret_cast<std::uintptr_t>(property))
-{
-}
+{}
 
 meta::Property::Impl* Feature::propertyImpl() const
 {
@@ -78,4 +75,4 @@ Feature Feature::opposite() const
         return Feature();
     return Feature(propertyImpl()->getOppositeImpl());
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

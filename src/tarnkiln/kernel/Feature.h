@@ -13,12 +13,12 @@ namespace tarn::kiln {
 /// that may itself be under construction. One constant for each property.
 struct Slot
 {
-    unsigned long index;                                ///< `propertyIndex`; from 1. Or `NO_INDEX`.
+    unsigned long index;  ///< `propertyIndex`; from 1. Or `NO_INDEX`.
     bool composite = false;
-    bool single = true;                                 ///< Upper bound 1.
-    bool keyed = false;                                 ///< A collection by a qualifying property.
-    Slot const* opposite = nullptr;                     ///< The other end; null if there is none.
-    meta::Property const& (*property)() = nullptr;      ///< Empty while its metamodel is being built.
+    bool single = true;                             ///< Upper bound 1.
+    bool keyed = false;                             ///< A collection by a qualifying property.
+    Slot const* opposite = nullptr;                 ///< The other end; null if there is none.
+    meta::Property const& (*property)() = nullptr;  ///< Empty while its metamodel is being built.
 };
 
 /// One property, given by its metamodel element or by a generated `Slot`; or none.
@@ -28,12 +28,9 @@ class TARNKILN_EXPORT Feature
 {
 public:
     Feature() = default;
-    Feature(meta::Property const& property);            ///< None, if `property` is not live.
+    Feature(meta::Property const& property);  ///< None, if `property` is not live.
     Feature(meta::Property::Impl* property);
-    Feature(Slot const& slot)
-        : m_bits(reinterpret_cast<std::uintptr_t>(&slot) | SLOT)
-    {
-    }
+    Feature(Slot const& slot) : m_bits(reinterpret_cast<std::uintptr_t>(&slot) | SLOT) {}
 
     /// Whether there is a property and it is not destroyed.
     explicit operator bool() const;
@@ -42,9 +39,9 @@ public:
 
     unsigned long index() const;
     bool isComposite() const;
-    bool isSingle() const;                              ///< Upper bound 1.
-    bool isKeyed() const;                               ///< Has a live qualifying property.
-    Feature opposite() const;                           ///< None, if it has no live opposite.
+    bool isSingle() const;     ///< Upper bound 1.
+    bool isKeyed() const;      ///< Has a live qualifying property.
+    Feature opposite() const;  ///< None, if it has no live opposite.
     /// The metamodel element; empty for a slot whose metamodel is being built.
     meta::Property property() const;
     meta::Property::Impl* propertyImpl() const;
@@ -60,4 +57,4 @@ private:
 
     std::uintptr_t m_bits = 0;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -6,7 +6,7 @@ namespace tarn::kiln {
 
 enum class FindElementBehavior : int
 {
-    InMemory = 0, ///< Only what the model holds now.
-    Fetch = 1     ///< The data source may load the element.
+    InMemory = 0,  ///< Only what the model holds now.
+    Fetch = 1      ///< The data source may load the element.
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -28,7 +28,7 @@ private:
     friend class Model::Thawer;
     struct State;
 
-    std::shared_ptr<State> m_state; ///< Shared with thawers, since both may be moved.
+    std::shared_ptr<State> m_state;  ///< Shared with thawers, since both may be moved.
 };
 
 /// Takes the freeze of one freezer back; only the outermost of several does any work.
@@ -47,4 +47,4 @@ private:
 
     std::shared_ptr<Freezer::State> m_state;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

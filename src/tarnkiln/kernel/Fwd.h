@@ -30,5 +30,5 @@ namespace internal {
 class NestedTransaction;
 class TransactionGroup;
 class TransactionImpl;
-} // namespace internal
-} // namespace tarn::kiln
+}  // namespace internal
+}  // namespace tarn::kiln

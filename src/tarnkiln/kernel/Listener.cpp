@@ -10,14 +10,13 @@ void Listener::listenerRemoved() {}
 
 ListenerHolderBase::ListenerHolderBase(Listener* listener, bool shallow, bool wantsPrepare,
                                        bool wantsValidate, bool wantsNotify, bool owned)
-    : m_listener(listener)
-    , m_shallow(shallow)
-    , m_wantsPrepare(wantsPrepare)
-    , m_wantsValidate(wantsValidate)
-    , m_wantsNotify(wantsNotify)
-    , m_owned(owned)
-{
-}
+    : m_listener(listener),
+      m_shallow(shallow),
+      m_wantsPrepare(wantsPrepare),
+      m_wantsValidate(wantsValidate),
+      m_wantsNotify(wantsNotify),
+      m_owned(owned)
+{}
 
 ListenerHolderBase::~ListenerHolderBase()
 {
@@ -30,4 +29,4 @@ ExtensionListener::~ExtensionListener() = default;
 void ExtensionListener::listenerRemoved() {}
 
 ConstellationListener::~ConstellationListener() = default;
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -52,4 +52,4 @@ private:
     bool m_wantsNotify;
     bool m_owned;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

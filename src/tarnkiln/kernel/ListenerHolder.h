@@ -30,47 +30,53 @@ namespace tarn::kiln {
 namespace internal {
 
 /// The report that a listener class takes.
-template <class L, bool Shallow>
-struct ReportOf
+template <class L, bool Shallow> struct ReportOf
 {
     using Type = ReportData;
     static Type& from(ReportData& data) { return data; }
 };
 
-template <class L>
-struct ReportOf<L, true>
+template <class L> struct ReportOf<L, true>
 {
     using Type = ShallowChangeReport<typename L::ElementType>;
     static Type from(ReportData& data) { return Type(data); }
 };
 
 template <class L, class Report>
-concept Preparing = requires(L listener, Report& report) { listener.transactionPreparing(report); };
-template <class L, class Report>
-concept Validating = requires(L listener, Report& report) {
-    { listener.transactionValidating(report) } -> std::convertible_to<bool>;
+concept Preparing = requires(L listener, Report& report)
+{
+    listener.transactionPreparing(report);
 };
 template <class L, class Report>
-concept Committed = requires(L listener, Report& report) { listener.transactionCommitted(report); };
+concept Validating = requires(L listener, Report& report)
+{
+    {
+        listener.transactionValidating(report)
+        } -> std::convertible_to<bool>;
+};
 template <class L, class Report>
-concept RolledBack = requires(L listener, Report& report) {
+concept Committed = requires(L listener, Report& report)
+{
+    listener.transactionCommitted(report);
+};
+template <class L, class Report>
+concept RolledBack = requires(L listener, Report& report)
+{
     listener.transactionRolledBack(report);
 };
-} // namespace internal
+}  // namespace internal
 
 /// Stands on a model's list for a listener of class `L` and keeps the latest report.
-template <class L, bool Shallow>
-class ListenerHolder final : public ListenerHolderBase
+template <class L, bool Shallow> class ListenerHolder final : public ListenerHolderBase
 {
     using Reports = internal::ReportOf<L, Shallow>;
     using Report = typename Reports::Type;
 
 public:
     ListenerHolder(L* listener, bool wantsPrepare, bool wantsValidate, bool wantsNotify, bool owned)
-        : ListenerHolderBase(listener, Shallow, wantsPrepare, wantsValidate, wantsNotify, owned)
-        , m_typed(listener)
-    {
-    }
+        : ListenerHolderBase(listener, Shallow, wantsPrepare, wantsValidate, wantsNotify, owned),
+          m_typed(listener)
+    {}
 
     /// A holder that wants what `listener` has methods for.
     static std::unique_ptr<ListenerHolder> forMethodsOf(L* listener, bool owned)
@@ -83,7 +89,8 @@ public:
     void prepare(std::shared_ptr<ReportData> const& report) override
     {
         m_report = report;
-        if constexpr (internal::Preparing<L, Report>) {
+        if constexpr (internal::Preparing<L, Report>)
+        {
             decltype(auto) typed = Reports::from(*report);
             m_typed->transactionPreparing(typed);
         }
@@ -91,18 +98,21 @@ public:
     bool validate(std::shared_ptr<ReportData> const& report) override
     {
         m_report = report;
-        if constexpr (internal::Validating<L, Report>) {
+        if constexpr (internal::Validating<L, Report>)
+        {
             decltype(auto) typed = Reports::from(*report);
             return m_typed->transactionValidating(typed);
         }
-        else {
+        else
+        {
             return true;
         }
     }
     void committed(std::shared_ptr<ReportData> const& report) override
     {
         m_report = report;
-        if constexpr (internal::Committed<L, Report>) {
+        if constexpr (internal::Committed<L, Report>)
+        {
             decltype(auto) typed = Reports::from(*report);
             m_typed->transactionCommitted(typed);
         }
@@ -110,7 +120,8 @@ public:
     void rolledBack(bool, std::shared_ptr<ReportData> const& report) override
     {
         m_report = report;
-        if constexpr (internal::RolledBack<L, Report>) {
+        if constexpr (internal::RolledBack<L, Report>)
+        {
             decltype(auto) typed = Reports::from(*report);
             m_typed->transactionRolledBack(typed);
         }
@@ -121,8 +132,7 @@ private:
     std::shared_ptr<ReportData> m_report;
 };
 
-template <class L>
-void Model::Impl::addShallowListener(L* listener)
+template <class L> void Model::Impl::addShallowListener(L* listener)
 {
     if (!isListening(listener))
         addListenerHolder(std::make_unique<ListenerHolder<L, true>>(
@@ -130,18 +140,16 @@ void Model::Impl::addShallowListener(L* listener)
             /*owned=*/false));
 }
 
-template <class L>
-void Model::Impl::addListener(L* listener)
+template <class L> void Model::Impl::addListener(L* listener)
 {
     if (!isListening(listener))
         addListenerHolder(ListenerHolder<L, false>::forMethodsOf(listener, /*owned=*/false));
 }
 
-template <class L>
-void Model::Impl::addOwnedListener(std::unique_ptr<L> listener)
+template <class L> void Model::Impl::addOwnedListener(std::unique_ptr<L> listener)
 {
     auto holder = ListenerHolder<L, false>::forMethodsOf(listener.get(), /*owned=*/true);
     static_cast<void>(listener.release());
     addListenerHolder(std::move(holder));
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

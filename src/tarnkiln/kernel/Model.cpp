@@ -7,10 +7,7 @@
 
 namespace tarn::kiln {
 
-Model::Model(Impl* impl)
-    : ElementHandle(impl)
-{
-}
+Model::Model(Impl* impl) : ElementHandle(impl) {}
 
 Model Model::create(ModelConstellation const& constellation)
 {
@@ -46,15 +43,15 @@ struct Model::Freezer::State
     int thawCount = 0;
 };
 
-Model::Freezer::Freezer(Model const& model)
-    : m_state(std::make_shared<State>(State{model}))
+Model::Freezer::Freezer(Model const& model) : m_state(std::make_shared<State>(State{model}))
 {
     ++model->m_freezeCount;
 }
 
 Model::Freezer& Model::Freezer::operator=(Freezer&& other) noexcept
 {
-    if (this != &other) {
+    if (this != &other)
+    {
         deactivate();
         m_state = std::move(other.m_state);
     }
@@ -81,8 +78,7 @@ Model::Thawer Model::Freezer::thaw()
     return Thawer(m_state);
 }
 
-Model::Thawer::Thawer(std::shared_ptr<Freezer::State> state)
-    : m_state(std::move(state))
+Model::Thawer::Thawer(std::shared_ptr<Freezer::State> state) : m_state(std::move(state))
 {
     if (m_state && ++m_state->thawCount == 1 && m_state->model)
         --m_state->model->m_freezeCount;
@@ -90,7 +86,8 @@ Model::Thawer::Thawer(std::shared_ptr<Freezer::State> state)
 
 Model::Thawer& Model::Thawer::operator=(Thawer&& other) noexcept
 {
-    if (this != &other) {
+    if (this != &other)
+    {
         deactivate();
         m_state = std::move(other.m_state);
     }
@@ -111,8 +108,7 @@ void Model::Thawer::deactivate()
 
 // ---------------------------------------------------------------------------- progress
 
-Model::ParseInProgressIndicator::ParseInProgressIndicator(Model const& model)
-    : m_model(model)
+Model::ParseInProgressIndicator::ParseInProgressIndicator(Model const& model) : m_model(model)
 {
     ++m_model->m_parseCount;
 }
@@ -135,4 +131,4 @@ Model::DataSourceLoadingInProgressIndicator::~DataSourceLoadingInProgressIndicat
     if (m_model.getImpl())
         --m_model->m_dataSourceLoadCount;
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

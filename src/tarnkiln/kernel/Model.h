@@ -20,11 +20,11 @@ namespace tarn::kiln {
 class TARNKILN_EXPORT Model : public ElementHandle
 {
 public:
-    class Impl;                                   // ModelImpl.h
-    class Freezer;                                // Freezer.h
-    class Thawer;                                 // Freezer.h
-    class ParseInProgressIndicator;               // ProgressIndicators.h
-    class DataSourceLoadingInProgressIndicator;   // ProgressIndicators.h
+    class Impl;                                  // ModelImpl.h
+    class Freezer;                               // Freezer.h
+    class Thawer;                                // Freezer.h
+    class ParseInProgressIndicator;              // ProgressIndicators.h
+    class DataSourceLoadingInProgressIndicator;  // ProgressIndicators.h
 
     Model() = default;
     explicit Model(Impl* impl);
@@ -45,6 +45,6 @@ public:
     static void initializeType(meta::MetaRegistry& registry);
 
     Impl* getImpl() const;
-    Impl* operator->() const; ///< All operations of the model; the handle must not be empty.
+    Impl* operator->() const;  ///< All operations of the model; the handle must not be empty.
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -15,10 +15,7 @@
 
 namespace tarn::kiln {
 
-ModelConstellation::ModelConstellation(Impl* impl)
-    : ElementHandle(impl)
-{
-}
+ModelConstellation::ModelConstellation(Impl* impl) : ElementHandle(impl) {}
 
 ModelConstellation ModelConstellation::create()
 {
@@ -28,11 +25,10 @@ ModelConstellation ModelConstellation::create()
 ConstellationListenerHolder::ConstellationListenerHolder(ConstellationListener* listener,
                                                          ModelConstellation::Impl* constellation,
                                                          bool owned)
-    : m_listener(listener)
-    , m_constellation(constellation)
-    , m_owned(owned)
-{
-}
+    : m_listener(listener),
+      m_constellation(constellation),
+      m_owned(owned)
+{}
 
 ConstellationListenerHolder::~ConstellationListenerHolder()
 {
@@ -41,10 +37,7 @@ ConstellationListenerHolder::~ConstellationListenerHolder()
         delete m_listener;
 }
 
-ModelConstellation::Impl::Impl()
-    : ElementImpl(UUID{}, ElementValidity::Valid)
-{
-}
+ModelConstellation::Impl::Impl() : ElementImpl(UUID{}, ElementValidity::Valid) {}
 
 ModelConstellation::Impl::~Impl()
 {
@@ -72,8 +65,7 @@ void ModelConstellation::Impl::removeRef()
 class ModelConstellation::Impl::ListenerWalk
 {
 public:
-    explicit ListenerWalk(Impl& constellation)
-        : m_constellation(constellation)
+    explicit ListenerWalk(Impl& constellation) : m_constellation(constellation)
     {
         ++m_constellation.m_listenerWalks;
     }
@@ -89,11 +81,11 @@ private:
     Impl& m_constellation;
 };
 
-template <class Tell>
-void ModelConstellation::Impl::forEachListener(Tell const& tell)
+template <class Tell> void ModelConstellation::Impl::forEachListener(Tell const& tell)
 {
     ListenerWalk const walk(*this);
-    for (std::size_t i = 0; i < m_listeners.size(); ++i) {
+    for (std::size_t i = 0; i < m_listeners.size(); ++i)
+    {
         if (m_listeners[i])
             tell(*m_listeners[i]->getListener());
     }
@@ -154,9 +146,8 @@ void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)
     namesChanged();
     model->basicSetModelConstellation(this);
     ModelConstellation const self(this);
-    forEachListener([&](ConstellationListener& listener) {
-        listener.modelAdded(self, Model(model));
-    });
+    forEachListener(
+        [&](ConstellationListener& listener) { listener.modelAdded(self, Model(model)); });
     if (m_group && !model->getCurrentTransaction())
         model->doBeginTransaction(m_group.get(), m_group->getOrigin());
     m_uriHistory[model->getModelURI()] = UriRecord{model, ustring()};
@@ -166,22 +157,25 @@ void ModelConstellation::Impl::addModelToConstellation(Model::Impl* model)
 void ModelConstellation::Impl::modelIsDestroyed(Model::Impl* model)
 {
     ModelConstellation const self(this);
-    forEachListener([&](ConstellationListener& listener) {
-        listener.modelDestroyed(self, Model(model));
-    });
+    forEachListener(
+        [&](ConstellationListener& listener) { listener.modelDestroyed(self, Model(model)); });
     auto const found = m_models.find(model->getLocationModelId());
     if (found != m_models.end() && found->second == model)
         m_models.erase(found);
     namesChanged();
     bool const inMemory = model->getModelURI().find(u"memory://") == 0;
-    for (auto record = m_uriHistory.begin(); record != m_uriHistory.end();) {
-        if (record->second.model != model) {
+    for (auto record = m_uriHistory.begin(); record != m_uriHistory.end();)
+    {
+        if (record->second.model != model)
+        {
             ++record;
         }
-        else if (inMemory) {
+        else if (inMemory)
+        {
             record = m_uriHistory.erase(record);
         }
-        else {
+        else
+        {
             record->second = UriRecord{nullptr, model->getModelURI()};
             ++record;
         }
@@ -191,7 +185,7 @@ void ModelConstellation::Impl::modelIsDestroyed(Model::Impl* model)
 void ModelConstellation::Impl::modelIsNotExternallyReferenced(Model::Impl*)
 {
     addRef();
-    removeRef(); // deletes this, and the model with it, when nobody holds any of them
+    removeRef();  // deletes this, and the model with it, when nobody holds any of them
 }
 
 void ModelConstellation::Impl::modelURIAboutToChange(ustring const& oldId, ustring const& newId)
@@ -284,9 +278,11 @@ void ModelConstellation::Impl::removeConstellationListener(ConstellationListener
 void ModelConstellation::Impl::createTransactionGroup(bool deep,
                                                       meta::TransactionOrigin const& origin)
 {
-    if (m_group) {
+    if (m_group)
+    {
         // a listener begins on a model that is just being added: it joins now
-        for (auto const& [location, model] : m_models) {
+        for (auto const& [location, model] : m_models)
+        {
             if (!model->getCurrentTransaction())
                 model->doBeginTransaction(m_group.get(), m_group->getOrigin());
         }
@@ -294,11 +290,13 @@ void ModelConstellation::Impl::createTransactionGroup(bool deep,
     }
     m_group = std::make_unique<internal::TransactionGroup>(
         this, deep || isMultiModelConstellation(), origin);
-    try {
+    try
+    {
         for (auto const& [location, model] : m_models)
             model->doBeginTransaction(m_group.get(), origin);
     }
-    catch (...) {
+    catch (...)
+    {
         m_group->rollBack();
         throw;
     }
@@ -319,6 +317,7 @@ void ModelConstellation::Impl::destroy()
     for (Model const& model : getModels())
         model->destroy();
     invalidate();
-    forEachListener([&](ConstellationListener& listener) { removeConstellationListener(&listener); });
+    forEachListener(
+        [&](ConstellationListener& listener) { removeConstellationListener(&listener); });
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -13,7 +13,7 @@ namespace tarn::kiln {
 class TARNKILN_EXPORT ModelConstellation : public ElementHandle
 {
 public:
-    class Impl; // ModelConstellationImpl.h
+    class Impl;  // ModelConstellationImpl.h
 
     ModelConstellation() = default;
     explicit ModelConstellation(Impl* impl);
@@ -28,4 +28,4 @@ public:
     Impl* getImpl() const;
     Impl* operator->() const;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

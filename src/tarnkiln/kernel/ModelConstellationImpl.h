@@ -40,7 +40,7 @@ public:
     ~Impl() override;
 
     // ElementImpl
-    Model getModel() const override; ///< Empty: a constellation lies in no model.
+    Model getModel() const override;  ///< Empty: a constellation lies in no model.
     meta::Class const& getMetaClass() const override;
     void removeRef() override;
 
@@ -69,8 +69,8 @@ public:
     void modelURIAboutToChange(ustring const& oldId, ustring const& newId);
     /// Where a model that once had the URI is now, or would be reloaded from.
     ustring getLatestModelURI(ustring const& uri) const;
-    /// The model that has the URI or once had it, if no normalizer needs to be asked; else null. May
-    /// be dead.
+    /// The model that has the URI or once had it, if no normalizer needs to be asked; else null.
+    /// May be dead.
     Model::Impl* findListed(ustring const& uri) const;
     /// As long as it is the same, each model of this constellation has the URIs that it had; no two
     /// constellations have the same one.
@@ -109,15 +109,14 @@ private:
     ustring const& latestModelURI(ustring const& uri) const;
 
     /// Calls `tell(listener)` for each; listeners may come and go meanwhile.
-    template <class Tell>
-    void forEachListener(Tell const& tell);
+    template <class Tell> void forEachListener(Tell const& tell);
 
-    std::map<ustring, Model::Impl*> m_models; ///< By location.
+    std::map<ustring, Model::Impl*> m_models;  ///< By location.
     std::unique_ptr<internal::TransactionGroup> m_group;
-    std::map<ustring, UriRecord> m_uriHistory; ///< Where a URI has gone.
+    std::map<ustring, UriRecord> m_uriHistory;  ///< Where a URI has gone.
     std::uint64_t m_namesVersion = nextNamesVersion();
     std::vector<std::unique_ptr<ConstellationListenerHolder>> m_listeners;
-    int m_listenerWalks = 0; ///< Under way: who is removed meanwhile leaves a null.
+    int m_listenerWalks = 0;  ///< Under way: who is removed meanwhile leaves a null.
 };
 
 inline ModelConstellation::Impl* ModelConstellation::getImpl() const
@@ -128,4 +127,4 @@ inline ModelConstellation::Impl* ModelConstellation::operator->() const
 {
     return static_cast<Impl*>(m_impl);
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

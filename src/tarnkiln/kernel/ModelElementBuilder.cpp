@@ -18,25 +18,20 @@ namespace {
 /// The last made of those of this thread, which is linked to the one before it.
 thread_local constinit ModelElement::Builder::Orchestrator* orchestrators = nullptr;
 
-} // namespace
+}  // namespace
 
-ModelElement::Impl::Impl(Builder& builder, UUID const& id)
-    : Impl(builder.getModel(), id)
+ModelElement::Impl::Impl(Builder& builder, UUID const& id) : Impl(builder.getModel(), id)
 {
     if (builder.getOrchestrator())
         builder.getOrchestrator()->registerCreatedElement(&builder, this);
 }
 
 ModelElement::Builder::Builder(Model const& model, unsigned long bits)
-    : m_setProperties(bits)
-    , m_model(model)
-{
-}
+    : m_setProperties(bits),
+      m_model(model)
+{}
 
-ModelElement::Builder::Builder(unsigned long bits)
-    : m_setProperties(bits)
-{
-}
+ModelElement::Builder::Builder(unsigned long bits) : m_setProperties(bits) {}
 
 ModelElement::Builder::~Builder()
 {
@@ -46,14 +41,14 @@ ModelElement::Builder::~Builder()
 
 void ModelElement::Builder::setOrAdd(meta::Property const& property, Value const&)
 {
-    reportException(tarnkiln::messages::NoSuchProperty(
-        property ? property->getName() : ustring(), internal::qualifiedName(getMetaClass())));
+    reportException(tarnkiln::messages::NoSuchProperty(property ? property->getName() : ustring(),
+                                                       internal::qualifiedName(getMetaClass())));
 }
 
 void ModelElement::Builder::setOrAdd(meta::Property const& property, std::unique_ptr<Builder>)
 {
-    reportException(tarnkiln::messages::NoSuchProperty(
-        property ? property->getName() : ustring(), internal::qualifiedName(getMetaClass())));
+    reportException(tarnkiln::messages::NoSuchProperty(property ? property->getName() : ustring(),
+                                                       internal::qualifiedName(getMetaClass())));
 }
 
 ModelElement ModelElement::Builder::create(UUID const& id)
@@ -83,12 +78,12 @@ Model const& modelOf(ModelElement::Builder const& builder)
         reportException(tarnkiln::messages::CannotCreateWithoutModel());
     return builder.getModel();
 }
-} // namespace
+}  // namespace
 
 ModelElement::Builder::Orchestrator::Orchestrator(Builder* builder)
-    : m_model(modelOf(*builder))
-    , m_transaction(m_model->beginTransaction(/*revertible=*/true))
-    , m_step(m_model.getImpl())
+    : m_model(modelOf(*builder)),
+      m_transaction(m_model->beginTransaction(/*revertible=*/true)),
+      m_step(m_model.getImpl())
 {
     if (m_model->isFrozen())
         reportException(tarnkiln::messages::ModelFrozen());
@@ -105,11 +100,12 @@ ModelElement::Builder::Orchestrator::~Orchestrator()
     *link = m_next;
 }
 
-void ModelElement::Builder::Orchestrator::constructionFailed(
-    ModelElement::Impl const* element)
+void ModelElement::Builder::Orchestrator::constructionFailed(ModelElement::Impl const* element)
 {
-    for (Orchestrator* each = orchestrators; each; each = each->m_next) {
-        for (auto& [builder, created] : each->m_created) {
+    for (Orchestrator* each = orchestrators; each; each = each->m_next)
+    {
+        for (auto& [builder, created] : each->m_created)
+        {
             if (created.getImpl() == element)
                 created = ModelElement();
         }
@@ -161,4 +157,4 @@ void ModelElement::Builder::Orchestrator::releaseBuilders()
         entry.first->m_orchestrator = nullptr;
     m_created.clear();
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

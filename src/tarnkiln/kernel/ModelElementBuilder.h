@@ -98,6 +98,6 @@ private:
     Transaction m_transaction;
     support::OpenStep m_step;
     std::map<Builder*, ModelElement> m_created;
-    Orchestrator* m_next = nullptr; ///< Of those of this thread.
+    Orchestrator* m_next = nullptr;  ///< Of those of this thread.
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -31,9 +31,9 @@ namespace {
 [[noreturn]] void reportNoSuchProperty(ModelElement::Impl const& element,
                                        meta::Property const& property)
 {
-    reportException(tarnkiln::messages::NoSuchProperty(
-        property ? property->getName() : ustring(),
-        internal::qualifiedName(element.getMetaClass())));
+    reportException(
+        tarnkiln::messages::NoSuchProperty(property ? property->getName() : ustring(),
+                                           internal::qualifiedName(element.getMetaClass())));
 }
 
 /// Whether an element that refers to many by `feature` is among many by the opposite too.
@@ -42,11 +42,11 @@ bool isListedByBothEnds(Feature const& feature)
     return !feature.isSingle() && !feature.isComposite() && !feature.opposite().isComposite();
 }
 
-} // namespace
+}  // namespace
 
 ModelElement::Impl::Impl(Model const& model, UUID const& id)
-    : ElementImpl(id, ElementValidity::Constructing)
-    , m_model(model.getImpl())
+    : ElementImpl(id, ElementValidity::Constructing),
+      m_model(model.getImpl())
 {
     if (!model)
         reportException(tarnkiln::messages::CannotCreateWithoutModel());
@@ -56,15 +56,17 @@ ModelElement::Impl::~Impl()
 {
     bool const isHeld = m_refCount.get() != 0;
     m_refCount.set(REFCOUNT_DELETING);
-    if (isHeld) // by an orchestrator: the constructor of a derived class has failed
+    if (isHeld)  // by an orchestrator: the constructor of a derived class has failed
         Builder::Orchestrator::constructionFailed(this);
-    if (isProxy()) {
+    if (isProxy())
+    {
         if (m_isStandInInside)
             std::destroy_at(m_standIn);
         else
             delete m_standIn;
     }
-    else if (static_cast<signed char>(m_validity) > 0) {
+    else if (static_cast<signed char>(m_validity) > 0)
+    {
         m_model->remove(this);
     }
     unpinContainer();
@@ -83,7 +85,8 @@ void ModelElement::Impl::anchor()
         return;
     support::ModelAnchor* const anchor = m_model->m_anchor.get();
     anchor->addRef();
-    if (internal::ExtensionValues* const values = extensionValues()) {
+    if (internal::ExtensionValues* const values = extensionValues())
+    {
         values->anchor = anchor;
         return;
     }
@@ -96,10 +99,12 @@ void ModelElement::Impl::unanchor()
     support::ModelAnchor* const anchor = anchorImpl();
     if (!anchor)
         return;
-    if (internal::ExtensionValues* const values = extensionValues()) {
+    if (internal::ExtensionValues* const values = extensionValues())
+    {
         values->anchor = nullptr;
     }
-    else {
+    else
+    {
         m_aside = Aside::Nothing;
         m_anchor = nullptr;
     }
@@ -219,8 +224,7 @@ void ModelElement::Impl::aboutToDestroy() {}
 void ModelElement::Impl::didCreate() {}
 void ModelElement::Impl::basicDisassociateAll() {}
 void ModelElement::Impl::convertToProxy(meta::Property const&, ProxyId const&, ModelElement const&)
-{
-}
+{}
 void ModelElement::Impl::visitReferences(ReferenceVisitor const&) const {}
 
 void ModelElement::Impl::copyValue(Storage*, unsigned long index) const
@@ -271,8 +275,8 @@ ModelElement::Impl* ModelElement::Impl::basicGetReference(Slot const&) const
 
 void ModelElement::Impl::notifyModifying(unsigned long index)
 {
-    if (index != NO_INDEX && m_validity == ElementValidity::Valid
-        && !internal::isChangedInSilence(*m_model))
+    if (index != NO_INDEX && m_validity == ElementValidity::Valid &&
+        !internal::isChangedInSilence(*m_model))
         m_model->elementModifying(this, index);
 }
 
@@ -319,7 +323,8 @@ void ModelElement::Impl::offerRoom(void* room)
 void ModelElement::Impl::_becomeProxy(ProxyId const& id, ElementValidity validity)
 {
     m_isStandInInside = m_aside == Aside::Room;
-    m_standIn = m_isStandInInside ? new (m_standIn) internal::StandIn(*this, id, *m_model->m_proxies)
+    m_standIn = m_isStandInInside ? new (m_standIn)
+                                        internal::StandIn(*this, id, *m_model->m_proxies)
                                   : new internal::StandIn(*this, id, *m_model->m_proxies);
     m_aside = Aside::StandIn;
     m_validity = validity;
@@ -416,4 +421,4 @@ void ModelElement::Impl::_loadCollectionContents(ReferenceCollection* collection
     if (model && model->getDataSource())
         model->getDataSource()->loadCollectionContents(collection);
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -23,7 +23,7 @@ namespace internal {
 class ExtensionValues;
 class InvariantChecker;
 class StandIn;
-}
+}  // namespace internal
 namespace support {
 class TopLevelElements;
 }
@@ -37,15 +37,15 @@ class TopLevelElements;
 class TARNKILN_EXPORT ModelElement::Impl : public ElementImpl
 {
 public:
-    class Changes;      // Changes.h
-    class Storage;      // Changes.h
-    class DynamicValue; // DynamicValue.h
+    class Changes;       // Changes.h
+    class Storage;       // Changes.h
+    class DynamicValue;  // DynamicValue.h
 
     using ReflectionPrivateTag = internal::ReflectionPrivateTag;
-    static ReflectionPrivateTag const PUBLIC_ACCESS;     ///< What any client may do.
-    static ReflectionPrivateTag const PRIVILEGED_ACCESS; ///< Passes accessor and mutator rights.
-    static ReflectionPrivateTag const NO_PROXY_RESOLVE;  ///< Privileged; leaves proxies alone.
-    static ReflectionPrivateTag const IN_MEMORY_ONLY;    ///< Privileged; loads nothing.
+    static ReflectionPrivateTag const PUBLIC_ACCESS;      ///< What any client may do.
+    static ReflectionPrivateTag const PRIVILEGED_ACCESS;  ///< Passes accessor and mutator rights.
+    static ReflectionPrivateTag const NO_PROXY_RESOLVE;   ///< Privileged; leaves proxies alone.
+    static ReflectionPrivateTag const IN_MEMORY_ONLY;     ///< Privileged; loads nothing.
 
     /// Stands for "no property": a change under it is not recorded.
     static constexpr unsigned long NO_INDEX = ~0UL;
@@ -73,11 +73,11 @@ public:
     virtual void setPropertyValue(meta::Property const& property, Value const& value,
                                   ReflectionPrivateTag const& tag);
     /// @}
-    /// Whether all elements of this C++ class are of one metaclass, and `getPropertyValue` gives what
-    /// `findStoredField` leads to. Not so in classes that override one of the two by hand.
+    /// Whether all elements of this C++ class are of one metaclass, and `getPropertyValue` gives
+    /// what `findStoredField` leads to. Not so in classes that override one of the two by hand.
     virtual bool isReadByFields() const { return false; }
-    /// Where this element keeps the value of `property`; nothing if it is computed or unknown. To be
-    /// asked only if `isReadByFields`.
+    /// Where this element keeps the value of `property`; nothing if it is computed or unknown. To
+    /// be asked only if `isReadByFields`.
     virtual StoredField findStoredField(meta::Property const& property) const;
     /// Calls an operation by reflection, and gives its result if it has one.
     ///
@@ -289,8 +289,8 @@ public:
 protected:
     /// Tells the invalidate callback, if there is one, that `collection` dies with this element.
     void collectionInvalidated(AbstractOwnedCollection* collection);
-    /// Gives an element that is about to become a proxy room for what makes it one, in its own memory
-    /// and for as long as that lasts.
+    /// Gives an element that is about to become a proxy room for what makes it one, in its own
+    /// memory and for as long as that lasts.
     void offerRoom(void* room);
 
 private:
@@ -331,33 +331,30 @@ private:
     enum class Aside : unsigned char
     {
         Nothing,
-        Room,    ///< Where the stand-in may be made.
-        StandIn, ///< Of a proxy, dead or not.
-        Anchor,  ///< Of any other dead element.
-        Extensions ///< Of an element that was given any, dead or not; with the anchor.
+        Room,       ///< Where the stand-in may be made.
+        StandIn,    ///< Of a proxy, dead or not.
+        Anchor,     ///< Of any other dead element.
+        Extensions  ///< Of an element that was given any, dead or not; with the anchor.
     };
 
-    bool m_containerPinned : 1 = false; ///< A dead element keeps its container in memory.
-    bool m_everContainer : 1 = false;   ///< Some element was in it once.
-    bool m_isStandInInside : 1 = false; ///< In memory of the element's own.
-    mutable Aside m_aside = Aside::Nothing; ///< Reading an extension may make its collection.
+    bool m_containerPinned : 1 = false;      ///< A dead element keeps its container in memory.
+    bool m_everContainer : 1 = false;        ///< Some element was in it once.
+    bool m_isStandInInside : 1 = false;      ///< In memory of the element's own.
+    mutable Aside m_aside = Aside::Nothing;  ///< Reading an extension may make its collection.
     std::uint32_t m_topLevelIndex = NOT_TOP_LEVEL;
-    std::uint32_t m_recordPlace = NOT_RECORDED; ///< In the last transaction that recorded it.
+    std::uint32_t m_recordPlace = NOT_RECORDED;  ///< In the last transaction that recorded it.
     Impl* m_container = nullptr;
-    Feature m_containmentFeature; ///< The container's; null for a top-level element.
-    Model::Impl* m_model; ///< Not to be followed in a dead element, which has an anchor.
+    Feature m_containmentFeature;  ///< The container's; null for a top-level element.
+    Model::Impl* m_model;          ///< Not to be followed in a dead element, which has an anchor.
     union
     {
-        internal::StandIn* m_standIn = nullptr;               ///< Owned.
-        support::ModelAnchor* m_anchor;                       ///< Counted.
-        mutable internal::ExtensionValues* m_extensionValues; ///< Owned.
+        internal::StandIn* m_standIn = nullptr;                ///< Owned.
+        support::ModelAnchor* m_anchor;                        ///< Counted.
+        mutable internal::ExtensionValues* m_extensionValues;  ///< Owned.
     };
 };
 
-inline ModelElement::ModelElement(Impl* impl)
-    : ElementHandle(impl)
-{
-}
+inline ModelElement::ModelElement(Impl* impl) : ElementHandle(impl) {}
 inline ModelElement::Impl* ModelElement::getImpl() const
 {
     return static_cast<Impl*>(m_impl);
@@ -366,4 +363,4 @@ inline ModelElement::Impl* ModelElement::operator->() const
 {
     return static_cast<Impl*>(m_impl);
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

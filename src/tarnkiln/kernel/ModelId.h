@@ -25,4 +25,4 @@ struct TARNKILN_EXPORT ModelId
 
 /// Shows the whole id to people.
 TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ModelId const& id);
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -30,18 +30,19 @@ namespace {
 
 std::atomic<unsigned long> modelsCreated{0};
 
-} // namespace
+}  // namespace
 
 Model::Impl::Impl(UUID const& id, ModelConstellation const& constellation)
-    : ElementImpl(id, ElementValidity::Valid)
-    , m_proxies(std::make_unique<internal::StandIns>())
-    , m_modelCounter(++modelsCreated)
-    , m_anchor(new support::ModelAnchor(this))
-    , m_extensions(std::make_unique<internal::DeclaredExtensions>(m_modelCounter))
-    , m_usageProvider(std::make_unique<DefaultModelUsageProvider>())
-    , m_transactionFactory(std::make_unique<internal::LocalTransactionFactoryImpl>(*this))
+    : ElementImpl(id, ElementValidity::Valid),
+      m_proxies(std::make_unique<internal::StandIns>()),
+      m_modelCounter(++modelsCreated),
+      m_anchor(new support::ModelAnchor(this)),
+      m_extensions(std::make_unique<internal::DeclaredExtensions>(m_modelCounter)),
+      m_usageProvider(std::make_unique<DefaultModelUsageProvider>()),
+      m_transactionFactory(std::make_unique<internal::LocalTransactionFactoryImpl>(*this))
 {
-    if (constellation) {
+    if (constellation)
+    {
         m_modelURI = u"memory://" + sill::i18n::to_ustring(std::to_string(m_modelCounter));
         m_locationModelId = m_modelURI;
     }
@@ -69,7 +70,7 @@ void Model::Impl::removeRef()
     if (!m_refCount.decrement())
         return;
     if (m_constellation)
-        m_constellation->modelIsNotExternallyReferenced(this); // may delete this
+        m_constellation->modelIsNotExternallyReferenced(this);  // may delete this
     else
         delete this;
 }
@@ -115,8 +116,9 @@ void Model::Impl::elementCreated(ModelElement::Impl* element, bool topLevel)
 {
     validateTransaction();
     m_anchor.get()->changed();
-    if (!m_elements.insert(element)) {
-        element->m_uuid = UUID{}; // its destructor must not find the other element
+    if (!m_elements.insert(element))
+    {
+        element->m_uuid = UUID{};  // its destructor must not find the other element
         reportException(tarnkiln::messages::UUIDConflict());
     }
     if (topLevel)
@@ -124,11 +126,13 @@ void Model::Impl::elementCreated(ModelElement::Impl* element, bool topLevel)
     bool const recording = isRecording();
     if (recording)
         m_currentTransaction->elementCreated(element);
-    try {
+    try
+    {
         if (m_usageProvider)
             m_usageProvider->elementCreated(element);
     }
-    catch (...) {
+    catch (...)
+    {
         if (recording)
             m_currentTransaction->forgetCreation(element);
         throw;
@@ -140,8 +144,10 @@ void Model::Impl::elementCreated(ModelElement::Impl* element, bool topLevel)
 void Model::Impl::elementDestroying(ModelElement::Impl* element)
 {
     validateTransaction();
-    if (isRecording()) {
-        if (m_currentTransaction->isDeep()) {
+    if (isRecording())
+    {
+        if (m_currentTransaction->isDeep())
+        {
             m_elements.reserveReturn();
             if (element->isTopLevel())
                 m_topLevelElements.reserveReturn();
@@ -194,12 +200,13 @@ void Model::Impl::remove(ModelElement::Impl* element)
 
 void Model::Impl::resurrectElement(ModelElement::Impl* element)
 {
-    if (element->isProxy()) {
+    if (element->isProxy())
+    {
         element->m_validity = ElementValidity::BuilderProxy;
         return;
     }
     if (m_elements.contains(element))
-        return; // its destruction failed before it began
+        return;  // its destruction failed before it began
     element->m_validity = ElementValidity::Valid;
     element->unpinContainer();
     element->unanchor();
@@ -226,9 +233,9 @@ void Model::Impl::addListenerHolder(std::unique_ptr<ListenerHolderBase> holder)
 
 void Model::Impl::removeListener(Listener* listener)
 {
-    auto const found = std::find_if(m_listeners.begin(), m_listeners.end(), [&](auto const& holder) {
-        return holder->getListener() == listener;
-    });
+    auto const found =
+        std::find_if(m_listeners.begin(), m_listeners.end(),
+                     [&](auto const& holder) { return holder->getListener() == listener; });
     if (found == m_listeners.end())
         return;
     std::unique_ptr<ListenerHolderBase> const removed = std::move(*found);
@@ -269,9 +276,10 @@ void Model::Impl::setModelURI(ustring const& uri)
     if (!m_constellation)
         reportException(tarnkiln::messages::InvalidValue());
     ustring const location = services::ModelIdNormalizer::convertToLocationModelId(uri);
-    if (location != m_locationModelId) {
+    if (location != m_locationModelId)
+    {
         m_constellation->modelURIAboutToChange(m_locationModelId, location);
-        m_locationModelId = location; // at once: what follows may fail
+        m_locationModelId = location;  // at once: what follows may fail
     }
     m_modelURI = services::ModelIdNormalizer::convertToExternalModelId(location);
     m_constellation->namesChanged();
@@ -354,8 +362,8 @@ void Model::Impl::resetDataSource()
 
 // ---------------------------------------------------------------------------- proxies
 
-/// The model that is meant by the model part of an id, null for none; null if normalizers have to be
-/// asked. May be dead.
+/// The model that is meant by the model part of an id, null for none; null if normalizers have to
+/// be asked. May be dead.
 Model::Impl const* Model::Impl::findNamedModel(internal::ModelName const* name) const
 {
     if (!name)
@@ -364,7 +372,8 @@ Model::Impl const* Model::Impl::findNamedModel(internal::ModelName const* name) 
         return name->text() == m_modelURI ? this : nullptr;
     std::uint64_t const version = m_constellation->getNamesVersion();
     Impl const* model = name->getModel(this, version);
-    if (!model) {
+    if (!model)
+    {
         model = name->text() == m_modelURI ? this : m_constellation->findListed(name->text());
         name->remember(this, version, model);
     }
@@ -381,8 +390,7 @@ ModelElement::Impl* Model::Impl::findKnownTarget(ModelElement::Impl const& proxy
     if (!model || !model->isLive())
         return nullptr;
     ModelElement::Impl* const found = model->m_elements.find(*uuid);
-    bool const isAnswer =
-        found && found->isLive() && found->getMetaClass() == proxy.getMetaClass();
+    bool const isAnswer = found && found->isLive() && found->getMetaClass() == proxy.getMetaClass();
     return isAnswer ? found : nullptr;
 }
 
@@ -410,7 +418,8 @@ ModelElement Model::Impl::peekResolveProxy(ModelElement::Impl const*,
     ModelElement result;
     if (!id.getModelId() || *id.getModelId() == m_modelURI)
         result = findElement(proxy->getMetaClass(), id);
-    else if (m_constellation) {
+    else if (m_constellation)
+    {
         if (Model const other = m_constellation->peekModel(*id.getModelId()))
             result = other->findElement(proxy->getMetaClass(), id);
     }
@@ -427,8 +436,8 @@ ProxyId Model::Impl::getPersistentProxyId(ModelElement::Impl const* element, boo
 
 void Model::Impl::destroyElements(bool multiModel)
 {
-    bool const keepIncoming = m_validity == ElementValidity::ModelDestroying
-                              || (m_dataSource && !multiModel);
+    bool const keepIncoming =
+        m_validity == ElementValidity::ModelDestroying || (m_dataSource && !multiModel);
     std::vector<ModelElement> const& all = m_topLevelElements.all();
     // from the back, where leaving the top level moves no other element
     ModelElement::Impl::_destroyEach({all.rbegin(), all.rend()}, keepIncoming, multiModel);
@@ -455,7 +464,8 @@ std::vector<ModelElement> Model::Impl::getElementsInOrder() const
     std::vector<ModelElement::Impl*> all = getAllElementImpls();
     internal::sortByAddress(all);
     elements.reserve(all.size());
-    for (ModelElement::Impl* const element : all) {
+    for (ModelElement::Impl* const element : all)
+    {
         if (!m_topLevelElements.contains(element))
             elements.emplace_back(element);
     }
@@ -465,8 +475,9 @@ std::vector<ModelElement> Model::Impl::getElementsInOrder() const
 void Model::Impl::convertAllReferencesToProxies(bool multiModel)
 {
     std::vector<ModelElement> elements = getElementsInOrder();
-    for (ModelElement& next : elements) {
-        ModelElement const element = std::move(next); // let go while it is at hand
+    for (ModelElement& next : elements)
+    {
+        ModelElement const element = std::move(next);  // let go while it is at hand
         boost::optional<ProxyId> proxyId;
         element->convertReferencesToProxies(multiModel, proxyId);
     }
@@ -496,10 +507,11 @@ void Model::Impl::destroy()
         m_currentTransaction->abandon();
     resetDataSource();
     invalidate();
-    if (ModelConstellation::Impl* const constellation = m_constellation) {
+    if (ModelConstellation::Impl* const constellation = m_constellation)
+    {
         ModelConstellation const keep(constellation);
         constellation->modelIsDestroyed(this);
         m_constellation = nullptr;
     }
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

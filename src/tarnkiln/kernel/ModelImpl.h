@@ -6,11 +6,11 @@
 #include "tarnkiln/kernel/ModelConstellation.h"
 #include "tarnkiln/kernel/ModelElementImpl.h"
 #include "tarnkiln/kernel/Transaction.h"
+#include "tarnkiln/meta/TransactionOrigin.h"
 #include "tarnkiln/support/CountedPointer.h"
 #include "tarnkiln/support/ElementRegistry.h"
 #include "tarnkiln/support/ModelAnchor.h"
 #include "tarnkiln/support/TopLevelElements.h"
-#include "tarnkiln/meta/TransactionOrigin.h"
 
 #include <boost/optional.hpp>
 
@@ -31,7 +31,7 @@ struct DeclaredExtensionRecord;
 class LocalTransactionFactoryImpl;
 class ModelName;
 class StandIns;
-}
+}  // namespace internal
 
 /// The registry of a model's elements, its transaction, its listeners and its place in a
 /// constellation.
@@ -136,15 +136,12 @@ public:
     void addListenerHolder(std::unique_ptr<ListenerHolderBase> holder);
     /// Adds a listener that is told of commits, and needs no old values. Ignores one that is on
     /// the list.
-    template <class L>
-    void addShallowListener(L* listener);
+    template <class L> void addShallowListener(L* listener);
     /// Adds a listener for what it has methods for; transactions become deep. Ignores one that is
     /// on the list.
-    template <class L>
-    void addListener(L* listener);
+    template <class L> void addListener(L* listener);
     /// The same, and deletes the listener when it is removed.
-    template <class L>
-    void addOwnedListener(std::unique_ptr<L> listener);
+    template <class L> void addOwnedListener(std::unique_ptr<L> listener);
     /// Takes the listener off the list; it is told by `listenerRemoved`. Safe at any time, from
     /// within a notification too.
     void removeListener(Listener* listener);
@@ -164,7 +161,8 @@ public:
     /// @{
     /// Adds a property to `extended` and to the classes below it. Listeners are told after that.
     ///
-    /// \param defaultValue  what elements have as long as nothing is set; must be there for a single
+    /// \param defaultValue  what elements have as long as nothing is set; must be there for a
+    /// single
     ///     value that is no reference. A single reference is empty at first, whatever is given.
     /// \throws tarnkiln::messages::CannotCreateWithoutModel  unless `extended` is a live class of
     ///     the registry.
@@ -194,7 +192,8 @@ public:
     meta::Extension getExtension(meta::Class const& metaClass, ustring const& name) const;
     /// What elements of `metaClass` have as long as nothing is set.
     ///
-    /// \throws tarnkiln::messages::NoSuchExtension  (name, qualified class name) if there is no such
+    /// \throws tarnkiln::messages::NoSuchExtension  (name, qualified class name) if there is no
+    /// such
     ///     extension, or none with a default.
     Value getExtensionDefault(meta::Class const& metaClass, ustring const& name) const;
     /// What stands in this model for `extension`, which another model declared: an extension of
@@ -261,8 +260,8 @@ public:
     std::vector<ustring> getUsedPackageUris() const;
     /// The URIs of the used packages and of all that they import.
     std::vector<ustring> getDescriptivePackageURIClosure() const;
-    static std::vector<ustring> getImportedPackageClosure(
-        std::vector<meta::Package> const& packages);
+    static std::vector<ustring>
+    getImportedPackageClosure(std::vector<meta::Package> const& packages);
     void setUsageProvider(std::unique_ptr<meta::DataModelUsageProvider> provider);
     /// @}
 
@@ -333,7 +332,7 @@ private:
 
     void forgetListener(ListenerHolderBase* holder);
     void removeAllListeners();
-    class ContentsMove; // ModelMoving.cpp
+    class ContentsMove;  // ModelMoving.cpp
 
     internal::DeclaredExtensionRecord const* findExtensionRecord(meta::Class const& metaClass,
                                                                  ustring const& name) const;
@@ -351,13 +350,14 @@ private:
     bool isRecording() const { return m_currentTransaction && m_dataSourceLoadCount == 0; }
     void refuseInvalidChange() const;
 
-    support::TopLevelElements m_topLevelElements; ///< Strong: keeps top-level elements alive.
-    support::ElementRegistry m_elements;          ///< Everything the model holds, by UUID; weak.
-    std::unique_ptr<internal::StandIns> const m_proxies; ///< Proxies that point to this model.
+    support::TopLevelElements m_topLevelElements;  ///< Strong: keeps top-level elements alive.
+    support::ElementRegistry m_elements;           ///< Everything the model holds, by UUID; weak.
+    std::unique_ptr<internal::StandIns> const m_proxies;  ///< Proxies that point to this model.
     internal::TransactionImpl* m_currentTransaction = nullptr;
-    internal::TransactionImpl* m_telling = nullptr; ///< The last to end of those telling listeners.
+    internal::TransactionImpl* m_telling =
+        nullptr;  ///< The last to end of those telling listeners.
     std::vector<std::unique_ptr<ListenerHolderBase>> m_listeners;
-    signed char m_transactionDepth = 1; ///< 0 ask the listeners, 1 shallow, 2 deep.
+    signed char m_transactionDepth = 1;  ///< 0 ask the listeners, 1 shallow, 2 deep.
     bool m_freezeOnNotify = false;
     bool m_revertUnchangedOnReport = false;
     unsigned long const m_modelCounter;
@@ -371,10 +371,10 @@ private:
     std::unordered_set<ExtensionListener*> m_extensionListeners;
     std::unique_ptr<meta::DataModelUsageProvider> m_usageProvider;
     std::unique_ptr<AbstractTransactionFactoryImpl> m_transactionFactory;
-    bool m_isFactoryLocal = true; ///< Not brought by a client.
+    bool m_isFactoryLocal = true;  ///< Not brought by a client.
     ModelConstellation::Impl* m_constellation = nullptr;
     ustring m_modelURI;
-    ustring m_locationModelId; ///< The form of the URI by which the constellation finds the model.
+    ustring m_locationModelId;  ///< The form of the URI by which the constellation finds the model.
     std::unique_ptr<datasource::DataSource> m_dataSource;
 };
 
@@ -386,4 +386,4 @@ inline Model::Impl* Model::operator->() const
 {
     return static_cast<Impl*>(m_impl);
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

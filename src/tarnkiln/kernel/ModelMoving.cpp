@@ -249,8 +249,8 @@ void Model::Impl::ContentsMove::moveElements()
         throw;
     }
     m_elementsMoved = true;
-    m_target.m_proxies->takeOver(
-        *m_source.m_proxies, [this](ModelElement::Impl& proxy) { proxy.m_model = &m_target; });
+    m_target.m_proxies->takeOver(*m_source.m_proxies,
+                                 [this](ModelElement::Impl& proxy) { proxy.m_model = &m_target; });
     m_source.m_elements.clear();
     m_source.m_anchor.get()->changed();
     m_source.m_topLevelElements.abandon();

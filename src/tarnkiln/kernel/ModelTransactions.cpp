@@ -44,8 +44,10 @@ Transaction Model::Impl::innerBeginTransaction(PrivateTag const&,
         internal::buildCatalogueFor(*this);
     if (m_currentTransaction)
         return Transaction(new internal::NestedTransaction(m_currentTransaction));
-    if (!deep) {
-        if (m_transactionDepth == 0) {
+    if (!deep)
+    {
+        if (m_transactionDepth == 0)
+        {
             bool const anyDeep =
                 std::any_of(m_listeners.begin(), m_listeners.end(),
                             [](auto const& holder) { return !holder->isShallow(); });
@@ -53,7 +55,8 @@ Transaction Model::Impl::innerBeginTransaction(PrivateTag const&,
         }
         deep = m_transactionDepth == 2;
     }
-    if (!m_constellation) {
+    if (!m_constellation)
+    {
         Transaction const transaction(
             new internal::TransactionImpl(getModel(), nullptr, origin, deep));
         m_currentTransaction = static_cast<internal::TransactionImpl*>(transaction.getImpl());
@@ -61,10 +64,12 @@ Transaction Model::Impl::innerBeginTransaction(PrivateTag const&,
         return transaction;
     }
     m_constellation->createTransactionGroup(deep, origin);
-    try {
+    try
+    {
         return Transaction(new internal::NestedTransaction(m_currentTransaction));
     }
-    catch (...) {
+    catch (...)
+    {
         m_constellation->getTransactionGroup()->rollBack();
         throw;
     }
@@ -95,7 +100,7 @@ void Model::Impl::refuseInvalidChange() const
     if (m_validity == ElementValidity::ModelDestroying)
         return;
     if (m_currentTransaction && m_currentTransaction->isRolledBack())
-        return; // what undo restores is no change
+        return;  // what undo restores is no change
     if (m_freezeCount != 0)
         reportException(tarnkiln::messages::ModelFrozen());
     if (!m_currentTransaction && (isMultiModel() || hasListeners()))
@@ -115,4 +120,4 @@ void Model::Impl::transactionEnded()
     m_elements.forgetReturns();
     m_topLevelElements.forgetReturns();
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

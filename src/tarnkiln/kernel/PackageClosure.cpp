@@ -15,7 +15,8 @@ void visitPackage(meta::Package const& package, std::unordered_set<ustring>& uri
 {
     if (!uris.insert(package->getUri()).second)
         return;
-    for (ustring const& imported : package->getImportedPackageURIs()) {
+    for (ustring const& imported : package->getImportedPackageURIs())
+    {
         if (uris.count(imported) != 0)
             continue;
         if (meta::Package const found = meta::MetaRegistry::getInstance().getRootPackage(imported))
@@ -23,14 +24,14 @@ void visitPackage(meta::Package const& package, std::unordered_set<ustring>& uri
     }
 }
 
-} // namespace
+}  // namespace
 
-std::vector<ustring> Model::Impl::getImportedPackageClosure(
-    std::vector<meta::Package> const& packages)
+std::vector<ustring>
+Model::Impl::getImportedPackageClosure(std::vector<meta::Package> const& packages)
 {
     std::unordered_set<ustring> uris;
     for (meta::Package const& package : packages)
         visitPackage(package, uris);
     return std::vector<ustring>(uris.begin(), uris.end());
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

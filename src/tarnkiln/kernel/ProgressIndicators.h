@@ -26,11 +26,11 @@ public:
     explicit DataSourceLoadingInProgressIndicator(Model const& model);
     DataSourceLoadingInProgressIndicator(DataSourceLoadingInProgressIndicator&& other) noexcept =
         default;
-    DataSourceLoadingInProgressIndicator& operator=(
-        DataSourceLoadingInProgressIndicator&& other) noexcept = default;
+    DataSourceLoadingInProgressIndicator&
+    operator=(DataSourceLoadingInProgressIndicator&& other) noexcept = default;
     ~DataSourceLoadingInProgressIndicator();
 
 private:
     Model m_model;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -30,4 +30,4 @@ private:
 
 /// Shows the parts to people, as `uuid:8d5a0ea6-... in file:books`.
 TARNKILN_EXPORT std::ostream& operator<<(std::ostream& out, ProxyId const& id);
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

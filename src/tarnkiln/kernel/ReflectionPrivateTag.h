@@ -14,4 +14,4 @@ public:
 
     bool operator==(ReflectionPrivateTag const& other) const { return this == &other; }
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -16,16 +16,15 @@ ReportData::ReportData(Model const& model, std::shared_ptr<ChangeRecords> change
                        boost::optional<Value> const& message, bool revertUnchanged, bool deep,
                        std::shared_ptr<DeferredInvocations> deferred, bool destroyAll,
                        meta::TransactionOrigin const& origin)
-    : m_changes(std::move(changes))
-    , m_deferredInvocations(std::move(deferred))
-    , m_model(model.getImpl())
-    , m_message(message)
-    , m_revertUnchanged(revertUnchanged)
-    , m_deep(deep)
-    , m_destroyAll(destroyAll)
-    , m_origin(origin)
-{
-}
+    : m_changes(std::move(changes)),
+      m_deferredInvocations(std::move(deferred)),
+      m_model(model.getImpl()),
+      m_message(message),
+      m_revertUnchanged(revertUnchanged),
+      m_deep(deep),
+      m_destroyAll(destroyAll),
+      m_origin(origin)
+{}
 
 ReportData::~ReportData() = default;
 
@@ -36,9 +35,9 @@ Model ReportData::getModel() const
 
 bool ReportData::isEmpty() const
 {
-    return !m_destroyAll && (!m_deferredInvocations || m_deferredInvocations->empty())
-           && m_created.empty() && m_changed.empty() && m_destroyed.empty()
-           && m_createdAndDestroyed.empty();
+    return !m_destroyAll && (!m_deferredInvocations || m_deferredInvocations->empty()) &&
+           m_created.empty() && m_changed.empty() && m_destroyed.empty() &&
+           m_createdAndDestroyed.empty();
 }
 
 void ReportData::processElement(ModelElement const& element, ModelElement::Impl::Changes* changes)
@@ -95,7 +94,8 @@ Value ReportData::getExtensionOldValue(ModelElement const& element, ustring cons
     auto const* const record = findRecord(element);
     if (!record)
         reportException(tarnkiln::messages::NoSuchProperty(
-            name, element.getImpl() ? internal::qualifiedName(element->getMetaClass()) : ustring()));
+            name,
+            element.getImpl() ? internal::qualifiedName(element->getMetaClass()) : ustring()));
     return static_cast<ModelElement::Impl::Storage const*>(record)->getExtensionOldValue(name);
 }
 
@@ -103,7 +103,8 @@ Value ReportData::getOldValue(ModelElement const& element, meta::Property const&
 {
     if (!m_deep)
         reportException(tarnkiln::messages::GetOldValueFromNonDeep());
-    if (property) {
+    if (property)
+    {
         auto const* const record = findRecord(element);
         meta::Class const metaClass = record ? record->getMetaClass() : meta::Class();
         if (metaClass && metaClass->isATypeOf(property))
@@ -112,4 +113,4 @@ Value ReportData::getOldValue(ModelElement const& element, meta::Property const&
     }
     return Value::createEmptyValue(property);
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -89,4 +89,4 @@ private:
     bool m_destroyAll;
     meta::TransactionOrigin m_origin;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

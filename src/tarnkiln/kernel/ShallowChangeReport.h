@@ -8,14 +8,10 @@
 namespace tarn::kiln {
 
 /// A view of a report that shows the elements of class `T` only. Holds no old values.
-template <class T>
-class ShallowChangeReport
+template <class T> class ShallowChangeReport
 {
 public:
-    explicit ShallowChangeReport(ReportData const& data)
-        : m_data(data)
-    {
-    }
+    explicit ShallowChangeReport(ReportData const& data) : m_data(data) {}
 
     ReportData const& getData() const { return m_data; }
     std::vector<ModelElement> const& getCreated() const { return m_data.getCreated(); }
@@ -26,7 +22,8 @@ public:
     template <class Functor>
     void doProcess(Functor const& functor, std::vector<ModelElement> const& list) const
     {
-        for (ModelElement const& element : list) {
+        for (ModelElement const& element : list)
+        {
             T const typed = T::cast(element);
             if (typed.getElementImpl())
                 functor(typed);
@@ -36,4 +33,4 @@ public:
 private:
     ReportData const& m_data;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

@@ -12,27 +12,21 @@ namespace tarn::kiln {
 
 AbstractTransactionImpl::AbstractTransactionImpl(meta::TransactionOrigin const& origin)
     : m_origin(origin)
-{
-}
+{}
 
 AbstractTransactionImpl::~AbstractTransactionImpl() = default;
 
-Transaction::Transaction(AbstractTransactionImpl* impl)
-    : m_impl(impl)
+Transaction::Transaction(AbstractTransactionImpl* impl) : m_impl(impl)
 {
     if (m_impl)
         m_impl->addRef();
 }
 
-Transaction::Transaction(Transaction const& other)
-    : Transaction(other.m_impl)
-{
-}
+Transaction::Transaction(Transaction const& other) : Transaction(other.m_impl) {}
 
 Transaction::Transaction(Transaction&& other) noexcept
     : m_impl(std::exchange(other.m_impl, nullptr))
-{
-}
+{}
 
 void Transaction::drop()
 {
@@ -96,4 +90,4 @@ void Transaction::eventEmitted(std::unique_ptr<meta::AbstractDeferredInvocation>
 {
     m_impl->eventEmitted(std::move(invocation));
 }
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

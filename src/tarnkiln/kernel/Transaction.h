@@ -17,10 +17,10 @@ namespace tarn::kiln {
 /// What became of a call of `commit` or `rollBack`.
 enum class TransactionResult : int
 {
-    NotCompleted = 0, ///< Ended before, or other holders have not committed, or nothing to undo.
-    Committed = 1,    ///< The changes are final.
-    RolledBack = 2,   ///< The changes were undone.
-    NotRevertible = 3 ///< The transaction ended, but it is shallow and its changes stay.
+    NotCompleted = 0,  ///< Ended before, or other holders have not committed, or nothing to undo.
+    Committed = 1,     ///< The changes are final.
+    RolledBack = 2,    ///< The changes were undone.
+    NotRevertible = 3  ///< The transaction ended, but it is shallow and its changes stay.
 };
 
 /// Shows the name of a result.
@@ -82,4 +82,4 @@ private:
 
     AbstractTransactionImpl* m_impl = nullptr;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

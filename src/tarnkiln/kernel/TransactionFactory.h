@@ -17,8 +17,7 @@ public:
 
 /// A factory that begins the transactions itself.
 class TARNKILN_EXPORT DirectTransactionFactoryImpl : public AbstractTransactionFactoryImpl
-{
-};
+{};
 
 /// A factory that leaves it to another one, which must outlive it.
 class TARNKILN_EXPORT DelegatingTransactionFactoryImpl : public AbstractTransactionFactoryImpl
@@ -26,8 +25,7 @@ class TARNKILN_EXPORT DelegatingTransactionFactoryImpl : public AbstractTransact
 public:
     explicit DelegatingTransactionFactoryImpl(AbstractTransactionFactoryImpl const& target)
         : m_target(&target)
-    {
-    }
+    {}
 
     Transaction beginTransaction() const override { return m_target->beginTransaction(); }
     Transaction beginRevertibleTransaction() const override
@@ -38,4 +36,4 @@ public:
 private:
     AbstractTransactionFactoryImpl const* m_target;
 };
-} // namespace tarn::kiln
+}  // namespace tarn::kiln

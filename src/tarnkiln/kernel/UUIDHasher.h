@@ -19,4 +19,4 @@ struct UUIDHasher
         return word * 0x9E3779B97F4A7C15u;
     }
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

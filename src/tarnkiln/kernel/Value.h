@@ -5,8 +5,9 @@
 ///     title.getValue<ustring>();                      // u"Emma"
 ///     title.getValue<int>();                          // raises CannotCastIncompatibleTypes
 ///
-///     Value const author = book->getPropertyValue(authorOfBook, ModelElement::Impl::PUBLIC_ACCESS);
-///     author.getValue<ModelElement>();                // the element, or an empty handle
+///     Value const author = book->getPropertyValue(authorOfBook,
+///     ModelElement::Impl::PUBLIC_ACCESS); author.getValue<ModelElement>();                // the
+///     element, or an empty handle
 #pragma once
 #include "tarnkiln/Export.h"
 #include "tarnkiln/kernel/ValueMeta.h"
@@ -74,7 +75,8 @@ public:
     static Value createReflectiveDataTypeValue(ReflectiveDataType const& value);
     /// The same with all fields at their defaults, or an absent one if it is not `required`.
     ///
-    /// \throws tarnkiln::messages::NoSuchType  (qualified name) if one is required of a type that is
+    /// \throws tarnkiln::messages::NoSuchType  (qualified name) if one is required of a type that
+    /// is
     ///     empty or dead.
     static Value createReflectiveDataTypeValue(meta::DataType const& type, bool required);
     /// A value that shares `collection`, an element's value of `property`. Null is none. For a
@@ -160,7 +162,8 @@ public:
 
     /// The fields of a value of a data type, whichever form it has.
     ///
-    /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  (qualified name of the class of data
+    /// \throws tarnkiln::messages::CannotCastIncompatibleTypes  (qualified name of the class of
+    /// data
     ///     types) if it is of another type, or of one that has no serializer.
     /// \throws tarnkiln::messages::InvalidValue  if it is reflective and absent.
     ReflectiveDataType toReflectiveDataType() const;

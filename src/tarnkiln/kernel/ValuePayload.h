@@ -11,8 +11,8 @@ namespace tarn::kiln {
 
 /// An object of any type, owned, or the address of something that is not.
 ///
-/// A small object lies in the payload itself, any other on the heap. An owned payload that is empty,
-/// such as one that was moved from, still knows its type.
+/// A small object lies in the payload itself, any other on the heap. An owned payload that is
+/// empty, such as one that was moved from, still knows its type.
 ///
 /// Threads: as a plain value; what it holds may be read by several.
 ///

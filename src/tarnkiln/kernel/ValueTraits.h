@@ -32,8 +32,7 @@ template <class T>
 concept PlainScalar =
     OneOf<T, bool, signed char, unsigned char, short, unsigned short, int, unsigned int, long,
           unsigned long, double, ustring, string, UUID, boost::posix_time::ptime,
-          meta::TransactionOrigin, meta::ExtensionPrototype, meta::Language> ||
-    isDataType<T>;
+          meta::TransactionOrigin, meta::ExtensionPrototype, meta::Language> || isDataType<T>;
 
 /// Enumerations of metamodels; their values are carried by the numbers of the literals.
 template <class T>

@@ -22,4 +22,4 @@ public:
     virtual void elementDestroying(ModelElement::Impl* element);
     virtual void clear();
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -42,4 +42,4 @@ private:
     ustring m_name;
     ustring m_typeName;
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

@@ -10,4 +10,4 @@ enum class Language : int
     CPlusPlus = 1,
     JavaScript = 2
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

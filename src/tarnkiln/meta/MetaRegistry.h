@@ -236,7 +236,7 @@ private:
     Model::Freezer m_freezer;
     std::unordered_map<Type, std::unique_ptr<ValueOwnershipConverter>, std::hash<ModelElement>>
         m_converters;
-    std::vector<Type> m_unpublished;  ///< Registered under the lock that is held.
+    std::vector<Type> m_unpublished;       ///< Registered under the lock that is held.
     mutable std::recursive_mutex m_mutex;  ///< Guards all of the above.
     /// How many `LockedModel`s the one thread holds that holds any.
     std::atomic<int> m_changers{0};

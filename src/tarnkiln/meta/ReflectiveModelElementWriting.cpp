@@ -91,9 +91,9 @@ bool hasOneValue(SlotKind kind)
 }  // namespace
 
 /// Whether the value is just what the property holds; if not, `checkType` has more to ask.
-[[gnu::always_inline]] inline bool
-ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot, SlotFacts const& facts,
-                                     Value const& value)
+[[gnu::always_inline]] inline bool ReflectiveModelElementImpl::isOfType(ReflectiveSlot const& slot,
+                                                                        SlotFacts const& facts,
+                                                                        Value const& value)
 {
     bool const isShaped = value.getFlags() == ValueFlags::Single ||
                           (value.getFlags() == ValueFlags::OptionalSingle && !facts.isRequired);

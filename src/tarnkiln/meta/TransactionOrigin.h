@@ -39,4 +39,4 @@ private:
     UUID m_transactionId{};
     boost::optional<UUID> m_synchronizer;
 };
-} // namespace tarn::kiln::meta
+}  // namespace tarn::kiln::meta

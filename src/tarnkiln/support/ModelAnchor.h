@@ -18,10 +18,7 @@ namespace tarn::kiln::support {
 class ModelAnchor : public Shared<ModelAnchor>
 {
 public:
-    explicit ModelAnchor(Model::Impl* model)
-        : m_model(model)
-    {
-    }
+    explicit ModelAnchor(Model::Impl* model) : m_model(model) {}
 
     /// Null once the model is gone.
     Model::Impl* getModel() const { return m_model; }
@@ -70,4 +67,4 @@ private:
     Model::Impl* m_model;
     std::atomic<std::uint64_t> m_version{STEP};
 };
-} // namespace tarn::kiln::support
+}  // namespace tarn::kiln::support

@@ -50,8 +50,8 @@ public:
         return const_cast<OldValues*>(this)->find<T>(slot);
     }
 
-    /// Calls `visit(slot, value, note)` with references to each value but that of slot 0; all are of
-    /// the type `T`.
+    /// Calls `visit(slot, value, note)` with references to each value but that of slot 0; all are
+    /// of the type `T`.
     template <class T, class Visit> void forEach(Visit const& visit)
     {
         for (Entry* entry = m_first; entry; entry = entry->next)

@@ -15,8 +15,7 @@ class OpenStep
 {
 public:
     /// \param model  null marks nothing; must outlive this mark.
-    explicit OpenStep(Model::Impl* model)
-        : m_model(model)
+    explicit OpenStep(Model::Impl* model) : m_model(model)
     {
         if (m_model)
             m_model->openStep();
@@ -35,4 +34,4 @@ public:
 private:
     Model::Impl* m_model;
 };
-} // namespace tarn::kiln::support
+}  // namespace tarn::kiln::support

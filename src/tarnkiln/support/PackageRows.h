@@ -115,8 +115,8 @@ using SerializerInstaller = void (*)(meta::Type const& type);
 struct PackageRow
 {
     char16_t const* name;
-    std::size_t parent = 0;      ///< The row of the package around it; the root names itself.
-    char16_t const* uri;         ///< Behind `SchemaBase`, unless it has a scheme ("a://") itself.
+    std::size_t parent = 0;  ///< The row of the package around it; the root names itself.
+    char16_t const* uri;     ///< Behind `SchemaBase`, unless it has a scheme ("a://") itself.
     char const* defaultVobjCategory = nullptr;
     char const* uuid = nullptr;  ///< Null: a fresh one. The root must have one.
 };

@@ -10,8 +10,7 @@ namespace tarn::kiln::support {
 ///
 /// It adds no fields: the base keeps the values of the slots that changed, and the rows know their
 /// types. Reports may keep it alive longer. `Base` is the record of the superclass.
-template <class Owner, class Base>
-class TARNKILN_EXPORT Record : public Base
+template <class Owner, class Base> class TARNKILN_EXPORT Record : public Base
 {
 public:
     using Base::Base;

@@ -92,4 +92,4 @@ private:
     std::vector<ModelElement> m_elements;
     std::size_t m_mayReturn = 0;
 };
-} // namespace tarn::kiln::support
+}  // namespace tarn::kiln::support

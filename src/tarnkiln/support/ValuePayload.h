@@ -49,11 +49,8 @@ template <class T> struct PayloadOf
     }
 
     static constexpr ValuePayload::Functions FUNCTIONS{
-        IN_PLACE && std::is_trivially_copyable_v<T> && std::is_trivially_destructible_v<T>,
-        destroy,
-        copy,
-        relocate,
-        equals};
+        IN_PLACE && std::is_trivially_copyable_v<T> && std::is_trivially_destructible_v<T>, destroy,
+        copy, relocate, equals};
 };
 }  // namespace tarn::kiln::support
 

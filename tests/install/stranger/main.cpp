@@ -11,8 +11,7 @@ namespace messages = tarnkiln::messages;
 /// Whether the classes of shop.json keep what is put into them.
 bool usesItsMetamodel()
 {
-    tarn::kiln::Model const model =
-        tarn::kiln::Model::create(tarn::kiln::ModelConstellation());
+    tarn::kiln::Model const model = tarn::kiln::Model::create(tarn::kiln::ModelConstellation());
     shop::Shop const shop = shop::Shop::create(model);
     shop::Ware const ware = shop::Ware::create(model);
     ware->setName(u"tea");

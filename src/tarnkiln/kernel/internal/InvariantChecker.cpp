@@ -33,11 +33,13 @@ void Model::Impl::checkInvariantsAtEnd()
     if (isInStep() || (m_elements.size() > ALWAYS && !powerOfTwo))
         return;
     std::vector<string> violations;
-    try {
+    try
+    {
         violations = checkInvariants();
     }
-    catch (std::bad_alloc const&) {
-        return; // the transaction has ended all the same
+    catch (std::bad_alloc const&)
+    {
+        return;  // the transaction has ended all the same
     }
     TARNKILN_ASSERT(violations.empty(), "a model is consistent when a transaction has ended",
                     violations.front());
@@ -49,12 +51,14 @@ namespace internal {
 std::vector<string> InvariantChecker::run()
 {
     m_model.m_elements.forEach([this](ModelElement::Impl* element) { checkElement(*element); });
-    for (ModelElement const& element : m_model.m_topLevelElements.all()) {
+    for (ModelElement const& element : m_model.m_topLevelElements.all())
+    {
         if (!isHere(*element.getImpl()) || !element->isTopLevel())
             report("stands in the top-level set without being a top-level element of the model",
                    *element.getImpl());
     }
-    m_model.m_elements.forEach([this](ModelElement::Impl* element) { collectReferences(*element); });
+    m_model.m_elements.forEach(
+        [this](ModelElement::Impl* element) { collectReferences(*element); });
     std::sort(m_references.begin(), m_references.end(),
               [](Reference const& left, Reference const& right) {
                   std::less<> const before;
@@ -103,16 +107,17 @@ bool InvariantChecker::refersBack(Reference const& reference) const
     Feature const opposite = reference.feature.opposite();
     if (opposite.isComposite())
         return reference.source->basicContainer() == reference.target;
-    auto const first = std::lower_bound(
-        m_references.begin(), m_references.end(), reference,
-        [](Reference const& left, Reference const& right) {
-            std::less<> const before;
-            return left.source != right.target ? before(left.source, right.target)
-                                               : before(left.target, right.source);
-        });
-    for (auto at = first; at != m_references.end() && at->source == reference.target
-                          && at->target == reference.source;
-         ++at) {
+    auto const first = std::lower_bound(m_references.begin(), m_references.end(), reference,
+                                        [](Reference const& left, Reference const& right) {
+                                            std::less<> const before;
+                                            return left.source != right.target
+                                                       ? before(left.source, right.target)
+                                                       : before(left.target, right.source);
+                                        });
+    for (auto at = first; at != m_references.end() && at->source == reference.target &&
+                          at->target == reference.source;
+         ++at)
+    {
         if (at->feature == opposite)
             return true;
     }
@@ -123,15 +128,17 @@ void InvariantChecker::checkReference(Reference const& reference)
 {
     ModelElement::Impl const& target = *reference.target;
     if (!target.isLive())
-        return; // stays until a rollback revives it or a client lets go
+        return;  // stays until a rollback revives it or a client lets go
     Feature const opposite = reference.feature.opposite();
-    if (reference.feature.isComposite()) {
-        if (target.basicContainer() != reference.source
-            || !(target.getContainment() == reference.feature))
+    if (reference.feature.isComposite())
+    {
+        if (target.basicContainer() != reference.source ||
+            !(target.getContainment() == reference.feature))
             report("is held by a composite that it does not call its container", target);
     }
-    else if (opposite && isHere(target) && !opposite.isKeyed() && !m_model.isParsing()
-             && !refersBack(reference)) {
+    else if (opposite && isHere(target) && !opposite.isKeyed() && !m_model.isParsing() &&
+             !refersBack(reference))
+    {
         report("is referred to and does not refer back", target);
     }
 }
@@ -141,12 +148,13 @@ void InvariantChecker::checkContainer(ModelElement::Impl const& element)
     ModelElement::Impl const* const container = element.basicContainer();
     if (!container)
         return;
-    if (!isHere(*container)) {
+    if (!isHere(*container))
+    {
         report("lies in a container that the model does not hold", element);
         return;
     }
     if (element.getContainment().isKeyed())
-        return; // a taken key can shut an element out of the collection
+        return;  // a taken key can shut an element out of the collection
     Reference const wanted{container, &element, element.getContainment()};
     bool const held = std::binary_search(m_references.begin(), m_references.end(), wanted,
                                          [](Reference const& left, Reference const& right) {
@@ -169,7 +177,8 @@ void InvariantChecker::checkCycles()
         path.clear();
         std::unordered_set<ModelElement::Impl const*> onPath;
         ModelElement::Impl const* at = element;
-        while (at && settled.count(at) == 0 && onPath.insert(at).second) {
+        while (at && settled.count(at) == 0 && onPath.insert(at).second)
+        {
             path.push_back(at);
             at = at->basicContainer();
         }
@@ -182,13 +191,14 @@ void InvariantChecker::checkCycles()
 /// The registry may have lost any of them, or gained others in this model's name.
 void InvariantChecker::checkDeclaredExtensions()
 {
-    for (auto const& [name, record] : m_model.m_extensions->records()) {
+    for (auto const& [name, record] : m_model.m_extensions->records())
+    {
         if (!record.extension)
             continue;
         bool const isSingle = record.extension->getUpper() == 1;
         if (isSingle && !record.defaultValue)
-            m_violations.push_back("the extension '" + sill::i18n::to_string(name)
-                                   + "' has a single value and no default");
+            m_violations.push_back("the extension '" + sill::i18n::to_string(name) +
+                                   "' has a single value and no default");
     }
 }
 
@@ -199,7 +209,8 @@ void InvariantChecker::checkExtensionValues(ModelElement::Impl const& element)
         return;
     if (values->anchor)
         report("is alive and anchored as a dead one", element);
-    for (ExtensionValues::Entry const& entry : values->entries()) {
+    for (ExtensionValues::Entry const& entry : values->entries())
+    {
         if (entry.value.isEmpty() || !entry.extension)
             continue;
         if (entry.value.isCollection() == (entry.extension->getUpper() == 1))
@@ -208,23 +219,22 @@ void InvariantChecker::checkExtensionValues(ModelElement::Impl const& element)
         if (!group || group->getModelID() != m_model.m_modelCounter)
             report("has a value of an extension of another model", element);
         AbstractOwnedCollection const* const collection = entry.value.getCollection();
-        if (collection
-            && (collection->getOwner() != &element
-                || collection->getCollectionProperty() != entry.extension))
+        if (collection && (collection->getOwner() != &element ||
+                           collection->getCollectionProperty() != entry.extension))
             report("has an extension's collection that is of something else", element);
         auto const* const record =
             m_model.m_extensions->find(entry.extension->getName(), entry.extension);
-        if (!collection && record && record->defaultValue
-            && entry.value.getValue() == *record->defaultValue)
+        if (!collection && record && record->defaultValue &&
+            entry.value.getValue() == *record->defaultValue)
             report("stores the default of an extension", element);
     }
 }
 
 void InvariantChecker::report(string const& sentence, ModelElement::Impl const& element)
 {
-    m_violations.push_back("the element " + boost::uuids::to_string(element.getUuid()) + " of class '"
-                           + sill::i18n::to_string(qualifiedName(element.getMetaClass())) + "' "
-                           + sentence);
+    m_violations.push_back(
+        "the element " + boost::uuids::to_string(element.getUuid()) + " of class '" +
+        sill::i18n::to_string(qualifiedName(element.getMetaClass())) + "' " + sentence);
 }
-} // namespace internal
-} // namespace tarn::kiln
+}  // namespace internal
+}  // namespace tarn::kiln

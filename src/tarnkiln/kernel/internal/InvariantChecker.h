@@ -22,10 +22,7 @@ namespace tarn::kiln::internal {
 class InvariantChecker
 {
 public:
-    explicit InvariantChecker(Model::Impl const& model)
-        : m_model(model)
-    {
-    }
+    explicit InvariantChecker(Model::Impl const& model) : m_model(model) {}
 
     std::vector<string> run();
 
@@ -50,6 +47,6 @@ private:
 
     Model::Impl const& m_model;
     std::vector<string> m_violations;
-    std::vector<Reference> m_references; ///< Sorted by source, target.
+    std::vector<Reference> m_references;  ///< Sorted by source, target.
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -9,10 +9,7 @@ namespace tarn::kiln::internal {
 class LocalTransactionFactoryImpl final : public DirectTransactionFactoryImpl
 {
 public:
-    explicit LocalTransactionFactoryImpl(Model::Impl& model)
-        : m_model(&model)
-    {
-    }
+    explicit LocalTransactionFactoryImpl(Model::Impl& model) : m_model(&model) {}
 
     Transaction beginTransaction() const override { return begin(/*deep=*/false); }
     Transaction beginRevertibleTransaction() const override { return begin(/*deep=*/true); }
@@ -31,4 +28,4 @@ private:
     Model::Impl* m_model;
     Model::Impl::PrivateTag m_tag;
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

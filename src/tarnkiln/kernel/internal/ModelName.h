@@ -19,10 +19,7 @@ namespace tarn::kiln::internal {
 class ModelName : public support::Shared<ModelName>
 {
 public:
-    explicit ModelName(ustring text)
-        : m_text(std::move(text))
-    {
-    }
+    explicit ModelName(ustring text) : m_text(std::move(text)) {}
 
     ustring const& text() const { return m_text; }
 
@@ -66,6 +63,6 @@ private:
     static constexpr std::size_t MOST = 8;
 
     std::vector<Handle> m_recent;
-    std::size_t m_next = 0; ///< Gives way to the next one, once there are so many.
+    std::size_t m_next = 0;  ///< Gives way to the next one, once there are so many.
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

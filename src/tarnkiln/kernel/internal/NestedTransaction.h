@@ -12,10 +12,9 @@ class NestedTransaction final : public AbstractTransactionImpl
 {
 public:
     explicit NestedTransaction(TransactionImpl* parent)
-        : AbstractTransactionImpl(parent->getOrigin())
-        , m_parent(parent)
-    {
-    }
+        : AbstractTransactionImpl(parent->getOrigin()),
+          m_parent(parent)
+    {}
     ~NestedTransaction() override { parent().forgetCommit(); }
 
     // AbstractTransactionImpl
@@ -48,7 +47,8 @@ public:
         if (--m_handleCount != 0)
             return;
         m_handleCount = HANDLES_DELETING;
-        if (!m_done) {
+        if (!m_done)
+        {
             m_done = true;
             parent().nestedFailed();
         }
@@ -61,4 +61,4 @@ private:
     Transaction m_parent;
     bool m_done = false;
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -35,13 +35,13 @@ private:
     friend class StandIns;
 
     ModelElement::Impl& m_proxy;
-    StandIns* m_all; ///< Null once the model is gone.
+    StandIns* m_all;  ///< Null once the model is gone.
     StandIn* m_previous = nullptr;
     StandIn* m_next = nullptr;
     UUID m_uuid;
     bool m_isUuid;
     ModelNames::Handle const m_modelName;
-    mutable std::atomic<ProxyId const*> m_id{nullptr}; ///< Owned; null until asked for.
+    mutable std::atomic<ProxyId const*> m_id{nullptr};  ///< Owned; null until asked for.
 };
 
 /// The proxies of a model.
@@ -56,20 +56,20 @@ public:
     void insert(StandIn& one);
     void erase(StandIn& one);
     /// Takes those of another model over, and calls `visit(ModelElement::Impl&)` for each.
-    template <class Visit>
-    void takeOver(StandIns& others, Visit const& visit)
+    template <class Visit> void takeOver(StandIns& others, Visit const& visit)
     {
-        while (StandIn* const one = others.m_first) {
+        while (StandIn* const one = others.m_first)
+        {
             others.erase(*one);
             insert(*one);
             visit(one->m_proxy);
         }
     }
     /// Lets all go, and calls `visit(ModelElement::Impl&)` for each.
-    template <class Visit>
-    void clear(Visit const& visit)
+    template <class Visit> void clear(Visit const& visit)
     {
-        while (StandIn* const one = m_first) {
+        while (StandIn* const one = m_first)
+        {
             erase(*one);
             visit(one->m_proxy);
         }
@@ -79,4 +79,4 @@ private:
     StandIn* m_first = nullptr;
     ModelNames m_names;
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

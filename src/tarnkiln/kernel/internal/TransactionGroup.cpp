@@ -16,16 +16,13 @@ TransactionImpl& memberOf(Transaction const& pin)
     return static_cast<TransactionImpl&>(*pin.getImpl());
 }
 
-} // namespace
+}  // namespace
 
 /// The members of a group that has ended; each model knows its own until all listeners are told.
 class TransactionGroup::Ended
 {
 public:
-    explicit Ended(Pins&& pins)
-        : m_pins(std::move(pins))
-    {
-    }
+    explicit Ended(Pins&& pins) : m_pins(std::move(pins)) {}
     Ended(Ended const&) = delete;
     Ended& operator=(Ended const&) = delete;
     ~Ended() { forEach(&TransactionImpl::finishTelling); }
@@ -43,11 +40,10 @@ private:
 
 TransactionGroup::TransactionGroup(ModelConstellation::Impl* constellation, bool deep,
                                    meta::TransactionOrigin const& origin)
-    : m_constellation(constellation)
-    , m_deep(deep)
-    , m_origin(origin)
-{
-}
+    : m_constellation(constellation),
+      m_deep(deep),
+      m_origin(origin)
+{}
 
 TransactionGroup::~TransactionGroup() = default;
 
@@ -112,15 +108,17 @@ TransactionResult TransactionGroup::finishCommit(boost::optional<Value> const& m
     ModelConstellation const keepConstellation(m_constellation);
     pinMembers();
     bool accepted = prepareAll(message) && !anyRollBackOnly();
-    if (accepted) {
+    if (accepted)
+    {
         prohibitChanges();
         accepted = validateAll(message) && !anyRollBackOnly();
     }
-    if (!accepted) {
+    if (!accepted)
+    {
         m_ending = false;
         return rollBack();
     }
-    Ended const ended = endAll(); // this object may be gone
+    Ended const ended = endAll();  // this object may be gone
     ended.forEach(&TransactionImpl::checkInvariants);
     ended.forEach<boost::optional<Value> const&>(&TransactionImpl::notifyCommitted, message);
     ended.forEach(&TransactionImpl::runDeferredInvocations);
@@ -132,11 +130,13 @@ TransactionResult TransactionGroup::finishCommit(boost::optional<Value> const& m
 
 bool TransactionGroup::prepareAll(boost::optional<Value> const& message)
 {
-    try {
+    try
+    {
         for (std::size_t i = 0; i < m_pins.size(); ++i)
             memberOf(m_pins[i]).prepare(message);
     }
-    catch (...) {
+    catch (...)
+    {
         return false;
     }
     return true;
@@ -144,7 +144,8 @@ bool TransactionGroup::prepareAll(boost::optional<Value> const& message)
 
 bool TransactionGroup::validateAll(boost::optional<Value> const& message)
 {
-    for (std::size_t i = 0; i < m_pins.size(); ++i) {
+    for (std::size_t i = 0; i < m_pins.size(); ++i)
+    {
         if (!memberOf(m_pins[i]).validate(message))
             return false;
     }
@@ -192,12 +193,13 @@ TransactionResult TransactionGroup::rollBack()
     for (std::size_t i = 0; i < m_members.size(); ++i)
         m_members[i]->prepareRollBackReport();
     TransactionResult result = TransactionResult::NotCompleted;
-    for (TransactionImpl* const member : m_members) {
+    for (TransactionImpl* const member : m_members)
+    {
         TransactionResult const undone = member->undo();
         if (undone != TransactionResult::NotCompleted)
             result = undone;
     }
-    Ended const ended = endAll(); // this object may be gone
+    Ended const ended = endAll();  // this object may be gone
     ended.forEach(&TransactionImpl::checkInvariants);
     ended.forEach(&TransactionImpl::notifyRolledBack);
     return result;
@@ -211,4 +213,4 @@ void TransactionGroup::markRollBackOnly()
     for (TransactionImpl* const member : m_members)
         member->markRollBackOnly();
 }
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -58,12 +58,12 @@ private:
     Pins takePins();
 
     ModelConstellation::Impl* m_constellation;
-    Members m_members; ///< Not owned; those without handles are kept by the group's being open.
-    Pins m_pins;       ///< While the group is ending: of all members, those that left meanwhile too.
+    Members m_members;  ///< Not owned; those without handles are kept by the group's being open.
+    Pins m_pins;  ///< While the group is ending: of all members, those that left meanwhile too.
     bool m_deep;
     bool m_rollBackOnly = false;
-    bool m_ending = false; ///< A commit or rollback is running.
+    bool m_ending = false;  ///< A commit or rollback is running.
     bool m_prohibited = false;
     meta::TransactionOrigin m_origin;
 };
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -38,7 +38,7 @@ void putBack(ModelElement::Impl& element, ModelElement::Impl::Changes& record)
 {
     element.copyStateFromStorage(static_cast<ModelElement::Impl::Storage*>(&record));
 }
-} // namespace
+}  // namespace
 
 /// The group that ends a transaction which stands alone. While it lives, calls from listeners find
 /// it running.
@@ -46,8 +46,8 @@ class TransactionImpl::LocalGroup
 {
 public:
     explicit LocalGroup(TransactionImpl& transaction)
-        : m_group(nullptr, /*deep=*/false, transaction.m_origin)
-        , m_transaction(&transaction)
+        : m_group(nullptr, /*deep=*/false, transaction.m_origin),
+          m_transaction(&transaction)
     {
         m_group.addMember(&transaction);
         transaction.m_group = &m_group;
@@ -56,7 +56,7 @@ public:
     LocalGroup& operator=(LocalGroup const&) = delete;
     ~LocalGroup()
     {
-        if (!m_group.isEmpty()) // otherwise the transaction has ended and may be gone
+        if (!m_group.isEmpty())  // otherwise the transaction has ended and may be gone
             m_transaction->m_group = nullptr;
     }
 
@@ -69,12 +69,12 @@ private:
 
 TransactionImpl::TransactionImpl(Model const& model, TransactionGroup* group,
                                  meta::TransactionOrigin const& origin, bool deep)
-    : AbstractTransactionImpl(origin)
-    , m_model(model)
-    , m_group(group)
-    , m_changes(std::make_shared<ChangeRecords>())
-    , m_flags((model->isFrozenOnNotify() ? FREEZE_ON_NOTIFY : 0u) | (deep ? DEEP : 0u)
-              | (model->isUnchangedRevertedOnReport() ? REVERT_UNCHANGED : 0u))
+    : AbstractTransactionImpl(origin),
+      m_model(model),
+      m_group(group),
+      m_changes(std::make_shared<ChangeRecords>()),
+      m_flags((model->isFrozenOnNotify() ? FREEZE_ON_NOTIFY : 0u) | (deep ? DEEP : 0u) |
+              (model->isUnchangedRevertedOnReport() ? REVERT_UNCHANGED : 0u))
 {
     for (auto const& holder : model->getListeners())
         m_listeners.push_back(holder.get());
@@ -85,7 +85,7 @@ TransactionImpl::TransactionImpl(Model const& model, TransactionGroup* group,
 
 TransactionImpl::~TransactionImpl()
 {
-    if (has(DESTROYED_SOME)) // reports may hold the records longer
+    if (has(DESTROYED_SOME))  // reports may hold the records longer
         m_changes->forEach([](ModelElement::Impl::Changes& record) { record.releaseElement(); });
 }
 
@@ -134,13 +134,14 @@ void TransactionImpl::announceFirstChange()
 
 /// Lets `fill` write the element's record. A new one is entered last, so that a failure leaves the
 /// transaction as it was.
-template <class Fill>
-void TransactionImpl::record(ModelElement::Impl* element, Fill const& fill)
+template <class Fill> void TransactionImpl::record(ModelElement::Impl* element, Fill const& fill)
 {
-    if (ModelElement::Impl::Changes* const known = m_changes->find(element)) {
+    if (ModelElement::Impl::Changes* const known = m_changes->find(element))
+    {
         fill(*known);
     }
-    else {
+    else
+    {
         ChangesHolder made(has(DEEP) ? element->createStorage() : element->createChanges());
         made->setElement(element);
         fill(*made);
@@ -289,14 +290,17 @@ void TransactionImpl::removeRef()
 {
     if (--m_handleCount != 0)
         return;
-    if (!has(ENDED)) {
+    if (!has(ENDED))
+    {
         if (m_group && m_commitCount == 0)
-            return; // stays a member without handles until the group ends
+            return;  // stays a member without handles until the group ends
         m_handleCount = HANDLES_DELETING;
-        try {
+        try
+        {
             rollBack();
         }
-        catch (...) {
+        catch (...)
+        {
             // there is nobody to tell; the model is as the failure left it
         }
     }
@@ -373,10 +377,9 @@ bool TransactionImpl::hasNews() const
 bool TransactionImpl::anyListener(ReportKind kind) const
 {
     return std::any_of(m_listeners.begin(), m_listeners.end(), [&](ListenerHolderBase* holder) {
-        return holder
-               && (kind == ReportKind::Prepare    ? holder->wantsPrepare()
-                   : kind == ReportKind::Validate ? holder->wantsValidate()
-                                                  : holder->wantsNotify());
+        return holder && (kind == ReportKind::Prepare    ? holder->wantsPrepare()
+                          : kind == ReportKind::Validate ? holder->wantsValidate()
+                                                         : holder->wantsNotify());
     });
 }
 
@@ -385,9 +388,9 @@ std::shared_ptr<ReportData> TransactionImpl::createReport(boost::optional<Value>
 {
     if (!hasNews() || (kind != ReportKind::Any && !anyListener(kind)))
         return nullptr;
-    auto report = std::make_shared<ReportData>(m_model, m_changes, message, has(REVERT_UNCHANGED),
-                                               has(DEEP), m_deferredInvocations, has(DESTROY_ALL),
-                                               m_origin);
+    auto report =
+        std::make_shared<ReportData>(m_model, m_changes, message, has(REVERT_UNCHANGED), has(DEEP),
+                                     m_deferredInvocations, has(DESTROY_ALL), m_origin);
     m_changes->forEach([&](ModelElement::Impl::Changes& record) {
         ModelElement const element =
             record.isDestroyed()
@@ -412,10 +415,12 @@ bool TransactionImpl::belongsTo(ModelElement::Impl::Changes const& record,
 void TransactionImpl::prepare(boost::optional<Value> const& message)
 {
     std::shared_ptr<ReportData> report;
-    for (std::size_t i = 0; i < m_listeners.size() && !has(ENDED) && hasNews(); ++i) {
+    for (std::size_t i = 0; i < m_listeners.size() && !has(ENDED) && hasNews(); ++i)
+    {
         if (!m_listeners[i] || !m_listeners[i]->wantsPrepare())
             continue;
-        if (!report || has(REPORT_STALE)) {
+        if (!report || has(REPORT_STALE))
+        {
             report = createReport(message, ReportKind::Any);
             clear(REPORT_STALE);
         }
@@ -428,9 +433,11 @@ bool TransactionImpl::validate(boost::optional<Value> const& message)
 {
     if (!hasNews())
         return true;
-    try {
+    try
+    {
         std::shared_ptr<ReportData> report;
-        for (std::size_t i = 0; i < m_listeners.size() && !has(ENDED); ++i) {
+        for (std::size_t i = 0; i < m_listeners.size() && !has(ENDED); ++i)
+        {
             if (!m_listeners[i] || !m_listeners[i]->wantsValidate())
                 continue;
             if (!report)
@@ -439,7 +446,8 @@ bool TransactionImpl::validate(boost::optional<Value> const& message)
                 return false;
         }
     }
-    catch (...) {
+    catch (...)
+    {
         return false;
     }
     return true;
@@ -451,16 +459,19 @@ void TransactionImpl::notifyCommitted(boost::optional<Value> const& message)
         return;
     FrozenForListeners const frozen(*this);
     std::shared_ptr<ReportData> report;
-    for (std::size_t i = 0; i < m_listeners.size(); ++i) {
+    for (std::size_t i = 0; i < m_listeners.size(); ++i)
+    {
         if (!m_listeners[i] || !m_listeners[i]->wantsNotify())
             continue;
-        try {
+        try
+        {
             if (!report)
                 report = createReport(message, ReportKind::Any);
             if (!report->isEmpty())
                 m_listeners[i]->committed(report);
         }
-        catch (...) {
+        catch (...)
+        {
             // the changes are final, whatever a listener thinks of them
         }
     }
@@ -470,11 +481,14 @@ void TransactionImpl::runDeferredInvocations()
 {
     if (!m_deferredInvocations)
         return;
-    for (std::size_t i = 0; i < m_deferredInvocations->size(); ++i) {
-        try {
+    for (std::size_t i = 0; i < m_deferredInvocations->size(); ++i)
+    {
+        try
+        {
             (*m_deferredInvocations)[i]->invoke();
         }
-        catch (...) {
+        catch (...)
+        {
             // the next one runs all the same
         }
     }
@@ -482,11 +496,13 @@ void TransactionImpl::runDeferredInvocations()
 
 void TransactionImpl::prepareRollBackReport()
 {
-    try {
+    try
+    {
         m_rollBackReport = createReport(boost::none, ReportKind::Notify);
     }
-    catch (...) {
-        m_rollBackReport = nullptr; // the rollback matters more than its report
+    catch (...)
+    {
+        m_rollBackReport = nullptr;  // the rollback matters more than its report
     }
 }
 
@@ -495,13 +511,16 @@ void TransactionImpl::notifyRolledBack()
     if (!m_rollBackReport || !anyListener(ReportKind::Notify))
         return;
     FrozenForListeners const frozen(*this);
-    for (std::size_t i = 0; i < m_listeners.size(); ++i) {
+    for (std::size_t i = 0; i < m_listeners.size(); ++i)
+    {
         if (!m_listeners[i] || !m_listeners[i]->wantsNotify())
             continue;
-        try {
+        try
+        {
             m_listeners[i]->rolledBack(has(DEEP), m_rollBackReport);
         }
-        catch (...) {
+        catch (...)
+        {
             // the changes are gone, whatever a listener thinks of it
         }
     }
@@ -516,8 +535,7 @@ void TransactionImpl::checkInvariants()
 // ---------------------------------------------------------------------------- undo
 
 /// Null if the model has none under the UUID of the record, or another one.
-ModelElement::Impl*
-TransactionImpl::findElementOf(ModelElement::Impl::Changes const& record) const
+ModelElement::Impl* TransactionImpl::findElementOf(ModelElement::Impl::Changes const& record) const
 {
     ModelElement::Impl* const element = m_model->findElementImpl(record.getUuid());
     return belongsTo(record, element) ? element : nullptr;
@@ -551,7 +569,8 @@ TransactionResult TransactionImpl::undo()
     if (!has(DEEP))
         return TransactionResult::NotRevertible;
     set(ROLLED_BACK);
-    if (!has(CREATED_SOME) && !has(DESTROYED_SOME) && !has(MOVED_SOME)) {
+    if (!has(CREATED_SOME) && !has(DESTROYED_SOME) && !has(MOVED_SOME))
+    {
         undoInPlace();
         return TransactionResult::RolledBack;
     }
@@ -597,4 +616,4 @@ void TransactionImpl::bringBackDestroyed()
             m_model->resurrectElement(record.getKeptElement());
     });
 }
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -46,8 +46,8 @@ public:
     virtual void allElementsDestroying();
     virtual void elementModifying(ModelElement::Impl* element, unsigned long index);
     virtual void elementModifying(ModelElement::Impl* element, meta::Extension const& extension);
-    /// Keeps a stand-in, of which nothing else is recorded, in a deep transaction: it may have to come
-    /// back into a container that does.
+    /// Keeps a stand-in, of which nothing else is recorded, in a deep transaction: it may have to
+    /// come back into a container that does.
     void proxyDestroying(ModelElement::Impl* proxy);
     /// Keeps the present link to the container, in a deep transaction.
     void containerChanging(ModelElement::Impl* element);
@@ -61,7 +61,7 @@ public:
         Prepare = 0,
         Validate = 1,
         Notify = 2,
-        Any = 3 ///< Built whoever listens.
+        Any = 3  ///< Built whoever listens.
     };
     /// Null if there is nothing to tell, or nobody of that kind to tell it.
     virtual std::shared_ptr<ReportData> createReport(boost::optional<Value> const& message,
@@ -120,20 +120,20 @@ private:
 
     enum Flag : unsigned
     {
-        DESTROY_ALL = 1,        ///< No element may be created any more.
-        ROLLED_BACK = 2,        ///< Undo has begun: recording is silently ignored.
-        CHANGES_PROHIBITED = 4, ///< Validation or rollback: recording fails.
-        HAS_CHANGES = 8,        ///< Something was recorded.
-        REPORT_STALE = 16,      ///< Something was since the last report for preparing listeners.
+        DESTROY_ALL = 1,         ///< No element may be created any more.
+        ROLLED_BACK = 2,         ///< Undo has begun: recording is silently ignored.
+        CHANGES_PROHIBITED = 4,  ///< Validation or rollback: recording fails.
+        HAS_CHANGES = 8,         ///< Something was recorded.
+        REPORT_STALE = 16,       ///< Something was since the last report for preparing listeners.
         ROLL_BACK_ONLY = 32,
         ENDED = 64,
         FREEZE_ON_NOTIFY = 128,
         DEEP = 256,
         REVERT_UNCHANGED = 512,
-        DESTROYED_SOME = 1024, ///< Records keep destroyed elements.
+        DESTROYED_SOME = 1024,  ///< Records keep destroyed elements.
         CREATED_SOME = 2048,
-        HEARD = 4096, ///< By a listener or the first callback, or for it is deep.
-        MOVED_SOME = 8192 ///< Records keep former containers.
+        HEARD = 4096,      ///< By a listener or the first callback, or for it is deep.
+        MOVED_SOME = 8192  ///< Records keep former containers.
     };
     bool has(Flag flag) const { return (m_flags & flag) != 0; }
     void set(Flag flag) { m_flags |= flag; }
@@ -142,8 +142,7 @@ private:
     void findHearers();
     bool startRecording();
     void announceFirstChange();
-    template <class Fill>
-    void record(ModelElement::Impl* element, Fill const& fill);
+    template <class Fill> void record(ModelElement::Impl* element, Fill const& fill);
     /// Whether the record takes no more changes of values.
     bool isSettled(ModelElement::Impl::Changes const& record) const;
     bool hasNews() const;
@@ -158,13 +157,13 @@ private:
     void bringBackDestroyed();
 
     Model m_model;
-    TransactionGroup* m_group; ///< Null after the end, and for one that stands alone until then.
+    TransactionGroup* m_group;  ///< Null after the end, and for one that stands alone until then.
     std::function<void()> m_firstChangeCallback;
     bool m_inFirstChangeCallback = false;
-    std::shared_ptr<ChangeRecords> m_changes; ///< Those of destroyed elements keep them, until the
-                                              ///< transaction is gone.
+    std::shared_ptr<ChangeRecords> m_changes;  ///< Those of destroyed elements keep them, until the
+                                               ///< transaction is gone.
     std::vector<ModelElement> m_destroyedProxies;
-    std::vector<ListenerHolderBase*> m_listeners; ///< As at the beginning; null once removed.
+    std::vector<ListenerHolderBase*> m_listeners;  ///< As at the beginning; null once removed.
     std::shared_ptr<ReportData::DeferredInvocations> m_deferredInvocations;
     std::shared_ptr<ReportData> m_rollBackReport;
     unsigned m_flags;
@@ -179,4 +178,4 @@ inline bool isChangedInSilence(Model::Impl const& model)
     TransactionImpl const* const open = model.getCurrentTransaction();
     return open && open->isSilent() && model.isFactoryLocal() && !model.isFrozen();
 }
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -9,4 +9,4 @@ ustring qualifiedName(meta::Type const& type)
 {
     return type ? type->getQualifiedName() : ustring();
 }
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

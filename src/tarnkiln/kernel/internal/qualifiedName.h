@@ -8,4 +8,4 @@ namespace tarn::kiln::internal {
 
 /// The qualified name of `type`; empty for an empty or dead one.
 ustring qualifiedName(meta::Type const& type);
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -12,4 +12,4 @@ ustring uuidText(UUID const& uuid);
 
 /// Reads the same form, in which digits may also be upper-case. False for any other text.
 bool parseUuidText(std::u16string_view text, UUID& uuid);
-} // namespace tarn::kiln::internal
+}  // namespace tarn::kiln::internal

@@ -161,7 +161,7 @@ private:
     std::size_t m_cellBytes = 0;
     unsigned long m_recordSize = 0;
     std::vector<support::CountedPointer<support::ModelAnchor>> m_models;  ///< Of all of the above.
-    support::ModelAnchor const* m_onlyModel = nullptr;  ///< Of `m_models`, if it is one.
+    support::ModelAnchor const* m_onlyModel = nullptr;       ///< Of `m_models`, if it is one.
     mutable std::atomic<std::uint64_t> m_currentVersion{0};  ///< When the facts were last the same.
     mutable std::atomic<Known const*> m_known{nullptr};
 };

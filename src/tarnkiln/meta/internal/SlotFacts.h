@@ -28,12 +28,12 @@ struct SlotFacts
     bool isPublicAccessor = false;
     bool isPublicMutator = false;  ///< For a read-only property: that it can be set once.
     bool isSetOnce = false;
-    bool isRequired = false;      ///< The lower bound is 1.
-    bool isTypeKept = false;      ///< The type is live and still that of the slot.
-    bool isTypedByClass = false;  ///< By a live one.
+    bool isRequired = false;         ///< The lower bound is 1.
+    bool isTypeKept = false;         ///< The type is live and still that of the slot.
+    bool isTypedByClass = false;     ///< By a live one.
     bool isTypedByElements = false;  ///< By one that is or extends the class of all elements.
     bool isOppositeKeyed;
-    bool isComposite;             ///< As a `Feature` of a dead property, this and the next are empty.
+    bool isComposite;  ///< As a `Feature` of a dead property, this and the next are empty.
     Feature opposite;
 };
 }  // namespace tarn::kiln::internal
