@@ -588,12 +588,13 @@ TransactionResult TransactionImpl::undo()
     return TransactionResult::RolledBack;
 }
 
-/// Where all elements are and stay where they were, none can die: one walk is enough.
+/// Where no change that was recorded moved an element, one walk is enough. Each is held for its own
+/// turn only: what was loaded without a record may live by what it gives up there.
 void TransactionImpl::undoInPlace()
 {
     m_changes->forEachBackward([this](ModelElement::Impl::Changes& record) {
-        if (ModelElement::Impl* const element = findElementOf(record))
-            putBack(*element, record);
+        if (ModelElement const element(findElementOf(record)); element.getImpl())
+            putBack(*element.getImpl(), record);
     });
 }
 
