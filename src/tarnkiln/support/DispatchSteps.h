@@ -101,14 +101,15 @@ template <class Owner, class Base>
 Value Record<Owner, Base>::getOldValue(meta::Property const& property,
                                        internal::ReflectionPrivateTag const& tag) const
 {
-    boost::optional<Value> value;
+    Value (*old)(Record const&, meta::Property const&) = nullptr;
     atRow<typename Owner::Rows>(property, [&](auto steps, auto row) {
-        if (this->isSlotChanged(steps.slot().index))
-            value = steps.old(*this, oldValueOf<decltype(row)>(*this), property);
-        else
-            value = Value::createEmptyValue(property);
+        old = [](Record const& record, meta::Property const& of) {
+            return record.isSlotChanged(decltype(steps)::slot().index)
+                       ? decltype(steps)::old(record, oldValueOf<decltype(row)>(record), of)
+                       : Value::createEmptyValue(of);
+        };
     });
-    return value ? *value : Base::getOldValue(property, tag);
+    return old ? old(*this, property) : Base::getOldValue(property, tag);
 }
 
 template <class Derived, class Base>
@@ -141,10 +142,15 @@ template <class Derived, class Base>
 Value Dispatched<Derived, Base>::getPropertyValue(meta::Property const& property,
                                                   internal::ReflectionPrivateTag const& tag) const
 {
-    boost::optional<Value> value;
+    using Tag = internal::ReflectionPrivateTag;
+    Value (*get)(Derived const&, meta::Property const&, Tag const&) = nullptr;
     if (mayRead(property, tag))
-        atReadable<Derived>(property, [&](auto row) { value = row.get(self(), property, tag); });
-    return value ? std::move(*value) : Base::getPropertyValue(property, tag);
+        atReadable<Derived>(property, [&](auto row) {
+            get = [](Derived const& self, meta::Property const& of, Tag const& by) {
+                return decltype(row)::get(self, of, by);
+            };
+        });
+    return get ? get(self(), property, tag) : Base::getPropertyValue(property, tag);
 }
 
 /// Whether `Impl` and the classes above leave what `Dispatched` says of metaclass and values alone.
