@@ -18,7 +18,7 @@ struct Countdown
 
 thread_local constinit Countdown countdown;
 
-void* allocate(std::size_t size)
+void* allocate(std::size_t size, std::size_t alignment = alignof(std::max_align_t))
 {
     if (countdown.remaining != 0 && --countdown.remaining == 0)
     {
@@ -27,8 +27,8 @@ void* allocate(std::size_t size)
             countdown.remaining = 1;
         throw std::bad_alloc();
     }
-    void* const block = std::malloc(size != 0 ? size : 1);
-    if (!block)
+    void* block = nullptr;
+    if (posix_memalign(&block, alignment, size != 0 ? size : 1) != 0)
         throw std::bad_alloc();
     ++countdown.liveBlocks;
     return block;
@@ -96,7 +96,19 @@ void* operator new[](std::size_t size, std::nothrow_t const&) noexcept
 {
     return testkit::allocateOrNothing(size);
 }
+void* operator new(std::size_t size, std::align_val_t alignment)
+{
+    return testkit::allocate(size, static_cast<std::size_t>(alignment));
+}
 void operator delete(void* block) noexcept
+{
+    testkit::release(block);
+}
+void operator delete(void* block, std::align_val_t) noexcept
+{
+    testkit::release(block);
+}
+void operator delete(void* block, std::size_t, std::align_val_t) noexcept
 {
     testkit::release(block);
 }

@@ -36,23 +36,24 @@ ReflectiveModelElementImpl* ReflectiveModelElementImpl::createForProxy(Model con
 void* ReflectiveModelElementImpl::operator new(std::size_t size, LayoutHandle const& layout,
                                                std::size_t more)
 {
+    internal::Slabs& slabs = more == 0 ? layout.get()->elements() : layout.get()->largerElements();
     std::size_t const cells = layout.get()->cellBytes();
-    return static_cast<std::byte*>(::operator new(cells + size + more)) + cells;
+    return static_cast<std::byte*>(slabs.allocate(cells + size + more)) + cells;
 }
 
 void ReflectiveModelElementImpl::operator delete(void* element, LayoutHandle const& layout,
                                                  std::size_t /*more*/)
 {
-    ::operator delete(static_cast<std::byte*>(element) - layout.get()->cellBytes());
+    internal::Slabs::free(static_cast<std::byte*>(element) - layout.get()->cellBytes());
 }
 
-/// The layout tells where the memory begins, and may go with the element.
+/// The layout tells where the memory begins, owns it, and may go with the element.
 void ReflectiveModelElementImpl::operator delete(ReflectiveModelElementImpl* element,
                                                  std::destroying_delete_t)
 {
-    void* const memory = reinterpret_cast<std::byte*>(element) - element->layout().cellBytes();
+    LayoutHandle const layout = element->cells().layoutHandle();
     element->~ReflectiveModelElementImpl();
-    ::operator delete(memory);
+    operator delete(element, layout, /*more=*/0);
 }
 
 ReflectiveModelElementImpl::ReflectiveModelElementImpl(Model const& model,

@@ -153,15 +153,18 @@ void ReflectiveLayout::numberSlots()
     std::size_t stateAt = 0;
     std::size_t wordAt = (static_cast<std::size_t>(cells) + WORD - 1) / WORD * WORD;
     for (std::size_t number = 0; number < m_slots.size(); ++number)
+        m_slots[number].setPlaces(number, 0, 0);
+    // What is read without following it lies next to the element.
+    for (bool const isNear : {true, false})
     {
-        if (!hasCell(m_slots[number]))
+        for (std::size_t number = 0; number < m_slots.size(); ++number)
         {
-            m_slots[number].setPlaces(number, 0, 0);
-            continue;
+            if (!hasCell(m_slots[number]) || isInPlace(m_slots[number].kind()) != isNear)
+                continue;
+            stateAt += sizeof(CellState);
+            wordAt += WORD;
+            m_slots[number].setPlaces(number, wordAt, stateAt);
         }
-        stateAt += sizeof(CellState);
-        wordAt += WORD;
-        m_slots[number].setPlaces(number, wordAt, stateAt);
     }
     m_cellBytes = wordAt + LINK_SIZE;
 }

@@ -2,6 +2,7 @@
 /// How the elements of a class that is known at run time keep their properties.
 #pragma once
 #include "tarnkiln/Export.h"
+#include "tarnkiln/kernel/internal/Slabs.h"
 #include "tarnkiln/meta/Class.h"
 #include "tarnkiln/meta/internal/PropertyFacts.h"
 #include "tarnkiln/meta/internal/ReflectiveSlot.h"
@@ -85,6 +86,9 @@ public:
     }
     /// The slots of the change records of elements.
     unsigned long getRecordSize() const { return m_recordSize; }
+    /// Where elements lie, and where those do that have room for more.
+    Slabs& elements() const { return m_elements; }
+    Slabs& largerElements() const { return m_largerElements; }
 
 private:
     friend class support::Shared<ReflectiveLayout>;
@@ -164,5 +168,7 @@ private:
     support::ModelAnchor const* m_onlyModel = nullptr;       ///< Of `m_models`, if it is one.
     mutable std::atomic<std::uint64_t> m_currentVersion{0};  ///< When the facts were last the same.
     mutable std::atomic<Known const*> m_known{nullptr};
+    mutable Slabs m_elements;
+    mutable Slabs m_largerElements;
 };
 }  // namespace tarn::kiln::internal
