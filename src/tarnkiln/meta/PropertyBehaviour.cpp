@@ -1,6 +1,5 @@
 #include "tarnkiln/kernel/Value.h"
-#include "tarnkiln/meta/Class.h"
-#include "tarnkiln/meta/DataType.h"
+#include "tarnkiln/kernel/internal/TypeKind.h"
 #include "tarnkiln/meta/EnumImpl.h"
 #include "tarnkiln/meta/EnumLiteralImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
@@ -15,6 +14,9 @@
 #include <exception>
 
 namespace tarn::kiln::meta {
+
+using internal::TypeKind;
+
 namespace {
 
 bool isRandom(Type const& type, ustring const& text)
@@ -65,14 +67,16 @@ boost::optional<Value> Property::Impl::defaultValue() const
     Type const type = getType();
     if (getUpper() >= 2 || !type)
         return boost::none;
-    if (Class::cast(type) || DataType::cast(type) || type == StandardTypes::hostArrayMeta)
+    TypeKind const kind = internal::kindOf(type);
+    if (kind == TypeKind::Class || kind == TypeKind::DataType ||
+        type == StandardTypes::hostArrayMeta)
         return boost::none;
     if (!m_defaultValue)
         return absentValueOf(Property(const_cast<Impl*>(this)));
 
     ustring const& text = *m_defaultValue;
-    if (Enum const enumeration = Enum::cast(type))
-        return literalOf(enumeration, text);
+    if (kind == TypeKind::Enum)
+        return literalOf(Enum::cast(type), text);
     if (isRandom(type, text))
         return Value(type, generateNewUuid());
     if (isNow(type, text))

@@ -7,7 +7,22 @@
 
 namespace tarn::kiln::internal {
 
-/// Null if `type` is empty or no class; a dead class is one too.
+enum class TypeKind
+{
+    Nothing,
+    Primitive,
+    Class,
+    Enum,
+    DataType,
+    Other  ///< No metaclass of the catalogue makes such types.
+};
+
+/// `Nothing` if `type` is empty; a dead class is one too.
+TypeKind kindOf(meta::Type const& type);
+/// Null if `type` is no class.
 meta::Class::Impl* classImpl(meta::Type const& type);
-bool isEnumType(meta::Type const& type);
+inline bool isEnumType(meta::Type const& type)
+{
+    return kindOf(type) == TypeKind::Enum;
+}
 }  // namespace tarn::kiln::internal
