@@ -171,6 +171,10 @@ private:
     /// The slot of a property that may be read; else null.
     ReflectiveSlot const* readableSlot(meta::Property const& property,
                                        ReflectionPrivateTag const& tag) const;
+    /// The value of a property that has no slot, or one of which it must be asked whether it may be
+    /// read.
+    Value getUncertainValue(ReflectiveSlot const* slot, meta::Property const& property,
+                            ReflectionPrivateTag const& tag) const;
     Value getOtherValue(ReflectiveSlot const& slot, internal::ReflectiveCell cell,
                         ReflectionPrivateTag const& tag) const;
     Value valueOf(ReflectiveSlot const& slot, ModelElement const& element) const;

@@ -59,20 +59,31 @@ bool ReflectiveModelElementImpl::hasPropertyValue(meta::Property const& property
     }
 }
 
+/// Where all is known and the value is a word this calls nothing, and so needs to save no register.
 Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& property,
                                                    ReflectionPrivateTag const& tag) const
 {
     getCells().prefetch();
-    ReflectiveSlot const* const slot = readableSlot(property, tag);
-    if (!slot)
+    Layout const& layout = getCells().layout();
+    ReflectiveSlot const* const slot = layout.find(property);
+    if (!slot || !layout.isKnownToBeReadable(*slot, tag))
+        return getUncertainValue(slot, property, tag);
+    internal::ReflectiveCell const cell = getCells().get(*slot);
+    return slot->isWord(cell) ? slot->readWord(cell) : getOtherValue(*slot, cell, tag);
+}
+
+Value ReflectiveModelElementImpl::getUncertainValue(ReflectiveSlot const* slot,
+                                                    meta::Property const& property,
+                                                    ReflectionPrivateTag const& tag) const
+{
+    if (!slot || !layout().mayRead(*slot, tag))
         return ModelElement::Impl::getPropertyValue(
             property, meta::Extension::cast(property) ? tag : PUBLIC_ACCESS);
     internal::ReflectiveCell const cell = getCells().get(*slot);
     return slot->isWord(cell) ? slot->readWord(cell) : getOtherValue(*slot, cell, tag);
 }
 
-/// The value of a slot that is read in more steps than one. Apart, so that those which are not need
-/// not make room for them.
+/// The value of a slot that is read in more steps than one.
 Value ReflectiveModelElementImpl::getOtherValue(ReflectiveSlot const& slot,
                                                 internal::ReflectiveCell cell,
                                                 ReflectionPrivateTag const& tag) const

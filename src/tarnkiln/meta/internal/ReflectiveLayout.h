@@ -81,8 +81,14 @@ public:
     bool mayRead(ReflectiveSlot const& slot,
                  ModelElement::Impl::ReflectionPrivateTag const& tag) const
     {
+        return isKnownToBeReadable(slot, tag) || factsOf(slot).mayRead(tag);
+    }
+    /// The same; false also where the metamodel would have to be asked.
+    bool isKnownToBeReadable(ReflectiveSlot const& slot,
+                             ModelElement::Impl::ReflectionPrivateTag const& tag) const
+    {
         SlotFacts const* const known = knownFacts(slot);
-        return known ? known->mayRead(tag) : askFacts(slot).mayRead(tag);
+        return known && known->mayRead(tag);
     }
     /// The slots of the change records of elements.
     unsigned long getRecordSize() const { return m_recordSize; }
