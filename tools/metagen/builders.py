@@ -10,7 +10,7 @@ A builder keeps a value for each stored property, in a form that depends on the 
 | many | a vector of values or handles | add one or several, clear |
 | nested | a vector of builders | add, clear |
 """
-from model import capital, comment, fill, sentence, spoken, WIDTH
+from wording import capital, comment, fill, sentence, spoken, WIDTH
 
 SHAPES = {"scalar": "single", "reference": "single", "container": "single",
           "optional": "optional", "composite reference": "contained",

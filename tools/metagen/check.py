@@ -7,17 +7,13 @@ import re
 
 import defaults
 import words
+from description import MODEL_ELEMENT
+from wording import capital
 
-MODEL_ELEMENT = "ModelElement"
-UNBOUNDED = 0xFFFFFFFF
 UUID_FORM = re.compile(r"[0-9a-f]{8}(-[0-9a-f]{4}){3}-[0-9a-f]{12}")
 # Primitive types by whose values a collection may be keyed.
 KEY_TYPES = {"Integer", "Integer8", "Integer16", "Integer64", "UnlimitedNatural", "UInteger8",
              "UInteger16", "UInteger64", "Real", "String", "StdString", "UUID"}
-
-
-def capital(name):
-    return name[0].upper() + name[1:]
 
 
 def cpp_name(entry):

@@ -1,5 +1,5 @@
 """The operations of a class, as the functions that clients write by hand, and their events."""
-import model
+import wording
 
 EVENT_DOC = ("An event: it waits, as {article} `{name}`, for the end of the open transaction, and is "
              "dropped by a rollback. Where no transaction is open it happens at once.")
@@ -56,7 +56,7 @@ class Operation:
         tail = ")" + (" const" if self.cpp["const"] else "")
         tail += " override" if self.overrides else ""
         tail += " = 0;" if self.facts["abstract"] else ";"
-        return model.fill(f"    {virtual}{self.result} {name}(", self.parameters, tail, 8)
+        return wording.fill(f"    {virtual}{self.result} {name}(", self.parameters, tail, 8)
 
     @property
     def pointer_type(self):
@@ -69,7 +69,7 @@ class Operation:
 
     @property
     def doc(self):
-        return model.comment(model.sentence(self.cpp["doc"]), 4) if self.cpp["doc"] else ""
+        return wording.comment(wording.sentence(self.cpp["doc"]), 4) if self.cpp["doc"] else ""
 
     # Events
 
@@ -80,22 +80,22 @@ class Operation:
 
     @property
     def step(self):
-        return f"do{model.capital(self.name)}"
+        return f"do{wording.capital(self.name)}"
 
     @property
     def emitting(self):
-        return model.fill(f"    void {self.name}(", self.parameters, ");", 8)
+        return wording.fill(f"    void {self.name}(", self.parameters, ");", 8)
 
     @property
     def event_doc(self):
         event = Event(self).name
-        text = EVENT_DOC.format(article=model.article(event), name=event)
-        brief = model.sentence(self.cpp["doc"]) + "\n\n" if self.cpp["doc"] else ""
-        return model.comment(brief + text, 4)
+        text = EVENT_DOC.format(article=wording.article(event), name=event)
+        brief = wording.sentence(self.cpp["doc"]) + "\n\n" if self.cpp["doc"] else ""
+        return wording.comment(brief + text, 4)
 
     @property
     def step_doc(self):
-        return model.comment(STEP_DOC.format(name=self.name), 4)
+        return wording.comment(STEP_DOC.format(name=self.name), 4)
 
 
 class Function:
@@ -130,23 +130,23 @@ class Event:
         self.operation = operation
         self.owner = operation.owner
         self.package = self.owner.package
-        self.name = f"{self.owner.name}{model.capital(operation.name)}Event"
-        self.row = f"{self.owner.name}{model.capital(operation.facts['name'])}"
+        self.name = f"{self.owner.name}{wording.capital(operation.name)}Event"
+        self.row = f"{self.owner.name}{wording.capital(operation.facts['name'])}"
         self.arguments = [EventArgument(argument, self.package)
                           for argument in operation.facts["arguments"]]
 
     @property
     def doc(self):
-        brief = model.sentence(self.operation.cpp["doc"]) if self.operation.cpp["doc"] else \
+        brief = wording.sentence(self.operation.cpp["doc"]) if self.operation.cpp["doc"] else \
             f"The event `{self.operation.name}` of {self.owner.article} `{self.owner.name}`."
-        return model.comment(
+        return wording.comment(
             f"{brief}\n\nMade by `{self.owner.name}::Impl::{self.operation.name}`. It keeps its "
             "arguments, and holds the elements among them and its owner in memory.\n\n"
             "Threads: as the owner.")
 
     @property
     def file_doc(self):
-        return model.comment(f"\\file\nThe event `{self.operation.name}` of {self.owner.article} "
+        return wording.comment(f"\\file\nThe event `{self.operation.name}` of {self.owner.article} "
                              f"`{self.owner.name}`.")
 
     @property
@@ -154,7 +154,7 @@ class Event:
         head = f"class {self.package.export_word}{self.name} final : "
         bases = ["public meta::AbstractEvent", "public meta::AbstractDeferredInvocation"]
         line = head + ", ".join(bases)
-        return line if len(line) <= model.WIDTH else head + (",\n" + " " * len(head)).join(bases)
+        return line if len(line) <= wording.WIDTH else head + (",\n" + " " * len(head)).join(bases)
 
     @property
     def constructor(self):
@@ -163,11 +163,11 @@ class Event:
 
     @property
     def declaration(self):
-        return model.fill(f"    {self.name}(", self.constructor, ");", 8)
+        return wording.fill(f"    {self.name}(", self.constructor, ");", 8)
 
     @property
     def definition(self):
-        return model.fill(f"{self.name}::{self.name}(", self.constructor, ")", 4)
+        return wording.fill(f"{self.name}::{self.name}(", self.constructor, ")", 4)
 
     @property
     def initializers(self):
@@ -176,7 +176,7 @@ class Event:
         operation = (f"{self.package.meta_package}::getInstance().getOperation("
                      f"rows::operations::{self.row})")
         base = f"{head}{operation}, owner)"
-        if len(base) > model.WIDTH:
+        if len(base) > wording.WIDTH:
             base = f"{head}{operation},\n{' ' * len(head)}owner)"
         fields = [f"      {argument.field}({argument.name})" for argument in self.arguments]
         return ",\n".join([base, *fields])
@@ -184,18 +184,18 @@ class Event:
     @property
     def call(self):
         """The call of what was written by hand."""
-        return model.fill(f"        owner->{self.operation.step}(",
+        return wording.fill(f"        owner->{self.operation.step}(",
                           [argument.field for argument in self.arguments], ");", 12)
 
     @property
     def emitter(self):
-        return model.fill(f"void {self.owner.name}::Impl::{self.operation.name}(",
+        return wording.fill(f"void {self.owner.name}::Impl::{self.operation.name}(",
                           self.operation.parameters, ")", 4)
 
     @property
     def made(self):
         """The making of the event that the emitter hands over."""
-        return model.fill(f"    support::emitEvent(std::make_unique<{self.name}>(",
+        return wording.fill(f"    support::emitEvent(std::make_unique<{self.name}>(",
                           [f"{self.owner.name}(this)", *(a.name for a in self.arguments)], "));", 8)
 
     @property
@@ -206,7 +206,7 @@ class Event:
 
     @property
     def system_includes(self):
-        return model.sorted_blocks({h for h in self.argument_headers if h.startswith("<")})
+        return wording.sorted_blocks({h for h in self.argument_headers if h.startswith("<")})
 
     @property
     def argument_headers(self):
@@ -224,4 +224,4 @@ class Event:
 
 def accessor(name):
     """The function that gives what is called `name`."""
-    return name if model.is_question(name) else "get" + model.capital(name)
+    return name if wording.is_question(name) else "get" + wording.capital(name)

@@ -1,6 +1,6 @@
 """A metamodel with all its types, as the templates see it."""
+import classes
 import defaults
-import model
 import values
 
 LIBRARY_NAMESPACE = "tarn::kiln::"
@@ -29,7 +29,7 @@ class Package:
                            for entry in facts["dataTypes"] if "dataTypes" in overlay]
         self.carried = self.carried_types(overlay)
         self.types = {name: self.value_type(row) for name, row in self.carried.items()}
-        self.classes = [model.Class(entry, overlay["classes"][entry["name"]], self)
+        self.classes = [classes.Class(entry, overlay["classes"][entry["name"]], self)
                         for entry in facts["classes"]]
         self.by_name = {c.name: c for c in self.classes}
         for package in imports:

@@ -4,7 +4,7 @@
 metamodel gives its number; any other type is given by its qualified name.
 """
 import defaults
-import model
+import wording
 
 FLAGS = {"ordered": "ORDERED", "unique": "UNIQUE", "composite": "COMPOSITE", "derived": "DERIVED",
          "readOnly": "READ_ONLY", "transient": "TRANSIENT", "sparse": "SPARSE",
@@ -42,7 +42,7 @@ def bound(value):
 def row(items):
     """A row from pairs of a field and its text; a field without a text keeps its default."""
     given = [f".{field} = {value}" for field, value in items if value is not None]
-    return "    {" + model.fill(" " * 5, given, "},", 5).lstrip()
+    return "    {" + wording.fill(" " * 5, given, "},", 5).lstrip()
 
 
 class Table:
@@ -110,7 +110,7 @@ class Rows:
 
     @property
     def all_rows(self):
-        return model.fill("constexpr support::PackageRows allRows{",
+        return wording.fill("constexpr support::PackageRows allRows{",
                           [f".{field} = {array}" for field, array in self.spans.items()], "};", 4)
 
     def number_packages(self):
@@ -142,7 +142,7 @@ class Rows:
 
     def add_package(self, entry, parent):
         number = len(self.tables["packages"].rows)
-        self.tables["packages"].add(model.capital(entry["name"] or "root") + str(number or ""), [
+        self.tables["packages"].add(wording.capital(entry["name"] or "root") + str(number or ""), [
             ("name", text(entry["name"])),
             ("parent", None if parent is None else str(parent)),
             ("uri", text(entry["uriTail"])),
@@ -207,7 +207,7 @@ class Rows:
         arguments = self.range("arguments", entry["arguments"])
         operation = self.operation_name(owner, entry)
         for argument in entry["arguments"]:
-            self.tables["arguments"].add(operation + model.capital(argument["name"]), [
+            self.tables["arguments"].add(operation + wording.capital(argument["name"]), [
                 ("name", text(argument["name"])), ("type", self.type(argument["type"])),
                 ("lower", bound(argument["lower"])), ("upper", bound(argument["upper"])),
                 ("isOrdered", "true" if argument["ordered"] else None),
@@ -292,4 +292,4 @@ def has_method(cls, name):
 
 def property_name(owner, name):
     """What a member of `owner` is called among the members of all types."""
-    return owner + model.capital(name)
+    return owner + wording.capital(name)

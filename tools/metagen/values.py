@@ -1,5 +1,6 @@
 """The enumerations and data types of a metamodel, and the C++ that stands for them."""
-import model
+import properties
+import wording
 
 
 class Literal:
@@ -7,8 +8,8 @@ class Literal:
         self.facts = facts
         self.name = facts["name"]
         self.value = facts["value"]
-        self.enumerator = model.capital(cpp.get("name", self.name))
-        self.doc = model.comment(model.sentence(cpp["doc"]), 4) if cpp.get("doc") else ""
+        self.enumerator = wording.capital(cpp.get("name", self.name))
+        self.doc = wording.comment(wording.sentence(cpp["doc"]), 4) if cpp.get("doc") else ""
 
 
 class Enumeration:
@@ -26,13 +27,13 @@ class Enumeration:
 
     @property
     def file_doc(self):
-        return model.comment(f"\\file\nThe literals of `{self.name}`.")
+        return wording.comment(f"\\file\nThe literals of `{self.name}`.")
 
     @property
     def doc(self):
-        brief = self.cpp["brief"] or f"{model.capital(model.article(self.name))} " \
-                                     f"{model.spoken(self.name)}."
-        return model.comment("\n\n".join(part for part in (brief, self.cpp["details"]) if part))
+        brief = self.cpp["brief"] or f"{wording.capital(wording.article(self.name))} " \
+                                     f"{wording.spoken(self.name)}."
+        return wording.comment("\n\n".join(part for part in (brief, self.cpp["details"]) if part))
 
     @property
     def qualified(self):
@@ -53,7 +54,7 @@ class Enumeration:
                 "first": first.enumerator}
 
 
-class Field(model.Property):
+class Field(properties.Property):
     """A field of a data type: a property that lies in the value and has no slot."""
 
     @property
@@ -70,7 +71,7 @@ class DataType:
 
     @property
     def article(self):
-        return model.article(self.name)
+        return wording.article(self.name)
 
     def __init__(self, facts, cpp, package):
         self.facts = facts
@@ -86,14 +87,14 @@ class DataType:
 
     @property
     def file_doc(self):
-        return model.comment(f"\\file\nThe values of the data type `{self.name}`.")
+        return wording.comment(f"\\file\nThe values of the data type `{self.name}`.")
 
     @property
     def doc(self):
-        brief = self.cpp["brief"] or f"{model.capital(model.article(self.name))} " \
-                                     f"{model.spoken(self.name)}."
+        brief = self.cpp["brief"] or f"{wording.capital(wording.article(self.name))} " \
+                                     f"{wording.spoken(self.name)}."
         parts = (brief, self.cpp["details"], "A plain value, copied and compared by its fields.")
-        return model.comment("\n\n".join(part for part in parts if part))
+        return wording.comment("\n\n".join(part for part in parts if part))
 
     @property
     def qualified(self):
@@ -115,14 +116,14 @@ class DataType:
 
     @property
     def serializer_head(self):
-        return model.fill(f"class {self.package.export_word}{self.serializer} final ",
+        return wording.fill(f"class {self.package.export_word}{self.serializer} final ",
                           [f": public meta::DefaultDatatypeSerializer<{self.name}>"], "", 4)
 
     @property
     def serializer_fields(self):
         """The fields as the serializer reaches them."""
         return ",\n".join(
-            model.fill(" " * 10 + "field<", [f"&{self.name}::{field.getter}",
+            wording.fill(" " * 10 + "field<", [f"&{self.name}::{field.getter}",
                                              f"&{self.name}::{field.setter}"],
                        f'>(u"{field.name}")', 12).lstrip("\n") for field in self.fields)
 
@@ -141,7 +142,7 @@ class DataType:
         headers = {h for h in self.headers if h.startswith("<")}
         if any(field.kind == "optional" for field in self.fields):
             headers.add("<boost/optional.hpp>")
-        return model.sorted_blocks(headers)
+        return wording.sorted_blocks(headers)
 
     @property
     def carried(self):
