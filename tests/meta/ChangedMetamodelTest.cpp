@@ -8,15 +8,17 @@ namespace {
 class ChangedMetamodel : public ReflectiveFixture
 {
 protected:
-    Value valueOf(meta::Property const& property) const
+    static Value read(ModelElement const& from, meta::Property const& property)
     {
-        return element->getPropertyValue(property, ModelElement::Impl::PUBLIC_ACCESS);
+        return from->getPropertyValue(property, ModelElement::Impl::PUBLIC_ACCESS);
     }
-    void setPages(int number) const
+    Value valueOf(meta::Property const& property) const { return read(element, property); }
+    void setPages(ModelElement const& of, int number) const
     {
-        element->setPropertyValue(pages, Value(StandardTypes::integerMeta, number),
-                                  ModelElement::Impl::PUBLIC_ACCESS);
+        of->setPropertyValue(pages, Value(StandardTypes::integerMeta, number),
+                             ModelElement::Impl::PUBLIC_ACCESS);
     }
+    void setPages(int number) const { setPages(element, number); }
 
     meta::Class const thing = metamodel.makeClass(u"Thing");
     meta::Class const book = metamodel.makeClass(u"Book", thing);
@@ -96,6 +98,23 @@ TEST_F(ChangedMetamodel, GivesNewElementsAnotherTypeOfValues)
     EXPECT_RAISES(messages::CannotCastIncompatibleTypes, setPages(2));
     EXPECT_EQ(later->getPropertyValue(pages, ModelElement::Impl::PUBLIC_ACCESS).getValue<double>(),
               0.0);
+}
+
+TEST_F(ChangedMetamodel, IsReadFromOldAndNewElementsInTurn)
+{
+    setPages(1);
+    meta::Property const age =
+        metamodel.property(book, u"age", StandardTypes::integerMeta).required();
+    ModelElement const later = make(book);
+    setPages(later, 2);
+
+    for (int round = 0; round < 3; ++round)
+    {
+        EXPECT_EQ(valueOf(pages).getValue<int>(), 1);
+        EXPECT_EQ(read(later, pages).getValue<int>(), 2);
+        EXPECT_RAISES(messages::NoSuchProperty, valueOf(age));
+        EXPECT_EQ(read(later, age).getValue<int>(), 0);
+    }
 }
 
 TEST_F(ChangedMetamodel, GivesReferencesOfAllElementsAnotherTypeAtOnce)

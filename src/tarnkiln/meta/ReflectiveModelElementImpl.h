@@ -171,10 +171,9 @@ private:
     /// The slot of a property that may be read; else null.
     ReflectiveSlot const* readableSlot(meta::Property const& property,
                                        ReflectionPrivateTag const& tag) const;
-    /// The value of a property that has no slot, or one of which it must be asked whether it may be
-    /// read.
-    Value getUncertainValue(ReflectiveSlot const* slot, meta::Property const& property,
-                            ReflectionPrivateTag const& tag) const;
+    /// The same as `getPropertyValue`, for a property of which it is not known whether it has a
+    /// slot and may be read.
+    Value getUncertainValue(meta::Property const& property, ReflectionPrivateTag const& tag) const;
     Value getOtherValue(ReflectiveSlot const& slot, internal::ReflectiveCell cell,
                         ReflectionPrivateTag const& tag) const;
     Value valueOf(ReflectiveSlot const& slot, ModelElement const& element) const;

@@ -14,6 +14,7 @@
 #include "tarnkiln/meta/ReflectiveModelElementImpl.h"
 #include "tarnkiln/meta/StandardTypes.h"
 #include "tarnkiln/meta/internal/PayloadAccess.h"
+#include "tarnkiln/meta/internal/RecentSlots.h"
 #include "tarnkiln/meta/internal/ReflectiveCells.h"
 #include "tarnkiln/support/Field.h"
 
@@ -65,17 +66,18 @@ Value ReflectiveModelElementImpl::getPropertyValue(meta::Property const& propert
 {
     getCells().prefetch();
     Layout const& layout = getCells().layout();
-    ReflectiveSlot const* const slot = layout.find(property);
+    ReflectiveSlot const* const slot = internal::RecentSlots::find(layout, property.getImpl());
     if (!slot || !layout.isKnownToBeReadable(*slot, tag))
-        return getUncertainValue(slot, property, tag);
+        return getUncertainValue(property, tag);
     internal::ReflectiveCell const cell = getCells().get(*slot);
     return slot->isWord(cell) ? slot->readWord(cell) : getOtherValue(*slot, cell, tag);
 }
 
-Value ReflectiveModelElementImpl::getUncertainValue(ReflectiveSlot const* slot,
-                                                    meta::Property const& property,
+Value ReflectiveModelElementImpl::getUncertainValue(meta::Property const& property,
                                                     ReflectionPrivateTag const& tag) const
 {
+    ReflectiveSlot const* const slot =
+        internal::RecentSlots::findFirst(layout(), property.getImpl());
     if (!slot || !layout().mayRead(*slot, tag))
         return ModelElement::Impl::getPropertyValue(
             property, meta::Extension::cast(property) ? tag : PUBLIC_ACCESS);

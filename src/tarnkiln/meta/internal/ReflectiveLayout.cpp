@@ -4,6 +4,7 @@
 #include "tarnkiln/kernel/ModelImpl.h"
 #include "tarnkiln/meta/ClassImpl.h"
 #include "tarnkiln/meta/PropertyImpl.h"
+#include "tarnkiln/meta/internal/RecentSlots.h"
 
 #include <algorithm>
 #include <limits>
@@ -22,6 +23,8 @@ using Layouts = std::unordered_map<meta::Class::Impl const*, ReflectiveLayout::H
 thread_local Layouts latest;
 /// Often the next element is of the same class. One of `latest`, or null.
 thread_local constinit ReflectiveLayout const* last = nullptr;
+
+std::atomic<std::uint64_t> lastId{0};
 
 std::mutex knowing;  ///< Held by the one who remembers facts.
 }  // namespace
@@ -42,7 +45,11 @@ ReflectiveLayout::Handle ReflectiveLayout::of(meta::Class const& metaClass)
     return latest.insert_or_assign(metaClass.getImpl(), made).first->second;
 }
 
-ReflectiveLayout::ReflectiveLayout(meta::Class const& metaClass) : m_metaClass(metaClass)
+constinit thread_local std::array<RecentSlots::Entry, RecentSlots::NUMBER> RecentSlots::entries;
+
+ReflectiveLayout::ReflectiveLayout(meta::Class const& metaClass)
+    : m_id(++lastId),
+      m_metaClass(metaClass)
 {
     for (meta::Class at = metaClass; at && !isOnChain(at.getImpl()); at = at->getSuperclass())
     {

@@ -39,6 +39,8 @@ public:
     ///     InvalidValue  as `ReflectiveSlot`, for the first property that is at fault.
     static Handle of(meta::Class const& metaClass);
 
+    /// Never 0, and never that of another layout, gone or not.
+    std::uint64_t id() const { return m_id; }
     meta::Class const& getMetaClass() const { return m_metaClass; }
     std::vector<ReflectiveSlot> const& slots() const { return m_slots; }
     /// Those of them that refer to elements, one or many: all but the references to containers.
@@ -157,6 +159,7 @@ private:
         return (address >> 6 ^ address >> 12) & m_indexMask;
     }
 
+    std::uint64_t const m_id;
     meta::Class m_metaClass;
     std::vector<meta::Class> m_chain;    ///< The class and its superclasses.
     std::vector<PropertyFacts> m_facts;  ///< Of all owned attributes of the chain, in order.
