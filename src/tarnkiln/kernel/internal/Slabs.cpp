@@ -45,12 +45,12 @@ private:
 }  // namespace
 
 /// Lies at the begin of its memory, which is aligned to `SLAB_SIZE`; the objects follow.
-struct Slabs::Slab
+struct Slabs::Slab : Linked<Slab>
 {
+    Slab(Slabs* of, std::size_t bytes) : owner(of), end(static_cast<std::uint32_t>(bytes)) {}
     static Slab* make(Slabs* owner, std::size_t bytes)
     {
-        return new (::operator new(bytes, ALIGNMENT))
-            Slab{.owner = owner, .end = static_cast<std::uint32_t>(bytes)};
+        return new (::operator new(bytes, ALIGNMENT)) Slab(owner, bytes);
     }
     static void destroy(Slab* slab) noexcept { ::operator delete(slab, ALIGNMENT); }
     static Slab& of(void* object) noexcept
@@ -69,21 +69,20 @@ struct Slabs::Slab
     }
 
     Slabs* owner;  ///< Null: it has one large object.
-    Slab* previous = nullptr;
-    Slab* next = nullptr;
     Hole* holes = nullptr;
     std::uint32_t fresh = sizeof(Slab);  ///< From here on there has been no object.
     std::uint32_t end;
     std::uint32_t used : 31 = 0;
-    std::uint32_t isLinked : 1 = false;
+    std::uint32_t isListed : 1 = false;  ///< Among those of its owner that have room.
 };
 
 Slabs::~Slabs()
 {
-    while (m_first)
+    while (Slab* const slab = m_withRoom.first())
     {
-        TARNKILN_ASSERT(m_first->used == 0, "the objects have gone", m_first->used);
-        Slab::destroy(std::exchange(m_first, m_first->next));
+        TARNKILN_ASSERT(slab->used == 0, "the objects have gone", slab->used);
+        m_withRoom.erase(*slab);
+        Slab::destroy(slab);
     }
 }
 
@@ -95,19 +94,20 @@ void* Slabs::allocate(std::size_t size)
         return Slab::make(nullptr, sizeof(Slab) + size)->take(size);
 
     Locked const locked(m_mutex);
-    if (!m_first)
+    if (!m_withRoom.first())
         grow();
-    Slab& slab = *m_first;
+    Slab& slab = *m_withRoom.first();
     void* const object = slab.take(size);
-    if (!slab.hasRoom(size))
-        unlink(slab);
+    slab.isListed = slab.hasRoom(size);
+    if (!slab.isListed)
+        m_withRoom.erase(slab);
     return object;
 }
 
 void Slabs::grow()
 {
     std::size_t const bytes = m_count < 3 ? FIRST_BYTES << m_count : SLAB_BYTES;
-    link(*Slab::make(this, bytes));
+    m_withRoom.insert(*Slab::make(this, bytes));
     ++m_count;
 }
 
@@ -126,31 +126,13 @@ Slabs::Slab* Slabs::giveBack(Slab& slab, void* object) noexcept
 {
     Locked const locked(m_mutex);
     slab.holes = new (object) Hole{slab.holes};
-    if (!slab.isLinked)
-        link(slab);
-    bool const isOther = slab.previous || slab.next;
-    if (--slab.used != 0 || !isOther)
+    if (!slab.isListed)
+        m_withRoom.insert(slab);
+    slab.isListed = true;
+    if (--slab.used != 0 || m_withRoom.isOnly(slab))
         return nullptr;
-    unlink(slab);
+    m_withRoom.erase(slab);
     --m_count;
     return &slab;
-}
-
-void Slabs::link(Slab& slab) noexcept
-{
-    slab.isLinked = true;
-    slab.previous = nullptr;
-    slab.next = m_first;
-    if (m_first)
-        m_first->previous = &slab;
-    m_first = &slab;
-}
-
-void Slabs::unlink(Slab& slab) noexcept
-{
-    slab.isLinked = false;
-    (slab.previous ? slab.previous->next : m_first) = slab.next;
-    if (slab.next)
-        slab.next->previous = slab.previous;
 }
 }  // namespace tarn::kiln::internal

@@ -2,6 +2,7 @@
 /// Memory for many objects of one size.
 #pragma once
 #include "tarnkiln/Export.h"
+#include "tarnkiln/kernel/internal/LinkedList.h"
 
 #include <cstddef>
 #include <mutex>
@@ -43,11 +44,9 @@ private:
     void grow();
     /// The slab, if it is to be destroyed.
     Slab* giveBack(Slab& slab, void* object) noexcept;
-    void link(Slab& slab) noexcept;
-    void unlink(Slab& slab) noexcept;
 
     std::mutex m_mutex;
-    Slab* m_first = nullptr;  ///< Of those that have room.
+    LinkedList<Slab> m_withRoom;
     std::size_t m_count = 0;  ///< Of all slabs.
 };
 }  // namespace tarn::kiln::internal

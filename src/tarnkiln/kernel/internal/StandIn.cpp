@@ -54,18 +54,12 @@ ProxyId const& StandIn::getId() const
 void StandIns::insert(StandIn& one)
 {
     one.m_all = this;
-    one.m_previous = nullptr;
-    one.m_next = m_first;
-    if (m_first)
-        m_first->m_previous = &one;
-    m_first = &one;
+    m_all.insert(one);
 }
 
 void StandIns::erase(StandIn& one)
 {
-    (one.m_previous ? one.m_previous->m_next : m_first) = one.m_next;
-    if (one.m_next)
-        one.m_next->m_previous = one.m_previous;
+    m_all.erase(one);
     one.m_all = nullptr;
 }
 }  // namespace tarn::kiln::internal

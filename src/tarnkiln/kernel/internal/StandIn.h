@@ -3,6 +3,7 @@
 #pragma once
 #include "tarnkiln/kernel/ModelElement.h"
 #include "tarnkiln/kernel/ProxyId.h"
+#include "tarnkiln/kernel/internal/LinkedList.h"
 #include "tarnkiln/kernel/internal/ModelName.h"
 
 #include <atomic>
@@ -17,7 +18,7 @@ class StandIns;
 /// Most ids are UUIDs, which are kept as such: their texts are made when somebody asks for them.
 ///
 /// Threads: the id may be asked for anywhere; all else happens on the thread of the model.
-class StandIn
+class StandIn : public Linked<StandIn>
 {
 public:
     StandIn(ModelElement::Impl& proxy, ProxyId const& id, StandIns& all);
@@ -36,8 +37,6 @@ private:
 
     ModelElement::Impl& m_proxy;
     StandIns* m_all;  ///< Null once the model is gone.
-    StandIn* m_previous = nullptr;
-    StandIn* m_next = nullptr;
     UUID m_uuid;
     bool m_isUuid;
     ModelNames::Handle const m_modelName;
@@ -58,7 +57,7 @@ public:
     /// Takes those of another model over, and calls `visit(ModelElement::Impl&)` for each.
     template <class Visit> void takeOver(StandIns& others, Visit const& visit)
     {
-        while (StandIn* const one = others.m_first)
+        while (StandIn* const one = others.m_all.first())
         {
             others.erase(*one);
             insert(*one);
@@ -68,7 +67,7 @@ public:
     /// Lets all go, and calls `visit(ModelElement::Impl&)` for each.
     template <class Visit> void clear(Visit const& visit)
     {
-        while (StandIn* const one = m_first)
+        while (StandIn* const one = m_all.first())
         {
             erase(*one);
             visit(one->m_proxy);
@@ -76,7 +75,7 @@ public:
     }
 
 private:
-    StandIn* m_first = nullptr;
+    LinkedList<StandIn> m_all;
     ModelNames m_names;
 };
 }  // namespace tarn::kiln::internal

@@ -17,9 +17,9 @@ TypeKind kindOf(meta::Type const& type)
     if (!element)
         return TypeKind::Nothing;
     std::type_info const& kind = typeid(*element);
-    if (kind == typeid(meta::PrimitiveType::Impl))
+    if (&kind == &typeid(meta::PrimitiveType::Impl))
         return TypeKind::Primitive;
-    if (kind == typeid(meta::Class::Impl))
+    if (&kind == &typeid(meta::Class::Impl))
         return TypeKind::Class;
     if (dynamic_cast<meta::Enum::Impl*>(element))
         return TypeKind::Enum;
